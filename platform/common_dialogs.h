@@ -1,0 +1,28 @@
+// The record that the dialogs for choosing a file work on.
+#pragma once
+
+#include "platform/types.h"
+
+/// Describes one use of a file dialog.
+struct OPENFILENAME {
+    DWORD lStructSize; // 76, the size of the record in a 32-bit program
+    HWND hwndOwner;
+    HINSTANCE hInstance;
+    const char* lpstrFilter; // pairs of text and pattern, each with its NUL, closed by an empty text
+    char* lpstrCustomFilter;
+    DWORD nMaxCustFilter;
+    DWORD nFilterIndex; // from 1
+    char* lpstrFile;    // the path: shown at the start, and what was chosen
+    DWORD nMaxFile;
+    char* lpstrFileTitle;
+    DWORD nMaxFileTitle;
+    const char* lpstrInitialDir; // empty: the current directory
+    const char* lpstrTitle;
+    DWORD Flags;
+    WORD nFileOffset;
+    WORD nFileExtension;
+    const char* lpstrDefExt;
+    LPARAM lCustData;
+    LRESULT (*lpfnHook)(HWND, UINT, WPARAM, LPARAM);
+    const char* lpTemplateName;
+};

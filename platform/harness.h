@@ -1,0 +1,68 @@
+// What tests, benchmarks, replays and film makers ask of the seam. The program never does.
+#pragma once
+
+#include "platform/types.h"
+
+#include <cstdint>
+#include <functional>
+#include <string>
+#include <vector>
+
+namespace seam {
+
+// ---- Clock ---------------------------------------------------------------------------------------
+
+/// From now on time stands still at 0 and moves by itself only where a loop would wait, straight
+/// to the earliest deadline. WallClockSeconds gives `seconds` plus what has passed.
+void useManualClock(DWORD seconds);
+void useSystemClock();
+
+/// Milliseconds of the clock in use.
+std::int64_t clockNow();
+
+/// Handles messages until the clock moved by hand has come to `milliseconds`, or until a loop has
+/// been asked to end; gives false then. Deadlines at `milliseconds` itself are met.
+bool runUntil(std::int64_t milliseconds);
+
+// ---- Handles ---------------------------------------------------------------------------------------
+
+/// Live objects by kind.
+struct HandleCounts {
+    std::size_t windows = 0;
+    std::size_t deviceContexts = 0;
+    std::size_t gdiObjects = 0; // without the stock objects
+    std::size_t palettes = 0;
+    std::size_t memoryBlocks = 0;
+    std::size_t files = 0;
+    std::size_t searches = 0;
+    std::size_t timers = 0;
+
+    friend bool operator==(const HandleCounts&, const HandleCounts&) = default;
+};
+
+HandleCounts liveHandles();
+
+// Each part of the seam tells of its own.
+void countKernelHandles(HandleCounts& counts);
+void countGdiHandles(HandleCounts& counts);
+void countUserHandles(HandleCounts& counts);
+
+// ---- Boxes, pictures, input ------------------------------------------------------------------------
+
+/// Answers message boxes in the user's place while set; gets text, caption and type.
+using BoxAnswer = std::function<int(const std::string&, const std::string&, UINT)>;
+void answerBoxes(BoxAnswer answer);
+
+/// A copy of a window's picture, row by row, 0x00rrggbb.
+struct Picture {
+    int width = 0;
+    int height = 0;
+    std::vector<DWORD> pixels;
+};
+
+Picture windowPicture(HWND window);
+
+/// The same of a bitmap; monochrome pixels come as 0 and 1.
+Picture bitmapPicture(HBITMAP bitmap);
+
+} // namespace seam
