@@ -29,7 +29,6 @@ constexpr UINT WM_CONTEXTMENU = 0x007B;
 constexpr UINT WM_NCDESTROY = 0x0082;
 constexpr UINT WM_KEYDOWN = 0x0100;
 constexpr UINT WM_KEYUP = 0x0101;
-constexpr UINT WM_CHAR = 0x0102;
 constexpr UINT WM_SYSKEYDOWN = 0x0104;
 constexpr UINT WM_SYSKEYUP = 0x0105;
 constexpr UINT WM_COMMAND = 0x0111;
@@ -50,7 +49,6 @@ struct MSG {
     WPARAM wParam;
     LPARAM lParam;
     DWORD time; // milliseconds of the seam's clock
-    POINT pt;   // the pointer, in screen pixels
 };
 
 /// Waits for the next message of any window and takes it. In this order: posted, quit, input,
@@ -67,7 +65,7 @@ constexpr UINT PM_NOYIELD = 2;
 /// whatever the window.
 BOOL PeekMessageA(MSG* message, HWND window, UINT lowest, UINT highest, UINT remove);
 
-/// Posts the WM_CHAR of a WM_KEYDOWN that stands for a character. Gives whether it did.
+/// Stands in every loop; gives FALSE: text is typed into controls, which translate for themselves.
 BOOL TranslateMessage(const MSG* message);
 
 /// Hands the message to the window's procedure and gives its result; 0 if the window has gone.
@@ -152,7 +150,11 @@ LRESULT DefWindowProcA(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
 BOOL IsWindow(HWND window); ///< also true of a window of another program on the same display
 BOOL IsIconic(HWND window); ///< of a child: its top-level window's state
 HWND GetParent(HWND window);
-HWND FindWindowA(const char* className, const char* title); ///< null title: any
+
+/// The top-level window with this class and title, of this process or of another one of this
+/// program that the same user runs on the same display; null if there is none.
+HWND FindWindowA(const char* className, const char* title);
+
 
 constexpr int SW_HIDE = 0;
 constexpr int SW_SHOWNORMAL = 1;
@@ -179,8 +181,15 @@ DWORD SetClassLongA(HWND window, int index, LONG value); ///< the value before
 
 BOOL GetClientRect(HWND window, RECT* area); ///< left and top are 0; also of another's window
 
-HWND SetFocus(HWND window); ///< the window that had it before, null if none of this program
+/// Says which window takes the keys that reach its top-level window; gives the one that had them,
+/// null if none of this program.
+HWND SetFocus(HWND window);
+
+/// The window with the keyboard, of this program or another; null if there is none.
 HWND GetForegroundWindow();
+
+/// Raises a top-level window and gives it the keyboard; also one that FindWindowA found in another
+/// process of this program.
 BOOL SetForegroundWindow(HWND window);
 
 // ---- Painting ----------------------------------------------------------------------------------------

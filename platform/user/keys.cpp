@@ -1,0 +1,76 @@
+#include "platform/user/keys.h"
+
+#include "platform/user/queue.h"
+
+#include <QKeyEvent>
+
+#include <algorithm>
+#include <array>
+
+namespace seam {
+
+namespace {
+
+struct KeyCode {
+    int key;
+    WPARAM code;
+};
+
+/// The platform's codes of the keys that have no character. Letters, digits and the blank have
+/// that of their capital.
+constexpr std::array<KeyCode, 31> keyCodes{{
+    {Qt::Key_Backspace, 0x08}, {Qt::Key_Tab, 0x09},      {Qt::Key_Backtab, 0x09},
+    {Qt::Key_Return, 0x0D},    {Qt::Key_Enter, 0x0D},    {Qt::Key_Shift, 0x10},
+    {Qt::Key_Control, 0x11},   {Qt::Key_Alt, 0x12},      {Qt::Key_Pause, 0x13},
+    {Qt::Key_CapsLock, 0x14},  {Qt::Key_Escape, 0x1B},   {Qt::Key_PageUp, 0x21},
+    {Qt::Key_PageDown, 0x22},  {Qt::Key_End, 0x23},      {Qt::Key_Home, 0x24},
+    {Qt::Key_Left, 0x25},      {Qt::Key_Up, 0x26},       {Qt::Key_Right, 0x27},
+    {Qt::Key_Down, 0x28},      {Qt::Key_Print, 0x2C},    {Qt::Key_Insert, 0x2D},
+    {Qt::Key_Delete, 0x2E},    {Qt::Key_Help, 0x2F},     {Qt::Key_Meta, 0x5B},
+    {Qt::Key_Menu, 0x5D},      {Qt::Key_Asterisk, 0x6A}, {Qt::Key_Plus, 0xBB},
+    {Qt::Key_Minus, 0xBD},     {Qt::Key_NumLock, 0x90},  {Qt::Key_ScrollLock, 0x91},
+    {Qt::Key_AltGr, 0x12},
+}};
+
+WPARAM codeOf(int key) {
+    if ((key >= Qt::Key_A && key <= Qt::Key_Z) || (key >= Qt::Key_0 && key <= Qt::Key_9) ||
+        key == Qt::Key_Space) {
+        return static_cast<WPARAM>(key);
+    }
+    if (key >= Qt::Key_F1 && key <= Qt::Key_F24) {
+        return static_cast<WPARAM>(0x70 + key - Qt::Key_F1);
+    }
+    const auto* found = std::find_if(keyCodes.begin(), keyCodes.end(),
+                                     [key](const KeyCode& entry) { return entry.key == key; });
+    return found == keyCodes.end() ? 0xFF : found->code; // 0xFF: a key without a code
+}
+
+} // namespace
+
+void queueKey(HWND window, const QKeyEvent& event, bool down) {
+    const bool system = event.key() == Qt::Key_F10 || event.key() == Qt::Key_Alt ||
+                        (event.modifiers() & Qt::AltModifier) != 0;
+    const UINT message = down ? (system ? WM_SYSKEYDOWN : WM_KEYDOWN)
+                              : (system ? WM_SYSKEYUP : WM_KEYUP);
+    const LPARAM repeated = event.isAutoRepeat() ? LPARAM{1} << 30 : 0;
+    queueInput({window, message, codeOf(event.key()), repeated | 1, 0});
+}
+
+UINT buttonMessage(Qt::MouseButton button, bool down) {
+    switch (button) {
+    case Qt::LeftButton:
+        return down ? WM_LBUTTONDOWN : WM_LBUTTONUP;
+    case Qt::RightButton:
+        return down ? WM_RBUTTONDOWN : WM_RBUTTONUP;
+    default:
+        return down ? WM_MBUTTONDOWN : WM_MBUTTONUP;
+    }
+}
+
+WPARAM buttonsOf(Qt::MouseButtons buttons) {
+    return ((buttons & Qt::LeftButton) != 0 ? 1U : 0U) |
+           ((buttons & Qt::RightButton) != 0 ? 2U : 0U) |
+           ((buttons & Qt::MiddleButton) != 0 ? 16U : 0U);
+}
+
+} // namespace seam

@@ -1,0 +1,187 @@
+#include "platform/user/native_window.h"
+
+#include "platform/harness.h"
+#include "platform/user/clock.h"
+#include "platform/user/keys.h"
+#include "platform/user/queue.h"
+#include "platform/user/window.h"
+
+#include <QExposeEvent>
+#include <QImage>
+#include <QKeyEvent>
+#include <QMouseEvent>
+#include <QPaintEvent>
+#include <QPainter>
+#include <QWheelEvent>
+
+#include <algorithm>
+#include <cstring>
+
+namespace seam {
+
+namespace {
+
+/// The X server fetches pixels from memory that it shares with us, some time after it is told to.
+/// Drawing sooner than this after a flush first waits until it has.
+constexpr std::int64_t fetchTime = 50;
+
+QRect toQt(const RECT& area) {
+    return {area.left, area.top, area.right - area.left, area.bottom - area.top};
+}
+
+} // namespace
+
+NativeWindow::NativeWindow(HWND owner, const QRect& place, bool topmost, QWindow* parent)
+    : QWindow(parent), owner_(owner), store_(this) {
+    setSurfaceType(QSurface::RasterSurface);
+    if (parent == nullptr) {
+        Qt::WindowFlags flags = Qt::Window | Qt::FramelessWindowHint;
+        if (topmost) {
+            flags |= Qt::WindowStaysOnTopHint | Qt::X11BypassWindowManagerHint;
+        }
+        setFlags(flags);
+    }
+    setGeometry(place);
+    create();
+    resizePicture(place.size());
+}
+
+NativeWindow::~NativeWindow() {
+    dropSurface(*this);
+}
+
+QImage* NativeWindow::storeImage() {
+    return static_cast<QImage*>(store_.paintDevice());
+}
+
+PixelView NativeWindow::pixels() {
+    const QImage* image = shadow_.isNull() ? storeImage() : &shadow_;
+    if (image == nullptr || image->isNull()) {
+        return {};
+    }
+    // Not bits(): the image is never shared, and a detached copy would never be shown.
+    auto* bits = reinterpret_cast<DWORD*>(const_cast<uchar*>(image->constBits()));
+    return {bits, image->width(), image->height(), static_cast<int>(image->bytesPerLine() / 4)};
+}
+
+void NativeWindow::touch(const RECT& area) {
+    const QRect rectangle = toQt(area);
+    if (!clockIsManual() && clockNow() - flushed_ < fetchTime) {
+        store_.beginPaint(rectangle);
+        store_.endPaint();
+    }
+    dirty_ += rectangle;
+}
+
+void NativeWindow::flush() {
+    if (dirty_.isEmpty() || !isExposed()) {
+        return; // the expose event that makes it visible shows all of it
+    }
+    // One rectangle: a step of a sprite touches two that overlap, and each piece costs a request.
+    const QRect area = dirty_.boundingRect();
+    dirty_ = QRegion();
+    if (!shadow_.isNull()) {
+        store_.beginPaint(area);
+        QPainter(storeImage()).drawImage(area.topLeft(), shadow_, area);
+        store_.endPaint();
+    }
+    store_.flush(area);
+    flushed_ = clockNow();
+}
+
+void NativeWindow::resizePicture(QSize size) {
+    const PixelView old = pixels();
+    const QImage kept = old.bits == nullptr
+                            ? QImage()
+                            : QImage(reinterpret_cast<const uchar*>(old.bits), old.width,
+                                     old.height, old.stride * 4, QImage::Format_RGB32)
+                                  .copy();
+    shadow_ = QImage();
+    store_.resize(size);
+    const QImage* image = storeImage();
+    if (image != nullptr && image->format() != QImage::Format_RGB32 &&
+        image->format() != QImage::Format_ARGB32_Premultiplied) {
+        shadow_ = QImage(size, QImage::Format_RGB32);
+        shadow_.fill(Qt::black);
+    }
+    const PixelView now = pixels();
+    for (int y = 0; y < std::min(now.height, kept.height()); ++y) {
+        std::memcpy(now.bits + static_cast<std::ptrdiff_t>(y) * now.stride, kept.constScanLine(y),
+                    static_cast<std::size_t>(std::min(now.width, kept.width())) * 4);
+    }
+}
+
+bool NativeWindow::event(QEvent* event) {
+    if (event->type() == QEvent::Close) {
+        // The window goes when its procedure says so.
+        queuePosted({owner_, WM_CLOSE, 0, 0, 0});
+        event->ignore();
+        return true;
+    }
+    return QWindow::event(event);
+}
+
+void NativeWindow::exposeEvent(QExposeEvent* /*event*/) {
+    if (isExposed()) {
+        dirty_ = QRect(QPoint(0, 0), size());
+        flush();
+    }
+}
+
+void NativeWindow::paintEvent(QPaintEvent* event) {
+    dirty_ += event->region();
+    flush();
+}
+
+void NativeWindow::resizeEvent(QResizeEvent* event) {
+    Window* window = findWindow(owner_);
+    if (window == nullptr || window->native == nullptr ||
+        (window->width() == event->size().width() && window->height() == event->size().height())) {
+        return;
+    }
+    resizePicture(event->size());
+    windowResized(*window, event->size().width(), event->size().height());
+}
+
+void NativeWindow::keyPressEvent(QKeyEvent* event) {
+    queueKey(owner_, *event, true);
+}
+
+void NativeWindow::keyReleaseEvent(QKeyEvent* event) {
+    queueKey(owner_, *event, false);
+}
+
+void NativeWindow::queueMouse(UINT message, const QMouseEvent& event, WPARAM wParam) {
+    const QPoint at = event.position().toPoint();
+    queueInput({owner_, message, wParam, static_cast<LPARAM>(MAKELONG(at.x(), at.y())), 0});
+}
+
+void NativeWindow::mouseMoveEvent(QMouseEvent* event) {
+    queueMouse(WM_MOUSEMOVE, *event, buttonsOf(event->buttons()));
+}
+
+void NativeWindow::mousePressEvent(QMouseEvent* event) {
+    queueMouse(buttonMessage(event->button(), true), *event, buttonsOf(event->buttons()));
+}
+
+void NativeWindow::mouseReleaseEvent(QMouseEvent* event) {
+    queueMouse(buttonMessage(event->button(), false), *event, buttonsOf(event->buttons()));
+}
+
+void NativeWindow::wheelEvent(QWheelEvent* event) {
+    const QPoint at = event->globalPosition().toPoint();
+    queueInput({owner_, WM_MOUSEWHEEL, static_cast<WPARAM>(MAKELONG(0, event->angleDelta().y())),
+                static_cast<LPARAM>(MAKELONG(at.x(), at.y())), 0});
+}
+
+void NativeWindow::focusInEvent(QFocusEvent* /*event*/) {
+    queueInput({owner_, WM_ACTIVATE, 1, 0, 0});
+    queueInput({owner_, WM_SETFOCUS, 0, 0, 0});
+}
+
+void NativeWindow::focusOutEvent(QFocusEvent* /*event*/) {
+    queueInput({owner_, WM_KILLFOCUS, 0, 0, 0});
+    queueInput({owner_, WM_ACTIVATE, 0, 0, 0});
+}
+
+} // namespace seam

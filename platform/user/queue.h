@@ -1,0 +1,25 @@
+// The one message queue, and how its messages are brought about.
+#pragma once
+
+#include "platform/user.h"
+
+namespace seam {
+
+/// Queues a message behind the posted ones, or behind the input that waits. time and pt are filled
+/// in. Wakes whichever loop is waiting.
+void queuePosted(const MSG& message);
+void queueInput(const MSG& message);
+
+/// Drops what is queued for a window that goes.
+void forgetMessagesOf(HWND window);
+
+/// Something has come up (a paint, a timer) that a loop of the toolkit's own has to see to.
+void wake();
+
+/// Shows what has been drawn on any window.
+void flushWindows();
+
+/// Whether the innermost running loop is one of the toolkit's: a message box's.
+bool toolkitLoopIsInnermost();
+
+} // namespace seam

@@ -1,0 +1,82 @@
+#include "platform/user/toolkit.h"
+
+#include <QApplication>
+#include <QPalette>
+#include <QStyleFactory>
+
+#include <cstdio>
+#include <xcb/xcb.h>
+
+namespace seam {
+
+namespace {
+
+int argumentCount = 1;
+char programName[] = "dorbo";
+char* arguments[] = {programName, nullptr};
+
+/// The toolkit ends the process where it finds no display, so we look first.
+bool displayAnswers() {
+    const QByteArray platform = qgetenv("QT_QPA_PLATFORM");
+    if (!platform.isEmpty() && !platform.startsWith("xcb")) {
+        return true;
+    }
+    qputenv("QT_QPA_PLATFORM", "xcb");
+    xcb_connection_t* connection = xcb_connect(nullptr, nullptr);
+    const bool answers = xcb_connection_has_error(connection) == 0;
+    xcb_disconnect(connection);
+    return answers;
+}
+
+/// Grey dialogs with blue selections, whatever the desktop's theme.
+QPalette classicPalette() {
+    QPalette palette(QColor(192, 192, 192), QColor(192, 192, 192));
+    palette.setColor(QPalette::Light, Qt::white);
+    palette.setColor(QPalette::Midlight, QColor(223, 223, 223));
+    palette.setColor(QPalette::Dark, QColor(128, 128, 128));
+    palette.setColor(QPalette::Shadow, Qt::black);
+    palette.setColor(QPalette::Base, Qt::white);
+    palette.setColor(QPalette::Text, Qt::black);
+    palette.setColor(QPalette::WindowText, Qt::black);
+    palette.setColor(QPalette::ButtonText, Qt::black);
+    palette.setColor(QPalette::Highlight, QColor(0, 0, 128));
+    palette.setColor(QPalette::HighlightedText, Qt::white);
+    for (const QPalette::ColorRole role :
+         {QPalette::WindowText, QPalette::ButtonText, QPalette::Text}) {
+        palette.setColor(QPalette::Disabled, role, QColor(128, 128, 128));
+    }
+    return palette;
+}
+
+bool makeToolkit() {
+    if (!displayAnswers()) {
+        std::fputs("dorbo: there is no display to show anything on\n", stderr);
+        return false;
+    }
+    // A pixel of ours is a pixel of the screen: the pictures are drawn for it.
+    qputenv("QT_ENABLE_HIGHDPI_SCALING", "0");
+    qunsetenv("QT_SCALE_FACTOR");
+    QApplication::setStyle(QStringLiteral("windows"));
+    QApplication::setPalette(classicPalette());
+    // It lives as long as the process: windows may be destroyed by handlers of static objects.
+    auto* application = new QApplication(argumentCount, static_cast<char**>(arguments));
+    application->setQuitOnLastWindowClosed(false);
+    return true;
+}
+
+} // namespace
+
+bool toolkit() {
+    static const bool made = QCoreApplication::instance() != nullptr || makeToolkit();
+    return made;
+}
+
+xcb_connection_t* xConnection() {
+    if (!toolkit()) {
+        return nullptr;
+    }
+    auto* x11 = qGuiApp->nativeInterface<QNativeInterface::QX11Application>();
+    return x11 == nullptr ? nullptr : x11->connection();
+}
+
+} // namespace seam

@@ -1,0 +1,15 @@
+// The toolkit's application object, made when the first window, screen or text needs it.
+#pragma once
+
+struct xcb_connection_t;
+
+namespace seam {
+
+/// Makes the application object if there is none yet. False if there is no display to show
+/// anything on; said once on the standard error output.
+bool toolkit();
+
+/// The connection to the X server; null on any other platform of the toolkit.
+xcb_connection_t* xConnection();
+
+} // namespace seam

@@ -1,0 +1,23 @@
+// Wakes the toolkit's loops when a timer of ours is due or something has been queued.
+#pragma once
+
+#include <cstdint>
+#include <optional>
+
+namespace seam {
+
+/// Sees to it that the toolkit's loop wakes at the deadline, by the system's clock; at none if
+/// there is no deadline.
+void armWaker(std::optional<std::int64_t> deadline);
+
+/// Makes a running loop of the toolkit's call drainWithinToolkitLoop soon.
+void wakeToolkitLoop();
+
+/// Handles a bounded number of waiting messages while a loop of the toolkit's is innermost; else
+/// does nothing. The queue supplies it; the waker calls it.
+void drainWithinToolkitLoop();
+
+/// Ends the innermost box of the toolkit as its Cancel would.
+void rejectToolkitModal();
+
+} // namespace seam

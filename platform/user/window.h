@@ -1,0 +1,62 @@
+// The record behind a window's handle.
+#pragma once
+
+#include "platform/handle_table.h"
+#include "platform/user.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace seam {
+
+class NativeWindow;
+
+struct WindowClass {
+    std::string name;
+    UINT style = 0;
+    WNDPROC procedure = nullptr;
+    HINSTANCE instance;
+    HCURSOR cursor;
+    HBRUSH background;
+};
+
+struct Window {
+    HWND handle;
+    WindowClass* windowClass = nullptr;
+    HWND parent; // of a child; may be another program's window
+    DWORD style = 0;
+    std::string title;
+    RECT place{0, 0, 0, 0}; // in the parent, or on the screen
+    bool visible = false;
+    bool dying = false;      // WM_DESTROY has been sent
+    bool paintNeeded = false;
+    bool eraseNeeded = false;
+    RECT update{0, 0, 0, 0}; // bounds of what WM_PAINT has to paint
+    std::unique_ptr<NativeWindow> native;
+
+    int width() const {
+        return place.right - place.left;
+    }
+    int height() const {
+        return place.bottom - place.top;
+    }
+};
+
+/// The record of a window of this program; null for any other number.
+Window* findWindow(HWND window);
+
+/// Calls visit for each window of this program, in the order of their making within a slot's use.
+void forEachWindow(const std::function<void(Window&)>& visit);
+
+/// The handle of the window's top-level window.
+HWND topLevelOf(HWND window);
+
+/// Adds to what has to be painted; the area is clipped to the window.
+void invalidate(Window& window, RECT area, bool erase);
+
+/// The window's native size has changed: keeps the new size, asks for a full repaint where it grew
+/// and queues WM_SIZE.
+void windowResized(Window& window, int width, int height);
+
+} // namespace seam
