@@ -1,0 +1,52 @@
+# shellcheck shell=bash
+# What ./run, ./test and tools/check share. Sourced, with the project's top as current directory.
+
+export DEBIAN_FRONTEND=noninteractive
+
+# wanted_packages: the names in packages.txt, one a line.
+wanted_packages() {
+    sed -e 's/#.*//' -e 's/[[:space:]]//g' -e '/^$/d' packages.txt
+}
+
+# missing_packages: those of them that are not installed.
+missing_packages() {
+    local package
+    for package in $(wanted_packages); do
+        dpkg-query -W -f='${db:Status-Status}\n' "$package" 2>/dev/null | grep -qx installed ||
+            echo "$package"
+    done
+}
+
+# as_root COMMAND...: runs it as root, by sudo where we are not.
+as_root() {
+    if [ "$(id -u)" -eq 0 ]; then
+        "$@"
+    else
+        sudo DEBIAN_FRONTEND=noninteractive "$@"
+    fi
+}
+
+# install_packages: gets what is missing; says nothing and does nothing if nothing is.
+install_packages() {
+    local missing
+    mapfile -t missing < <(missing_packages)
+    [ "${#missing[@]}" -gt 0 ] || return 0
+    echo "Installing Debian packages: ${missing[*]}"
+    as_root apt-get update -q </dev/null
+    as_root apt-get install -q -y --no-install-recommends "${missing[@]}" </dev/null
+}
+
+# configure PRESET: says nothing if all is well.
+configure() {
+    local log=build/$1.configure.log
+    mkdir -p build
+    cmake --preset "$1" >"$log" 2>&1 || {
+        cat "$log"
+        return 1
+    }
+}
+
+# build PRESET: configures and builds it under build/PRESET.
+build() {
+    configure "$1" && cmake --build --preset "$1"
+}
