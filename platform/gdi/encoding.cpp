@@ -1,0 +1,28 @@
+#include "platform/gdi/encoding.h"
+
+#include <array>
+
+namespace seam {
+
+namespace {
+
+/// What the bytes 0x80 to 0x9F stand for; every other byte is its own code point.
+constexpr std::array<char16_t, 32> upperControls{
+    0x20AC, 0x0081, 0x201A, 0x0192, 0x201E, 0x2026, 0x2020, 0x2021, 0x02C6, 0x2030, 0x0160,
+    0x2039, 0x0152, 0x008D, 0x017D, 0x008F, 0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
+    0x2013, 0x2014, 0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0x009D, 0x017E, 0x0178};
+
+} // namespace
+
+QString fromWindows1252(const char* text, std::size_t length) {
+    QString result = QString::fromLatin1(text, static_cast<qsizetype>(length));
+    for (QChar& character : result) {
+        const char16_t code = character.unicode();
+        if (code >= 0x80 && code < 0xA0) {
+            character = QChar(upperControls[code - 0x80U]);
+        }
+    }
+    return result;
+}
+
+} // namespace seam

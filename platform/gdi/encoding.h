@@ -1,0 +1,13 @@
+// The 8-bit text of the program as the toolkit's.
+#pragma once
+
+#include <QString>
+
+#include <cstddef>
+
+namespace seam {
+
+/// Windows-1252; its five holes stand for U+0081, U+008D, U+008F, U+0090 and U+009D.
+QString fromWindows1252(const char* text, std::size_t length);
+
+} // namespace seam
