@@ -1,0 +1,71 @@
+#include "resources/art/gallery.h"
+
+#include "resources/art/bmp_file.h"
+#include "resources/art/bubbles.h"
+#include "resources/art/expressions.h"
+#include "resources/art/poses.h"
+#include "resources/art/tiles.h"
+#include "resources/art/walk.h"
+
+#include <array>
+
+namespace art {
+
+namespace {
+
+constexpr int TileCount = 10;
+
+Exhibit sixteenColours(const std::string& name, const Picture& picture) {
+    return {name, bmpBytes(picture, SixteenColours, {4, 0})};
+}
+
+void addWalks(std::vector<Exhibit>& gallery) {
+    for (int i = 1; i <= WalkCount; ++i) {
+        const Figure right = walkingRight(i);
+        gallery.push_back(sixteenColours("fdl2r" + std::to_string(i), drawFigure(right)));
+        gallery.push_back(sixteenColours("fdr2l" + std::to_string(i), drawFigure(mirrored(right))));
+    }
+}
+
+void addTurns(std::vector<Exhibit>& gallery) {
+    for (int i = 1; i <= 2; ++i) {
+        const Figure right = turningRight(i);
+        gallery.push_back(sixteenColours("fdltn" + std::to_string(i), drawFigure(right)));
+        gallery.push_back(sixteenColours("fdrtn" + std::to_string(i), drawFigure(mirrored(right))));
+    }
+}
+
+void addPoses(std::vector<Exhibit>& gallery) {
+    for (int i = 0; i < PoseCount; ++i) {
+        gallery.push_back(sixteenColours("pose0" + std::to_string(i + 1), drawFigure(pose(i))));
+    }
+}
+
+void addTiles(std::vector<Exhibit>& gallery) {
+    // The form of each, from the first on.
+    constexpr std::array<BmpForm, TileCount> Forms = {
+        {{4, 0}, {8, 0}, {8, 0}, {8, 0}, {8, 0}, {8, 0}, {8, 256}, {8, 256}, {8, 256}, {8, 256}}};
+    for (int i = 1; i <= TileCount; ++i) {
+        const Tile tile = drawTile(i);
+        const std::string name = (i < 10 ? "bg0" : "bg") + std::to_string(i);
+        gallery.push_back(
+            {name, bmpBytes(tile.picture, tile.colours, Forms[static_cast<std::size_t>(i - 1)])});
+    }
+}
+
+} // namespace
+
+std::vector<Exhibit> drawGallery() {
+    std::vector<Exhibit> gallery;
+    addWalks(gallery);
+    addTurns(gallery);
+    addPoses(gallery);
+    const Picture bubble = drawBubble();
+    gallery.push_back(sixteenColours("bubleft", bubble));
+    gallery.push_back(sixteenColours("bubright", mirrored(bubble)));
+    gallery.push_back(sixteenColours("expresns", drawExpressions()));
+    addTiles(gallery);
+    return gallery;
+}
+
+} // namespace art

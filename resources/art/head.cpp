@@ -1,0 +1,195 @@
+#include "resources/art/head.h"
+
+#include <algorithm>
+#include <cmath>
+#include <string>
+#include <vector>
+
+namespace art {
+
+namespace {
+
+constexpr Ink Skin = {White, Yellow};
+constexpr Ink SkinShade = Yellow;
+constexpr Ink Felt = DarkCyan;
+constexpr Ink FeltShade = {DarkCyan, DarkBlue};
+constexpr Colour Line = DarkBlue;
+
+using Rows = std::vector<const char*>;
+
+// The measures below are for a face of this length from eyes to mouth.
+constexpr double PlainLength = 17;
+
+// Places on the head: counted from the middle between the eyes, for a head that looks right or at
+// us, then carried to the picture.
+struct Place {
+    Point eyes;
+    double side;
+    double turn;
+    double stretch;
+
+    explicit Place(const Head& head)
+        : eyes(head.eyeCell + Point{CellSize / 2.0, CellSize / 2.0}), side(head.turn < 0 ? -1 : 1),
+          turn(std::fabs(head.turn)), stretch((head.mouthCell.y - head.eyeCell.y) / PlainLength) {}
+
+    Point operator()(double x, double y) const {
+        return {eyes.x + side * x, eyes.y + (y > 0 ? y * stretch : y)};
+    }
+
+    std::vector<Point> operator()(std::vector<Point> points) const {
+        for (Point& point : points) {
+            point = (*this)(point.x, point.y);
+        }
+        return points;
+    }
+};
+
+Part skinPart(std::vector<Outline> outlines, int shadow) {
+    return {std::move(outlines), Skin, SkinShade, shadow};
+}
+
+std::vector<Point> faceFront() {
+    return {{0, -14}, {8, -12},     {12.5, -5},  {12, 4},     {13.5, 12}, {12.5, 20},  {7.5, 25.5},
+            {0, 27},  {-7.5, 25.5}, {-12.5, 20}, {-13.5, 12}, {-12, 4},   {-12.5, -5}, {-8, -12}};
+}
+
+std::vector<Point> faceHalf() {
+    return {{-3, -14}, {5, -12}, {9.5, -6}, {8.5, 3},  {12.5, 12}, {14, 19},  {11, 25},
+            {4.5, 27}, {-3, 25}, {-9, 19},  {-12, 12}, {-14, 4},   {-16, -5}, {-11, -12}};
+}
+
+void paintEar(Picture& picture, const Place& at, double x) {
+    const Part ear = skinPart({ellipse(at(x, 4), 3.4, 4.8)}, 1);
+    paintOutlined(picture, ear, Line);
+}
+
+void paintFace(Picture& picture, const Place& at) {
+    if (at.turn < 0.5) {
+        paintEar(picture, at, 13.5 - 3 * at.turn);
+        paintEar(picture, at, -13.5);
+    }
+    const auto points = mix(faceFront(), faceHalf(), at.turn);
+    const Mask face = paintOutlined(picture, skinPart({blob(at(points))}, 2), Line);
+    const Part cheeks = {{ellipse(at(8.5 + 1.5 * at.turn, 13), 2.6, 2.2),
+                          ellipse(at(-8.5 + 1.5 * at.turn, 13), 2.6, 2.2)},
+                         {Red, Yellow},
+                         {Red, Yellow},
+                         0};
+    paintWithin(picture, cheeks, face);
+    if (at.turn >= 0.5) {
+        paintEar(picture, at, -6.5 - 3.5 * at.turn);
+    }
+}
+
+void paintNose(Picture& picture, const Place& at) {
+    const Point tip = at(7.5 * at.turn, 8.8);
+    const Point root = at(2.0 * at.turn, 1);
+    Part nose = skinPart({bone(root, tip, 2.2, 4), ellipse(tip, 6.6, 5.2, 8 * at.side)}, 2);
+    nose.shade = {Red, Yellow};
+    const Mask mask = paintOutlined(picture, nose, Line);
+    const Part shine = {{ellipse(tip + Point{-2.2, -2}, 1.8, 1.3)}, White, White, 0};
+    paintWithin(picture, shine, mask);
+}
+
+void paintCap(Picture& picture, const Place& at, double swing) {
+    const double back = -3 * at.turn;
+    const Point root = at(back - 5, -13);
+    const auto hang = [&](double x, double y) {
+        const Point swung = turned({x, y}, swing);
+        return root + Point{at.side * swung.x, swung.y};
+    };
+    const Point tip = hang(-16, 15);
+    std::vector<Outline> felt =
+        tube({at(back + 2, -12.5), root, hang(-9, 2), hang(-14, 8), tip}, 4.2, 2);
+    felt.push_back(blob(at({{back - 12, -9},
+                            {back - 9, -14},
+                            {back, -16.8},
+                            {back + 9, -14},
+                            {back + 11.5, -9},
+                            {back, -8}})));
+    paintOutlined(picture, {std::move(felt), Felt, FeltShade, 2}, Line);
+    paintOutlined(picture, {{ellipse(tip + Point{0, 3}, 3.6, 3.6)}, Yellow, DarkYellow, 1}, Line);
+    const Part band = {{bone(at(back - 11.5, -8.6), at(back + 11.5 + at.turn, -9.4), 2.4, 2.4)},
+                       White,
+                       LightGrey,
+                       1};
+    paintOutlined(picture, band, Line);
+}
+
+// Eyes for a head that looks right; the others are the same the other way round.
+Rows eyeRows(Eyes eyes) {
+    if (eyes == Eyes::Open) {
+        return {" bbb bbb  ", "bWWWbWWWb ", "bWWWbWWWb ", "bWbbbWbbb ",
+                "bWbbbWbbb ", "bWbbbWbbb ", " bbb bbb  "};
+    }
+    return {" bbb bbb  ", "b   b   b ", "b   b   b ", "b   b   b ",
+            "b   b   b ", "bbbbbbbbb ", " bbb bbb  "};
+}
+
+Rows browRows(Brows brows) {
+    switch (brows) {
+    case Brows::Level:
+        return {"          ", "          ", "bbb   bbb "};
+    case Brows::Raised:
+        return {"bbb   bbb ", "          "};
+    case Brows::OneUp:
+        return {"      bbb ", "          ", "bbb       "};
+    case Brows::Worried:
+        return {"          ", "  bb bb   ", "bb     bb "};
+    }
+    return {};
+}
+
+Rows mouthRows(Mouth mouth) {
+    switch (mouth) {
+    case Mouth::Smile:
+        return {" b      b ", "  bb  bb  ", "    bb    "};
+    case Mouth::Open:
+        return {" bbbbbbbb ", "  brrrrb  ", "  brRRrb  ", "   bbbb   "};
+    case Mouth::Round:
+        return {"    bb    ", "   brrb   ", "   brrb   ", "   bRRb   ", "    bb    "};
+    }
+    return {};
+}
+
+void stampFacing(Picture& picture, Point corner, double side, const Rows& rows) {
+    std::vector<std::string> kept;
+    Rows facing;
+    for (const char* row : rows) {
+        kept.emplace_back(row);
+        if (side < 0) {
+            std::reverse(kept.back().begin(), kept.back().end());
+        }
+    }
+    for (const std::string& row : kept) {
+        facing.push_back(row.c_str());
+    }
+    stamp(picture, static_cast<int>(corner.x), static_cast<int>(corner.y), facing);
+}
+
+} // namespace
+
+Head mirrored(const Head& head, int pictureWidth) {
+    Head other = head;
+    other.eyeCell.x = pictureWidth - CellSize - head.eyeCell.x;
+    other.mouthCell.x = pictureWidth - CellSize - head.mouthCell.x;
+    other.turn = -head.turn;
+    return other;
+}
+
+Point chin(const Head& head) {
+    const Place at(head);
+    return at(4.5 * at.turn - 3 * at.turn, 27);
+}
+
+void paintHead(Picture& picture, const Head& head) {
+    const Place at(head);
+    paintFace(picture, at);
+    paintCap(picture, at, head.capSwing);
+    paintNose(picture, at);
+    stampFacing(picture, head.eyeCell + Point{0, 3}, at.side, eyeRows(head.eyes));
+    stampFacing(picture, head.eyeCell, at.side, browRows(head.brows));
+    stampFacing(picture, head.mouthCell + Point{0, 4}, at.side, mouthRows(head.mouth));
+}
+
+} // namespace art

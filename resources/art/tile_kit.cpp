@@ -1,0 +1,118 @@
+#include "resources/art/tile_kit.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace art {
+
+namespace {
+
+double smooth(double t) {
+    return t * t * (3 - 2 * t);
+}
+
+int wrapped(int value, int count) {
+    return ((value % count) + count) % count;
+}
+
+// The way from a to b where the places repeat.
+double wrappedGap(double a, double b, int size) {
+    const double gap = std::fabs(a - b);
+    return std::min(gap, size - gap);
+}
+
+std::uint8_t blend(std::uint8_t from, std::uint8_t to, double share) {
+    return static_cast<std::uint8_t>(std::lround(from + (to - from) * share));
+}
+
+} // namespace
+
+double chance(int x, int y, std::uint32_t seed) {
+    std::uint32_t mixed = seed * 747796405U + static_cast<std::uint32_t>(x) * 2654435769U +
+                          static_cast<std::uint32_t>(y) * 2246822519U;
+    mixed = (mixed ^ (mixed >> 15U)) * 2654435761U;
+    mixed = (mixed ^ (mixed >> 13U)) * 3266489917U;
+    mixed ^= mixed >> 16U;
+    return mixed / 4294967296.0;
+}
+
+double hills(double x, double y, int size, int cells, int rows, std::uint32_t seed) {
+    const double gx = x * cells / size;
+    const double gy = y * rows / size;
+    const int left = static_cast<int>(std::floor(gx));
+    const int top = static_cast<int>(std::floor(gy));
+    const auto corner = [&](int dx, int dy) {
+        return chance(wrapped(left + dx, cells), wrapped(top + dy, rows), seed);
+    };
+    const double tx = smooth(gx - left);
+    const double ty = smooth(gy - top);
+    const double upper = corner(0, 0) + (corner(1, 0) - corner(0, 0)) * tx;
+    const double lower = corner(0, 1) + (corner(1, 1) - corner(0, 1)) * tx;
+    return upper + (lower - upper) * ty;
+}
+
+double clouds(double x, double y, int size, int cells, int layers, std::uint32_t seed) {
+    double sum = 0;
+    double whole = 0;
+    double height = 1;
+    for (int layer = 0; layer < layers; ++layer) {
+        sum += height * hills(x, y, size, cells << layer, cells << layer,
+                              seed + static_cast<std::uint32_t>(layer));
+        whole += height;
+        height /= 2;
+    }
+    return sum / whole;
+}
+
+double nearest(const std::vector<std::array<double, 2>>& points, double x, double y, int size,
+               double& second) {
+    double first = size;
+    second = size;
+    for (const auto& point : points) {
+        const double gap = std::hypot(wrappedGap(point[0], x, size), wrappedGap(point[1], y, size));
+        second = std::min(second, std::max(gap, first));
+        first = std::min(first, gap);
+    }
+    return first;
+}
+
+std::vector<std::array<double, 2>> scattered(int size, int cells, std::uint32_t seed) {
+    std::vector<std::array<double, 2>> points;
+    const double field = static_cast<double>(size) / cells;
+    for (int row = 0; row < cells; ++row) {
+        for (int column = 0; column < cells; ++column) {
+            points.push_back({(column + chance(column, row, seed)) * field,
+                              (row + chance(column, row, seed + 1)) * field});
+        }
+    }
+    return points;
+}
+
+std::vector<Rgb> ramp(Rgb dark, Rgb light) {
+    std::vector<Rgb> colours;
+    for (int i = 0; i < 256; ++i) {
+        const double share = i / 255.0;
+        colours.push_back({blend(dark.red, light.red, share), blend(dark.green, light.green, share),
+                           blend(dark.blue, light.blue, share)});
+    }
+    return colours;
+}
+
+Tile shadedTile(int size, Rgb dark, Rgb light, const Field& brightness) {
+    Tile tile{Picture(size, size), ramp(dark, light)};
+    for (int y = 0; y < size; ++y) {
+        for (int x = 0; x < size; ++x) {
+            const double value = std::clamp(brightness(x, y), 0.0, 1.0);
+            tile.picture.set(x, y, static_cast<std::uint8_t>(std::lround(value * 255)));
+        }
+    }
+    return tile;
+}
+
+Field relief(const Field& height, double strength) {
+    return [height, strength](double x, double y) {
+        return 0.5 + strength * (height(x + 1, y + 1) - height(x - 1, y - 1));
+    };
+}
+
+} // namespace art
