@@ -26,8 +26,7 @@ static LONG FrameStoreSize = 0;
 static constexpr UINT SaveMenuItem = 113;
 static constexpr std::size_t MessageSize = 512; // the longest message with the longest name in it
 
-// ---- Frames
-// --------------------------------------------------------------------------------------
+// ---- Frames -----------------------------------------------------------------------------------
 
 void CopyText(char* target, const char* source, std::size_t size) {
     const std::size_t length = std::min(strnlen(source, size), size - 1);
@@ -150,8 +149,7 @@ int FramePut(LONG index, const ToonFrame* in) {
     return 1;
 }
 
-// ---- The Toon
-// ------------------------------------------------------------------------------------
+// ---- The Toon ---------------------------------------------------------------------------------
 
 void ToonSetDirty(HWND window, DWORD dirty) {
     ToonDirty = dirty;
@@ -207,8 +205,7 @@ int ToonFileSetup(HWND owner) {
     return 1;
 }
 
-// ---- Its file
-// ------------------------------------------------------------------------------------
+// ---- Its file ---------------------------------------------------------------------------------
 
 static void TellError(HWND owner, const char* text, UINT icon) {
     MessageBoxA(owner, text, nullptr, icon);

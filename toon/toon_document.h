@@ -16,8 +16,7 @@
 static_assert(std::endian::native == std::endian::little,
               "records are read as they stand in a file");
 
-// ---- Records
-// -------------------------------------------------------------------------------------
+// ---- Records ----------------------------------------------------------------------------------
 
 constexpr std::size_t TOON_MAGIC_SIZE = 32;
 constexpr std::size_t TOON_CAPTION_SIZE = 52; // NUL included
@@ -59,24 +58,45 @@ static_assert(sizeof(ToonFrame) == 92 && offsetof(ToonFrame, y) == 4 &&
 /// "Dorbo Toon Frame File", 22 bytes with its NUL: what a new header begins with.
 extern const char ToonMagic[22];
 
-// ---- The open Toon
-// -------------------------------------------------------------------------------
+// ---- The open Toon ----------------------------------------------------------------------------
 
-extern ToonHeader ToonDocHeader;          // in memory; loads and the configuration dialog write it
-extern HGLOBAL FrameStore;                // the frames, null while absent; only this file writes it
-extern LONG FrameCount;                   // frames in force; loads, New, Insert and Delete write it
-extern LONG CurrentFrameIndex;            // frame edited or walked to; editor and player write it
-extern char ToonFileName[TOON_NAME_SIZE]; // empty: untitled; loads and file dialogs write it
-extern DWORD ToonDirty;                   // 1 while changes are unsaved; ToonSetDirty writes it
-extern LONG ToonSpeed;                    // speed in force; loads and the configuration write it
-extern LONG BackgroundIndex; // tile in force; loads, stage starts and the walk about write it
-extern char CaptionText[TOON_CAPTION_SIZE]; // caption in force; loads and the editor write it
-extern DWORD StageSize;     // of the present stage, width below, height above; its host writes it
-extern ToonFrame EditFrame; // what the frame editor shows; loads and the editor write it
-extern OPENFILENAME ToonFileDialog; // for both file dialogs; ToonFileSetup fills it
+/// The header in memory. Loads and the configuration dialog write it.
+extern ToonHeader ToonDocHeader;
 
-// ---- Frames
-// --------------------------------------------------------------------------------------
+/// The frames, null while absent. Only this file's operations write it.
+extern HGLOBAL FrameStore;
+
+/// Frames in force, 1 at program start. Loads, stage starts, New, Insert and Delete write it.
+extern LONG FrameCount;
+
+/// The frame that is edited or walked to. The editor, loads and the player write it.
+extern LONG CurrentFrameIndex;
+
+/// Path of the Toon, empty while untitled. ToonOpenNamed, the editor and file dialogs write it.
+extern char ToonFileName[TOON_NAME_SIZE];
+
+/// 1 while changes are unsaved. ToonSetDirty writes it.
+extern DWORD ToonDirty;
+
+/// Speed in force, 3 at program start. Loads and the configuration dialog write it.
+extern LONG ToonSpeed;
+
+/// Tile in force. Loads, stage starts, the walk about and the editor write it.
+extern LONG BackgroundIndex;
+
+/// Caption in force. Loads and the editor write it.
+extern char CaptionText[TOON_CAPTION_SIZE];
+
+/// Size of the present stage in pixels: low 16 bits width, high 16 bits height. Its host writes it.
+extern DWORD StageSize;
+
+/// What the frame editor shows. Loads and the editor write it.
+extern ToonFrame EditFrame;
+
+/// The record of both file dialogs. ToonFileSetup fills it, each use sets its title.
+extern OPENFILENAME ToonFileDialog;
+
+// ---- Frames -----------------------------------------------------------------------------------
 
 /// Copies a text with its NUL into a field of `size` bytes, and stops at the field's last byte,
 /// which then is the NUL. Bytes behind the NUL stay.
@@ -106,8 +126,7 @@ int FrameStoreDelete(LONG index);
 int FrameGet(LONG index, ToonFrame* out);
 int FramePut(LONG index, const ToonFrame* in);
 
-// ---- The Toon and its file
-// -----------------------------------------------------------------------
+// ---- The Toon and its file --------------------------------------------------------------------
 
 /// Notes whether changes are unsaved, and enables or greys File, Save in the window's menu.
 void ToonSetDirty(HWND window, DWORD dirty);
