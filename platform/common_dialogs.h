@@ -8,7 +8,8 @@ struct OPENFILENAME {
     DWORD lStructSize; // 76, the size of the record in a 32-bit program
     HWND hwndOwner;
     HINSTANCE hInstance;
-    const char* lpstrFilter; // pairs of text and pattern, each with its NUL, closed by an empty text
+    const char*
+        lpstrFilter; // pairs of text and pattern, each with its NUL, closed by an empty text
     char* lpstrCustomFilter;
     DWORD nMaxCustFilter;
     DWORD nFilterIndex; // from 1

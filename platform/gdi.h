@@ -122,6 +122,7 @@ struct BITMAPINFOHEADER {
     DWORD biClrUsed; // 0: as many as biBitCount allows
     DWORD biClrImportant;
 };
+
 static_assert(sizeof(BITMAPINFOHEADER) == 40);
 
 struct PALETTEENTRY {
@@ -152,7 +153,8 @@ constexpr UINT DIB_RGB_COLORS = 0;
 HBITMAP CreateDIBitmap(HDC dc, const BITMAPINFOHEADER* header, DWORD init, const void* pixels,
                        const BITMAPINFOHEADER* info, UINT usage);
 
-// ---- Lines and shapes ----------------------------------------------------------------------------
+// ---- Lines and shapes
+// ----------------------------------------------------------------------------
 
 constexpr int PS_SOLID = 0;
 HPEN CreatePen(int style, int width, COLORREF colour); ///< null for all but PS_SOLID, width 1
@@ -178,7 +180,8 @@ constexpr int COLOR_WINDOW = 5;
 constexpr int COLOR_WINDOWTEXT = 8;
 DWORD GetSysColor(int index); ///< black for an index without a colour
 
-// ---- Text ------------------------------------------------------------------------------------------
+// ---- Text
+// ------------------------------------------------------------------------------------------
 //
 // Text is Windows-1252; its five holes stand for U+0081 and so on. Glyphs are drawn without
 // antialiasing, at whole pixels. In OPAQUE mode a line's cells get the background colour first.
@@ -200,9 +203,9 @@ constexpr UINT DT_NOPREFIX = 0x800;
 
 /// Draws `length` characters (-1: up to the NUL) from the top of the rectangle down and clips them
 /// to it. A carriage return, a line feed or the pair of both breaks a line unless DT_SINGLELINE
-/// stands; with DT_WORDBREAK lines break at blanks, and within a word wider than the rectangle. Unless
-/// DT_NOPREFIX stands an ampersand underlines the next character, and two print one. Gives the
-/// height of the text drawn, 0 on failure.
+/// stands; with DT_WORDBREAK lines break at blanks, and within a word wider than the rectangle.
+/// Unless DT_NOPREFIX stands an ampersand underlines the next character, and two print one. Gives
+/// the height of the text drawn, 0 on failure.
 int DrawTextA(HDC dc, const char* text, int length, RECT* rectangle, UINT format);
 
 /// The width of a line of text in the selected font and the height of a line.
@@ -218,4 +221,5 @@ struct TEXTMETRICA {
     LONG tmMaxCharWidth;
     LONG tmWeight;
 };
+
 BOOL GetTextMetricsA(HDC dc, TEXTMETRICA* metrics);

@@ -11,13 +11,21 @@ namespace seam {
 
 /// Bits of a handle's number: 31 always set, 28 to 30 the kind, 14 to 27 the generation, 0 to 13
 /// the slot. Every table has a kind of its own, so that a handle of one is refused by another.
-enum class HandleKind : DWORD { window, deviceContext, gdiObject, palette, memory, file, search, other };
+enum class HandleKind : DWORD {
+    window,
+    deviceContext,
+    gdiObject,
+    palette,
+    memory,
+    file,
+    search,
+    other
+};
 
 template <class Object>
 class HandleTable {
   public:
-    explicit HandleTable(HandleKind kind) : kind_(kind) {
-    }
+    explicit HandleTable(HandleKind kind) : kind_(kind) {}
 
     /// Takes the object in and gives its number; 0 if all 16384 slots are taken.
     DWORD add(std::unique_ptr<Object> object) {

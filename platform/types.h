@@ -27,13 +27,15 @@ struct Handle {
     DWORD number = 0;
 
     constexpr Handle() = default;
-    constexpr Handle(std::nullptr_t) {
-    }
-    constexpr explicit Handle(DWORD value) : number(value) {
-    }
+
+    constexpr Handle(std::nullptr_t) {}
+
+    constexpr explicit Handle(DWORD value) : number(value) {}
+
     constexpr explicit operator bool() const {
         return number != 0;
     }
+
     friend constexpr bool operator==(Handle, Handle) = default;
 };
 
@@ -57,10 +59,10 @@ using HGDIOBJ = Handle<struct GdiKind>;
 template <class Kind>
 struct GdiHandle : HGDIOBJ {
     constexpr GdiHandle() = default;
-    constexpr GdiHandle(std::nullptr_t) {
-    }
-    constexpr explicit GdiHandle(HGDIOBJ object) : HGDIOBJ(object) {
-    }
+
+    constexpr GdiHandle(std::nullptr_t) {}
+
+    constexpr explicit GdiHandle(HGDIOBJ object) : HGDIOBJ(object) {}
 };
 
 using HBITMAP = GdiHandle<struct BitmapKind>;
@@ -104,8 +106,7 @@ struct ResourceName {
     const char* text = nullptr;
     WORD number = 0;
 
-    constexpr ResourceName(const char* name) : text(name) {
-    }
-    constexpr ResourceName(int id) : number(static_cast<WORD>(id)) {
-    }
+    constexpr ResourceName(const char* name) : text(name) {}
+
+    constexpr ResourceName(int id) : number(static_cast<WORD>(id)) {}
 };

@@ -7,7 +7,8 @@
 #include "platform/gdi.h"
 #include "platform/types.h"
 
-// ---- Messages ------------------------------------------------------------------------------------
+// ---- Messages
+// ------------------------------------------------------------------------------------
 
 constexpr UINT WM_CREATE = 0x0001;
 constexpr UINT WM_DESTROY = 0x0002;
@@ -83,7 +84,8 @@ void PostQuitMessage(int exitCode);
 
 void Sleep(DWORD milliseconds); ///< 0 only gives way
 
-// ---- Windows ---------------------------------------------------------------------------------------
+// ---- Windows
+// ---------------------------------------------------------------------------------------
 
 using WNDPROC = LRESULT (*)(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
 
@@ -155,14 +157,13 @@ HWND GetParent(HWND window);
 /// program that the same user runs on the same display; null if there is none.
 HWND FindWindowA(const char* className, const char* title);
 
-
 constexpr int SW_HIDE = 0;
 constexpr int SW_SHOWNORMAL = 1;
 BOOL ShowWindow(HWND window, int command); ///< whether it was visible before
 
 BOOL MoveWindow(HWND window, int x, int y, int width, int height, BOOL repaint);
 
-constexpr HWND HWND_TOP{0};
+constexpr HWND HWND_TOP{};
 constexpr UINT SWP_NOSIZE = 0x0001;
 constexpr UINT SWP_NOMOVE = 0x0002;
 constexpr UINT SWP_NOZORDER = 0x0004;
@@ -192,7 +193,8 @@ HWND GetForegroundWindow();
 /// process of this program.
 BOOL SetForegroundWindow(HWND window);
 
-// ---- Painting ----------------------------------------------------------------------------------------
+// ---- Painting
+// ----------------------------------------------------------------------------------------
 
 struct PAINTSTRUCT {
     HDC hdc;
@@ -212,7 +214,8 @@ BOOL UpdateWindow(HWND window); ///< paints now what has to be painted
 HDC GetDC(HWND window); ///< draws at once; its state is a fresh one each time
 int ReleaseDC(HWND window, HDC dc);
 
-// ---- Timers --------------------------------------------------------------------------------------------
+// ---- Timers
+// --------------------------------------------------------------------------------------------
 
 using TIMERPROC = void (*)(HWND window, UINT message, UINT_PTR timer, DWORD time);
 
@@ -223,7 +226,8 @@ using TIMERPROC = void (*)(HWND window, UINT message, UINT_PTR timer, DWORD time
 UINT_PTR SetTimer(HWND window, UINT_PTR timer, UINT milliseconds, TIMERPROC procedure);
 BOOL KillTimer(HWND window, UINT_PTR timer); ///< TRUE if it ran; a tick that waits is dropped
 
-// ---- Pointer, screen, menu, boxes ------------------------------------------------------------------------
+// ---- Pointer, screen, menu, boxes
+// ------------------------------------------------------------------------
 
 constexpr ResourceName IDC_ARROW{32512};
 constexpr ResourceName IDC_WAIT{32514};

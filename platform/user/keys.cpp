@@ -50,8 +50,8 @@ WPARAM codeOf(int key) {
 void queueKey(HWND window, const QKeyEvent& event, bool down) {
     const bool system = event.key() == Qt::Key_F10 || event.key() == Qt::Key_Alt ||
                         (event.modifiers() & Qt::AltModifier) != 0;
-    const UINT message = down ? (system ? WM_SYSKEYDOWN : WM_KEYDOWN)
-                              : (system ? WM_SYSKEYUP : WM_KEYUP);
+    const UINT message =
+        down ? (system ? WM_SYSKEYDOWN : WM_KEYDOWN) : (system ? WM_SYSKEYUP : WM_KEYUP);
     const LPARAM repeated = event.isAutoRepeat() ? LPARAM{1} << 30 : 0;
     queueInput({window, message, codeOf(event.key()), repeated | 1, 0});
 }

@@ -134,7 +134,7 @@ void NativeWindow::paintEvent(QPaintEvent* event) {
 }
 
 void NativeWindow::resizeEvent(QResizeEvent* event) {
-    Window* window = findWindow(owner_);
+    seam::Window* window = findWindow(owner_);
     if (window == nullptr || window->native == nullptr ||
         (window->width() == event->size().width() && window->height() == event->size().height())) {
         return;

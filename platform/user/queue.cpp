@@ -39,6 +39,7 @@ struct Filter {
     bool takes(UINT message) const {
         return (lowest == 0 && highest == 0) || (message >= lowest && message <= highest);
     }
+
     bool takes(const MSG& message) const {
         return (!window || message.hwnd == window) && takes(message.message);
     }
@@ -169,8 +170,8 @@ void queuePosted(const MSG& message) {
 }
 
 void queueInput(const MSG& message) {
-    if (message.message == WM_MOUSEMOVE && !input.empty() &&
-        input.back().message == WM_MOUSEMOVE && input.back().hwnd == message.hwnd) {
+    if (message.message == WM_MOUSEMOVE && !input.empty() && input.back().message == WM_MOUSEMOVE &&
+        input.back().hwnd == message.hwnd) {
         input.pop_back(); // only where the pointer is now matters
     }
     input.push_back(message);
@@ -259,16 +260,16 @@ LRESULT DispatchMessageA(const MSG* message) {
         traceTick(message->wParam);
     } else if (isMouseMessage(message->message)) {
         constexpr LONG overClient = 1;
-        SendMessageA(message->hwnd, WM_SETCURSOR, message->hwnd.number,
-                     static_cast<LPARAM>(MAKELONG(overClient, static_cast<LONG>(message->message))));
+        SendMessageA(
+            message->hwnd, WM_SETCURSOR, message->hwnd.number,
+            static_cast<LPARAM>(MAKELONG(overClient, static_cast<LONG>(message->message))));
     }
     return SendMessageA(message->hwnd, message->message, message->wParam, message->lParam);
 }
 
 LRESULT SendMessageA(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
     const Window* found = findWindow(window);
-    return found == nullptr ? 0
-                            : found->windowClass->procedure(window, message, wParam, lParam);
+    return found == nullptr ? 0 : found->windowClass->procedure(window, message, wParam, lParam);
 }
 
 BOOL PostMessageA(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {

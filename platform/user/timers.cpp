@@ -35,7 +35,6 @@ bool comesFirst(const Timer& left, const Timer& right) {
     return std::tie(left.due, left.order) < std::tie(right.due, right.order);
 }
 
-
 /// The timer as the record of a show tells of it.
 std::string traceName(UINT_PTR id) {
     const char* name = TraceTimerName == nullptr ? nullptr : TraceTimerName(id);

@@ -16,6 +16,7 @@ struct DueTimer {
     HWND window;
     UINT_PTR id;
 };
+
 std::optional<DueTimer> dueTimer(HWND window, bool anyWindow);
 
 /// Takes note that the timer has come; sets when it is due again.

@@ -32,8 +32,8 @@ class Waker : public QObject {
             return;
         }
         const std::int64_t wait = clockIsManual() ? 0 : *deadline - clockNow();
-        timer_.start(static_cast<int>(
-            std::clamp<std::int64_t>(wait, 0, std::numeric_limits<int>::max())));
+        timer_.start(
+            static_cast<int>(std::clamp<std::int64_t>(wait, 0, std::numeric_limits<int>::max())));
     }
 
   protected:

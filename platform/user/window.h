@@ -29,7 +29,7 @@ struct Window {
     std::string title;
     RECT place{0, 0, 0, 0}; // in the parent, or on the screen
     bool visible = false;
-    bool dying = false;      // WM_DESTROY has been sent
+    bool dying = false; // WM_DESTROY has been sent
     bool paintNeeded = false;
     bool eraseNeeded = false;
     RECT update{0, 0, 0, 0}; // bounds of what WM_PAINT has to paint
@@ -38,6 +38,7 @@ struct Window {
     int width() const {
         return place.right - place.left;
     }
+
     int height() const {
         return place.bottom - place.top;
     }

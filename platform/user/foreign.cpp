@@ -1,0 +1,147 @@
+#include "platform/user/foreign.h"
+
+#include "platform/user/native_window.h"
+#include "platform/user/queue.h"
+#include "platform/user/toolkit.h"
+#include "platform/user/window.h"
+
+#include <QAbstractNativeEventFilter>
+#include <QCoreApplication>
+
+#include <cstdlib>
+#include <memory>
+#include <vector>
+#include <xcb/xcb.h>
+
+namespace seam {
+
+namespace {
+
+template <class Reply>
+using ReplyPointer = std::unique_ptr<Reply, decltype(&std::free)>;
+
+template <class Reply>
+ReplyPointer<Reply> own(Reply* reply) {
+    return {reply, &std::free};
+}
+
+struct Host {
+    xcb_window_t parent;
+    xcb_window_t childId;
+    HWND child;
+};
+
+/// Follows the windows of other programs that ours lie in.
+class HostFilter : public QAbstractNativeEventFilter {
+  public:
+    void follow(const Host& host) {
+        hosts_.push_back(host);
+    }
+
+    bool nativeEventFilter(const QByteArray& type, void* message, qintptr* /*result*/) override {
+        if (type != "xcb_generic_event_t") {
+            return false;
+        }
+        const auto* event = static_cast<const xcb_generic_event_t*>(message);
+        switch (event->response_type & 0x7F) {
+        case XCB_DESTROY_NOTIFY:
+            destroyed(reinterpret_cast<const xcb_destroy_notify_event_t*>(event)->window);
+            break;
+        case XCB_CONFIGURE_NOTIFY: {
+            const auto* configured = reinterpret_cast<const xcb_configure_notify_event_t*>(event);
+            resized(configured->window, {configured->width, configured->height});
+            break;
+        }
+        default:
+            break;
+        }
+        return false;
+    }
+
+  private:
+    void destroyed(xcb_window_t id) {
+        for (const Host& host : hosts_) {
+            if (host.parent == id || host.childId == id) {
+                queuePosted({host.child, WM_CLOSE, 0, 0, 0});
+            }
+        }
+        std::erase_if(hosts_,
+                      [id](const Host& host) { return host.parent == id || host.childId == id; });
+    }
+
+    void resized(xcb_window_t id, QSize size) {
+        for (const Host& host : hosts_) {
+            Window* child = host.parent == id ? findWindow(host.child) : nullptr;
+            if (child != nullptr && child->native) {
+                child->native->resize(size);
+            }
+        }
+    }
+
+    std::vector<Host> hosts_;
+};
+
+HostFilter& hostFilter() {
+    static auto* const filter = [] {
+        auto* made = new HostFilter; // kept, like the application object, until the process ends
+        QCoreApplication::instance()->installNativeEventFilter(made);
+        return made;
+    }();
+    return *filter;
+}
+
+} // namespace
+
+bool foreignExists(HWND window) {
+    xcb_connection_t* connection = mayBeForeign(window) ? xConnection() : nullptr;
+    if (connection == nullptr) {
+        return false;
+    }
+    return own(xcb_get_window_attributes_reply(connection,
+                                               xcb_get_window_attributes(connection, window.number),
+                                               nullptr)) != nullptr;
+}
+
+bool foreignSize(HWND window, SIZE& size) {
+    xcb_connection_t* connection = mayBeForeign(window) ? xConnection() : nullptr;
+    if (connection == nullptr) {
+        return false;
+    }
+    const auto geometry = own(
+        xcb_get_geometry_reply(connection, xcb_get_geometry(connection, window.number), nullptr));
+    if (geometry == nullptr) {
+        return false;
+    }
+    size = {geometry->width, geometry->height};
+    return true;
+}
+
+HWND foreignFocus() {
+    xcb_connection_t* connection = xConnection();
+    if (connection == nullptr) {
+        return {};
+    }
+    const auto focus =
+        own(xcb_get_input_focus_reply(connection, xcb_get_input_focus(connection), nullptr));
+    // 0 and 1 stand for no window and for the one under the pointer.
+    return focus == nullptr || focus->focus <= 1 ? HWND{} : HWND{focus->focus};
+}
+
+void followHost(HWND parent, HWND child) {
+    xcb_connection_t* connection = xConnection();
+    const Window* window = findWindow(child);
+    if (connection == nullptr || window == nullptr || !window->native) {
+        return;
+    }
+    const std::uint32_t mask = XCB_EVENT_MASK_STRUCTURE_NOTIFY;
+    const auto request =
+        xcb_change_window_attributes_checked(connection, parent.number, XCB_CW_EVENT_MASK, &mask);
+    // It may have gone since we looked: the error is ours to take, not the toolkit's to print.
+    const auto error = own(xcb_request_check(connection, request));
+    hostFilter().follow({parent.number, static_cast<xcb_window_t>(window->native->winId()), child});
+    if (error != nullptr) {
+        queuePosted({child, WM_CLOSE, 0, 0, 0});
+    }
+}
+
+} // namespace seam

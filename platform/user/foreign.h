@@ -1,0 +1,26 @@
+// Windows of other programs on the same display. On a platform of the toolkit other than X11 there
+// are none.
+#pragma once
+
+#include "platform/types.h"
+
+namespace seam {
+
+/// Whether the number can be the id of another program's window: ours have the top bit set.
+inline bool mayBeForeign(HWND window) {
+    return window && (window.number & 0xE0000000U) == 0;
+}
+
+bool foreignExists(HWND window);
+
+/// Its size in pixels; false if it is none.
+bool foreignSize(HWND window, SIZE& size);
+
+/// From now on the end of `parent`, or of our window `child` in it, posts WM_CLOSE to `child`, and
+/// a new size of `parent` becomes that of `child`.
+void followHost(HWND parent, HWND child);
+
+/// The window with the keyboard, by the X server's word.
+HWND foreignFocus();
+
+} // namespace seam

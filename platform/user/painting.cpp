@@ -1,0 +1,109 @@
+// Painting a window, and its own answers to messages.
+#include "platform/gdi/surface.h"
+#include "platform/harness.h"
+#include "platform/user/native_window.h"
+#include "platform/user/queue.h"
+#include "platform/user/window.h"
+
+using namespace seam;
+
+static RECT clientOf(const Window& window) {
+    return {0, 0, window.width(), window.height()};
+}
+
+HDC GetDC(HWND window) {
+    Window* found = findWindow(window);
+    return found == nullptr || !found->native
+               ? HDC{}
+               : makeSurfaceContext(*found->native, clientOf(*found));
+}
+
+int ReleaseDC(HWND window, HDC dc) {
+    return findWindow(window) != nullptr && DeleteDC(dc) != FALSE ? 1 : 0;
+}
+
+HDC BeginPaint(HWND window, PAINTSTRUCT* paint) {
+    Window* found = findWindow(window);
+    if (found == nullptr || !found->native) {
+        *paint = {};
+        return {};
+    }
+    const bool erase = found->eraseNeeded;
+    paint->rcPaint = found->paintNeeded ? found->update : RECT{0, 0, 0, 0};
+    found->paintNeeded = false;
+    found->eraseNeeded = false;
+    paint->hdc = makeSurfaceContext(*found->native, paint->rcPaint);
+    paint->fErase =
+        erase && SendMessageA(window, WM_ERASEBKGND, paint->hdc.number, 0) == 0 ? TRUE : FALSE;
+    return paint->hdc;
+}
+
+BOOL EndPaint(HWND /*window*/, const PAINTSTRUCT* paint) {
+    DeleteDC(paint->hdc);
+    return TRUE;
+}
+
+BOOL InvalidateRect(HWND window, const RECT* area, BOOL erase) {
+    Window* found = findWindow(window);
+    if (found == nullptr) {
+        return FALSE;
+    }
+    invalidate(*found, area == nullptr ? clientOf(*found) : *area, erase != FALSE);
+    return TRUE;
+}
+
+BOOL UpdateWindow(HWND window) {
+    const Window* found = findWindow(window);
+    if (found == nullptr) {
+        return FALSE;
+    }
+    if (found->paintNeeded && found->visible) {
+        SendMessageA(window, WM_PAINT, 0, 0);
+        flushWindows();
+    }
+    return TRUE;
+}
+
+static LRESULT eraseBackground(const Window& window, HDC dc) {
+    if (!window.windowClass->background) {
+        return 0;
+    }
+    const RECT area = clientOf(window);
+    FillRect(dc, &area, window.windowClass->background);
+    return 1;
+}
+
+static LRESULT setTitle(Window& window, const char* title) {
+    window.title = title == nullptr ? "" : title;
+    window.native->setTitle(QString::fromUtf8(window.title.c_str()));
+    return TRUE;
+}
+
+LRESULT DefWindowProcA(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
+    Window* found = findWindow(window);
+    if (found == nullptr) {
+        return 0;
+    }
+    switch (message) {
+    case WM_CLOSE:
+        DestroyWindow(window);
+        return 0;
+    case WM_PAINT: {
+        PAINTSTRUCT paint{};
+        BeginPaint(window, &paint);
+        EndPaint(window, &paint);
+        return 0;
+    }
+    case WM_ERASEBKGND:
+        return eraseBackground(*found, HDC{static_cast<DWORD>(wParam)});
+    case WM_SETCURSOR:
+        if (found->windowClass->cursor) {
+            SetCursor(found->windowClass->cursor);
+        }
+        return 0;
+    case WM_SETTEXT:
+        return setTitle(*found, reinterpret_cast<const char*>(lParam));
+    default:
+        return 0;
+    }
+}

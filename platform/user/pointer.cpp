@@ -1,0 +1,94 @@
+// The pointer, its shape and the screen's size.
+#include "platform/user.h"
+#include "platform/user/cursors.h"
+#include "platform/user/native_window.h"
+#include "platform/user/toolkit.h"
+#include "platform/user/window.h"
+
+#include <QCursor>
+#include <QGuiApplication>
+#include <QScreen>
+
+namespace seam {
+
+namespace {
+
+HCURSOR current{IDC_ARROW.number};
+int displayCount = 0;
+
+Qt::CursorShape shapeInForce() {
+    if (!current || displayCount < 0) {
+        return Qt::BlankCursor;
+    }
+    return current.number == IDC_WAIT.number ? Qt::WaitCursor : Qt::ArrowCursor;
+}
+
+void applyToAll() {
+    forEachWindow([](Window& window) {
+        if (window.native) {
+            applyCursor(*window.native);
+        }
+    });
+}
+
+} // namespace
+
+void applyCursor(NativeWindow& window) {
+    const Qt::CursorShape shape = shapeInForce();
+    if (window.cursor().shape() != shape) {
+        window.setCursor(shape);
+    }
+}
+
+} // namespace seam
+
+using namespace seam;
+
+HCURSOR LoadCursorA(HINSTANCE instance, ResourceName name) {
+    const bool known = name.number == IDC_ARROW.number || name.number == IDC_WAIT.number;
+    return !instance && known ? HCURSOR{name.number} : HCURSOR{};
+}
+
+HICON LoadIconA(HINSTANCE /*instance*/, ResourceName /*name*/) {
+    return {}; // the program file holds no icon
+}
+
+HCURSOR SetCursor(HCURSOR cursor) {
+    const HCURSOR before = current;
+    current = cursor;
+    if (before != cursor) {
+        applyToAll();
+    }
+    return before;
+}
+
+int ShowCursor(BOOL show) {
+    displayCount += show != FALSE ? 1 : -1;
+    applyToAll();
+    return displayCount;
+}
+
+BOOL GetCursorPos(POINT* point) {
+    if (!toolkit()) {
+        return FALSE;
+    }
+    const QPoint at = QCursor::pos();
+    *point = {at.x(), at.y()};
+    return TRUE;
+}
+
+BOOL SetCursorPos(int x, int y) {
+    if (!toolkit()) {
+        return FALSE;
+    }
+    QCursor::setPos(x, y);
+    return TRUE;
+}
+
+int GetSystemMetrics(int index) {
+    if ((index != SM_CXSCREEN && index != SM_CYSCREEN) || !toolkit()) {
+        return 0;
+    }
+    const QSize size = QGuiApplication::primaryScreen()->geometry().size();
+    return index == SM_CXSCREEN ? size.width() : size.height();
+}

@@ -1,0 +1,401 @@
+// Classes and windows: making, finding, placing and destroying them.
+#include "platform/user/window.h"
+
+#include "platform/gdi/surface.h"
+#include "platform/harness.h"
+#include "platform/trace.h"
+#include "platform/user/cursors.h"
+#include "platform/user/foreign.h"
+#include "platform/user/native_window.h"
+#include "platform/user/queue.h"
+#include "platform/user/roster.h"
+#include "platform/user/timers.h"
+#include "platform/user/toolkit.h"
+
+#include <QGuiApplication>
+#include <QScreen>
+
+#include <algorithm>
+#include <map>
+#include <vector>
+
+namespace seam {
+
+namespace {
+
+HandleTable<Window>& table() {
+    static HandleTable<Window> windows(HandleKind::window);
+    return windows;
+}
+
+std::map<std::string, WindowClass>& classes() {
+    static std::map<std::string, WindowClass> registered;
+    return registered;
+}
+
+HWND focus;
+
+/// Top-level windows are placed from the primary monitor's corner, which need not be the desktop's.
+QPoint originOf(const Window& window) {
+    return window.parent ? QPoint() : QGuiApplication::primaryScreen()->geometry().topLeft();
+}
+
+std::unique_ptr<NativeWindow> makeNative(const Window& window, DWORD exStyle) {
+    const Window* parent = findWindow(window.parent);
+    const QRect place(QPoint(window.place.left, window.place.top) + originOf(window),
+                      QSize(window.width(), window.height()));
+    QWindow* host = parent != nullptr ? parent->native.get() : nullptr;
+    if (parent == nullptr && window.parent) {
+        host = QWindow::fromWinId(window.parent.number);
+    }
+    auto native =
+        std::make_unique<NativeWindow>(window.handle, place, (exStyle & WS_EX_TOPMOST) != 0, host);
+    native->setTitle(QString::fromLatin1(window.title));
+    return native;
+}
+
+void show(Window& window) {
+    if (window.visible || !window.native) {
+        return;
+    }
+    SendMessageA(window.handle, WM_SHOWWINDOW, TRUE, 0);
+    window.visible = true;
+    invalidate(window, {0, 0, window.width(), window.height()}, true);
+    applyCursor(*window.native);
+    window.native->show();
+}
+
+/// Everything that lies in the window or is owned by it, the innermost last.
+std::vector<HWND> withChildren(HWND window) {
+    std::vector<HWND> found{window};
+    for (std::size_t i = 0; i < found.size(); ++i) {
+        forEachWindow([&](const Window& other) {
+            if (other.parent == found[i]) {
+                found.push_back(other.handle);
+            }
+        });
+    }
+    return found;
+}
+
+void sendSizeAndPlace(const Window& window) {
+    const HWND handle = window.handle;
+    SendMessageA(handle, WM_SIZE, 0,
+                 static_cast<LPARAM>(MAKELONG(window.width(), window.height())));
+    if (const Window* still = findWindow(handle)) {
+        SendMessageA(handle, WM_MOVE, 0,
+                     static_cast<LPARAM>(MAKELONG(still->place.left, still->place.top)));
+    }
+}
+
+/// Runs WM_CREATE and what follows it; false if it refused or destroyed its window.
+bool bringUp(HWND handle, CREATESTRUCTA& creation) {
+    if (SendMessageA(handle, WM_CREATE, 0, reinterpret_cast<LPARAM>(&creation)) == -1) {
+        DestroyWindow(handle);
+        return false;
+    }
+    const Window* window = findWindow(handle);
+    if (window != nullptr) {
+        sendSizeAndPlace(*window);
+    }
+    return findWindow(handle) != nullptr;
+}
+
+void removeWindow(HWND handle) {
+    killTimersOf(handle);
+    forgetMessagesOf(handle);
+    if (focus == handle) {
+        focus = {};
+    }
+    leaveRoster(handle);
+    table().take(handle.number);
+}
+
+} // namespace
+
+Window* findWindow(HWND window) {
+    return table().find(window.number);
+}
+
+void forEachWindow(const std::function<void(Window&)>& visit) {
+    table().forEach([&](DWORD, Window& window) { visit(window); });
+}
+
+HWND topLevelOf(HWND window) {
+    const Window* found = findWindow(window);
+    return found != nullptr && findWindow(found->parent) != nullptr ? topLevelOf(found->parent)
+                                                                    : window;
+}
+
+HWND keyTarget(HWND window) {
+    return focus && topLevelOf(focus) == topLevelOf(window) ? focus : window;
+}
+
+void invalidate(Window& window, RECT area, bool erase) {
+    area = {std::max(area.left, 0), std::max(area.top, 0), std::min(area.right, window.width()),
+            std::min(area.bottom, window.height())};
+    if (area.left >= area.right || area.top >= area.bottom) {
+        return;
+    }
+    const RECT& old = window.update;
+    window.update = window.paintNeeded
+                        ? RECT{std::min(area.left, old.left), std::min(area.top, old.top),
+                               std::max(area.right, old.right), std::max(area.bottom, old.bottom)}
+                        : area;
+    window.eraseNeeded = window.eraseNeeded || erase;
+    window.paintNeeded = true;
+    wake();
+}
+
+void windowResized(Window& window, int width, int height) {
+    window.place.right = window.place.left + width;
+    window.place.bottom = window.place.top + height;
+    invalidate(window, {0, 0, width, height}, true);
+    queueInput({window.handle, WM_SIZE, 0, static_cast<LPARAM>(MAKELONG(width, height)), 0});
+}
+
+void countUserHandles(HandleCounts& counts) {
+    counts.windows = table().live();
+    counts.timers = liveTimers();
+}
+
+HandleCounts liveHandles() {
+    HandleCounts counts;
+    countKernelHandles(counts);
+    countGdiHandles(counts);
+    countUserHandles(counts);
+    return counts;
+}
+
+Picture windowPicture(HWND window) {
+    Picture picture;
+    const Window* found = findWindow(window);
+    if (found == nullptr || !found->native) {
+        return picture;
+    }
+    const PixelView view = found->native->pixels();
+    picture.width = view.width;
+    picture.height = view.height;
+    for (int y = 0; y < view.height; ++y) {
+        const DWORD* row = view.bits + static_cast<std::ptrdiff_t>(y) * view.stride;
+        std::transform(row, row + view.width, std::back_inserter(picture.pixels),
+                       [](DWORD pixel) { return pixel & 0xFFFFFF; });
+    }
+    return picture;
+}
+
+} // namespace seam
+
+using namespace seam;
+
+WORD RegisterClassA(const WNDCLASSA* windowClass) {
+    const std::string name =
+        windowClass->lpszClassName == nullptr ? "" : windowClass->lpszClassName;
+    if (name.empty() || windowClass->lpfnWndProc == nullptr || classes().count(name) != 0) {
+        return 0;
+    }
+    classes()[name] = {name,
+                       windowClass->style,
+                       windowClass->lpfnWndProc,
+                       windowClass->hInstance,
+                       windowClass->hCursor,
+                       windowClass->hbrBackground};
+    return static_cast<WORD>(classes().size());
+}
+
+HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DWORD style, int x,
+                     int y, int width, int height, HWND parent, HMENU menu, HINSTANCE instance,
+                     void* parameter) {
+    const auto windowClass = classes().find(className == nullptr ? "" : className);
+    const bool child = (style & WS_CHILD) != 0;
+    if (windowClass == classes().end() || (child && !IsWindow(parent)) || !toolkit()) {
+        return {};
+    }
+    auto made = std::make_unique<Window>();
+    Window& window = *made;
+    window.windowClass = &windowClass->second;
+    window.parent = child ? parent : HWND{};
+    window.style = style;
+    window.title = title == nullptr ? "" : title;
+    window.place = {x, y, x + std::max(width, 1), y + std::max(height, 1)};
+    const HWND handle{table().add(std::move(made))};
+    if (!handle) {
+        return {};
+    }
+    window.handle = handle;
+    window.native = makeNative(window, exStyle);
+    if (mayBeForeign(window.parent)) {
+        followHost(window.parent, handle);
+    } else if (!child) {
+        joinRoster(window);
+    }
+    CREATESTRUCTA creation{
+        parameter, instance,  menu,   parent, height, width, y, x, static_cast<LONG>(style),
+        title,     className, exStyle};
+    if (!bringUp(handle, creation)) {
+        return {};
+    }
+    if ((style & WS_VISIBLE) != 0) {
+        show(window);
+    }
+    return findWindow(handle) != nullptr ? handle : HWND{};
+}
+
+BOOL DestroyWindow(HWND window) {
+    Window* found = findWindow(window);
+    if (found == nullptr || found->dying) {
+        return FALSE;
+    }
+    found->dying = true;
+    SendMessageA(window, WM_DESTROY, 0, 0);
+    std::vector<HWND> doomed = withChildren(window);
+    std::for_each(doomed.begin() + 1, doomed.end(), [](HWND child) {
+        if (Window* record = findWindow(child)) {
+            record->dying = true;
+            SendMessageA(child, WM_DESTROY, 0, 0);
+        }
+    });
+    std::for_each(doomed.rbegin(), doomed.rend(), removeWindow);
+    return TRUE;
+}
+
+BOOL IsWindow(HWND window) {
+    return findWindow(window) != nullptr || isRemote(window) || foreignExists(window) ? TRUE
+                                                                                      : FALSE;
+}
+
+BOOL IsIconic(HWND window) {
+    const Window* found = findWindow(topLevelOf(window));
+    return found != nullptr && found->native &&
+                   (found->native->windowStates() & Qt::WindowMinimized) != 0
+               ? TRUE
+               : FALSE;
+}
+
+HWND GetParent(HWND window) {
+    const Window* found = findWindow(window);
+    return found == nullptr ? HWND{} : found->parent;
+}
+
+HWND FindWindowA(const char* className, const char* title) {
+    HWND result;
+    forEachWindow([&](const Window& window) {
+        if (!result && !window.parent && !window.dying && window.windowClass->name == className &&
+            (title == nullptr || window.title == title)) {
+            result = window.handle;
+        }
+    });
+    return result || title == nullptr ? result : findRemote(className, title);
+}
+
+BOOL ShowWindow(HWND window, int command) {
+    Window* found = findWindow(window);
+    if (found == nullptr) {
+        return FALSE;
+    }
+    const bool before = found->visible;
+    if (command != SW_HIDE) {
+        show(*found);
+    } else if (before) {
+        found->visible = false;
+        found->native->hide();
+    }
+    return before ? TRUE : FALSE;
+}
+
+BOOL MoveWindow(HWND window, int x, int y, int width, int height, BOOL repaint) {
+    Window* found = findWindow(window);
+    if (found == nullptr) {
+        return FALSE;
+    }
+    const bool sized = width != found->width() || height != found->height();
+    const bool moved = x != found->place.left || y != found->place.top;
+    found->place = {x, y, x + std::max(width, 1), y + std::max(height, 1)};
+    const QRect place(QPoint(x, y) + originOf(*found), QSize(found->width(), found->height()));
+    if (sized) {
+        found->native->resizePicture(place.size());
+    }
+    found->native->setGeometry(place);
+    if (repaint != FALSE) {
+        invalidate(*found, {0, 0, found->width(), found->height()}, true);
+    }
+    if (sized || moved) {
+        sendSizeAndPlace(*found);
+    }
+    return TRUE;
+}
+
+BOOL SetWindowPos(HWND window, HWND after, int x, int y, int width, int height, UINT flags) {
+    Window* found = findWindow(window);
+    if (found == nullptr || after != HWND_TOP) {
+        return FALSE;
+    }
+    if ((flags & SWP_NOZORDER) == 0) {
+        found->native->raise();
+    }
+    const RECT place = found->place;
+    const bool keepsPlace = (flags & SWP_NOMOVE) != 0;
+    const bool keepsSize = (flags & SWP_NOSIZE) != 0;
+    return MoveWindow(window, keepsPlace ? place.left : x, keepsPlace ? place.top : y,
+                      keepsSize ? found->width() : width, keepsSize ? found->height() : height,
+                      FALSE);
+}
+
+LONG GetWindowLongA(HWND window, int index) {
+    const Window* found = findWindow(window);
+    return found == nullptr || index != GWL_HINSTANCE
+               ? 0
+               : static_cast<LONG>(found->windowClass->instance.number);
+}
+
+DWORD SetClassLongA(HWND window, int index, LONG value) {
+    Window* found = findWindow(window);
+    if (found == nullptr || index != GCL_HCURSOR) {
+        return 0;
+    }
+    const DWORD before = found->windowClass->cursor.number;
+    found->windowClass->cursor = HCURSOR{static_cast<DWORD>(value)};
+    return before;
+}
+
+BOOL GetClientRect(HWND window, RECT* area) {
+    if (const Window* found = findWindow(window)) {
+        *area = {0, 0, found->width(), found->height()};
+        return TRUE;
+    }
+    SIZE size{};
+    if (!foreignSize(window, size)) {
+        return FALSE;
+    }
+    *area = {0, 0, size.cx, size.cy};
+    return TRUE;
+}
+
+HWND SetFocus(HWND window) {
+    const HWND before = focus;
+    focus = findWindow(window) != nullptr ? window : HWND{};
+    return before;
+}
+
+HWND GetForegroundWindow() {
+    HWND result;
+    forEachWindow([&](const Window& window) {
+        if (window.native && window.native->isActive() && !window.parent) {
+            result = window.handle;
+        }
+    });
+    return result ? result : foreignFocus();
+}
+
+BOOL SetForegroundWindow(HWND window) {
+    if (isRemote(window)) {
+        return raiseRemote(window) ? TRUE : FALSE;
+    }
+    Window* found = findWindow(window);
+    if (found == nullptr || !found->native) {
+        return FALSE;
+    }
+    found->native->raise();
+    found->native->requestActivate();
+    return TRUE;
+}

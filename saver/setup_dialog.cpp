@@ -1,0 +1,5 @@
+#include "saver/setup_dialog.h"
+
+LRESULT SetupDialogProc(HWND /*dialog*/, UINT /*message*/, WPARAM /*wParam*/, LPARAM /*lParam*/) {
+    return FALSE;
+}
