@@ -1,0 +1,29 @@
+// Acts shows out on a clock moved by hand, without a screen, and keeps the record of what happened:
+// the saver's own road from its window's creation on, the same each time for the same seed.
+#pragma once
+
+#include <cstdint>
+#include <functional>
+#include <string>
+#include <vector>
+
+struct ReplayOptions {
+    std::vector<std::string>
+        toons;        // files; copied into a directory of their own. None: walks about
+    int width = 1024; // of the stage, in pixels
+    int height = 768;
+    std::uint32_t seed = 1;  // of the random numbers
+    int shows = 1;           // after how many ends of a show the stage closes
+    std::uint32_t paces = 0; // the odometer at the start; 0 plays intro.zkt first
+    bool statements = true;  // whether walks about use the table of statements
+};
+
+/// Hands each line of the record to `line`. A stage that stands still for good, as after a Toon
+/// that doesn't load, is closed; message boxes are answered with OK. The settings are those of a
+/// fresh user and lie in a directory that goes at the end. Throws std::filesystem::filesystem_error
+/// if the files can't be copied.
+void Replay(const ReplayOptions& options, const std::function<void(const std::string&)>& line);
+
+/// `toon trace [--size WxH] [--seed N] [--shows N] [--paces N] [FILE...]`: prints the record; gives
+/// the exit code.
+int TraceCommand(const std::vector<std::string>& arguments);
