@@ -1,0 +1,87 @@
+// The profile service.
+
+#include "platform/kernel.h"
+#include "platform/kernel/config_directory.h"
+#include "platform/kernel/paths.h"
+#include "platform/kernel/profile_text.h"
+#include "platform/kernel/text.h"
+#include "platform/kernel/transfer.h"
+
+#include <cerrno>
+#include <optional>
+
+namespace {
+
+/// A larger file counts as one with no keys, and nothing is written to it.
+constexpr std::size_t largestProfile = 256 << 20;
+
+const char* orEmpty(const char* text) {
+    return text != nullptr ? text : "";
+}
+
+bool hasDirectory(std::string_view name) {
+    return name.find_first_of("\\/:") != std::string_view::npos;
+}
+
+/// The file's path in the file system; empty if there can be none.
+std::string profilePath(const char* file) {
+    const std::string_view name = orEmpty(file);
+    if (name.empty() || hasDirectory(name)) {
+        return seam::lookUpPath(name).path;
+    }
+    const std::string directory = seam::configDirectory();
+    const std::string spelled = seam::spelledName(directory, name);
+    return directory + "/" + (spelled.empty() ? std::string(name) : spelled);
+}
+
+seam::WholeFile readProfile(const char* file) {
+    const std::string path = profilePath(file);
+    return path.empty() ? seam::WholeFile{EINVAL, {}} : seam::readWholeFile(path, largestProfile);
+}
+
+std::optional<std::string> valueIn(const char* file, const char* section, const char* key) {
+    return seam::profileValue(readProfile(file).text, orEmpty(section), orEmpty(key));
+}
+
+} // namespace
+
+UINT GetPrivateProfileIntA(const char* section, const char* key, int otherwise, const char* file) {
+    const std::optional<std::string> value = valueIn(file, section, key);
+    if (!value) {
+        return static_cast<UINT>(otherwise);
+    }
+    UINT number = 0;
+    for (const char letter : *value) {
+        if (letter < '0' || letter > '9') {
+            break;
+        }
+        number = number * 10 + static_cast<UINT>(letter - '0');
+    }
+    return number;
+}
+
+DWORD GetPrivateProfileStringA(const char* section, const char* key, const char* otherwise,
+                               char* buffer, DWORD size, const char* file) {
+    const std::optional<std::string> value = valueIn(file, section, key);
+    return static_cast<DWORD>(seam::copyCut(value ? *value : orEmpty(otherwise), buffer, size));
+}
+
+BOOL WritePrivateProfileStringA(const char* section, const char* key, const char* value,
+                                const char* file) {
+    if (section == nullptr || key == nullptr || value == nullptr ||
+        !seam::canStandInProfile(section, key, value)) {
+        return FALSE;
+    }
+    const seam::WholeFile old = readProfile(file);
+    if (old.error != 0 && old.error != ENOENT) {
+        return FALSE;
+    }
+    if (seam::profileValue(old.text, section, key) == value) {
+        return TRUE;
+    }
+    if (!hasDirectory(orEmpty(file)) && !seam::makeConfigDirectory()) {
+        return FALSE;
+    }
+    const std::string text = seam::profileWithValue(old.text, section, key, value);
+    return seam::replaceFile(profilePath(file), text) ? TRUE : FALSE;
+}

@@ -1,0 +1,105 @@
+// Resources of the program file, which Qt's resource system holds: bitmaps as whole .bmp files in
+// ":/bitmap", dialogs in ":/dialog".
+
+#include "platform/handle_table.h"
+#include "platform/kernel.h"
+#include "platform/kernel/text.h"
+
+#include <QtCore/QResource>
+
+#include <cstring>
+#include <string>
+
+namespace {
+
+struct FoundResource {
+    std::string path;
+    QByteArray bytes;
+};
+
+/// What has been found so far, each resource once; it stays, for nothing ever gives it back.
+seam::HandleTable<FoundResource> resources(seam::HandleKind::other);
+
+/// The folder of a type's resources and what stands in front of the bytes proper.
+struct ResourceFolder {
+    const char* path = nullptr;
+    qsizetype header = 0;
+};
+
+ResourceFolder folderOf(ResourceName type) {
+    constexpr qsizetype bitmapFileHeader = 14;
+    if (type.text != nullptr) {
+        return {};
+    }
+    if (type.number == RT_BITMAP.number) {
+        return {":/bitmap", bitmapFileHeader};
+    }
+    return type.number == RT_DIALOG.number ? ResourceFolder{":/dialog", 0} : ResourceFolder{};
+}
+
+/// The path of the resource of this name, whatever its case; empty if there is none.
+std::string resourcePath(const char* folder, const std::string& name) {
+    for (const QString& entry : QResource(QString::fromLatin1(folder)).children()) {
+        const std::string candidate = entry.toStdString();
+        if (seam::sameButForCase(candidate, name)) {
+            return std::string(folder) + "/" + candidate;
+        }
+    }
+    return {};
+}
+
+DWORD handleOf(const std::string& path) {
+    DWORD handle = 0;
+    resources.forEach([&](DWORD number, const FoundResource& resource) {
+        handle = resource.path == path ? number : handle;
+    });
+    return handle;
+}
+
+} // namespace
+
+HRSRC FindResourceA(HINSTANCE, ResourceName name, ResourceName type) {
+    const ResourceFolder folder = folderOf(type);
+    if (folder.path == nullptr) {
+        return nullptr;
+    }
+    const std::string wanted = name.text != nullptr ? name.text : std::to_string(name.number);
+    const std::string path = resourcePath(folder.path, wanted);
+    if (const DWORD known = path.empty() ? 0 : handleOf(path); known != 0) {
+        return HRSRC{known};
+    }
+    const QByteArray whole = QResource(QString::fromStdString(path)).uncompressedData();
+    if (path.empty() || whole.size() <= folder.header) {
+        return nullptr;
+    }
+    return HRSRC{resources.add(std::make_unique<FoundResource>(path, whole.sliced(folder.header)))};
+}
+
+HGLOBAL LoadResource(HINSTANCE, HRSRC resource) {
+    // The copy begins where a record may begin; the bytes behind a file header don't.
+    const FoundResource* found = resources.find(resource.number);
+    const HGLOBAL block =
+        found != nullptr ? GlobalAlloc(GMEM_MOVEABLE, static_cast<std::size_t>(found->bytes.size()))
+                         : HGLOBAL{};
+    if (void* target = GlobalLock(block)) {
+        std::memcpy(target, found->bytes.constData(),
+                    static_cast<std::size_t>(found->bytes.size()));
+        GlobalUnlock(block);
+    }
+    return block;
+}
+
+const void* LockResource(HGLOBAL resource) {
+    const void* bytes = GlobalLock(resource);
+    GlobalUnlock(resource);
+    return bytes;
+}
+
+BOOL FreeResource(HGLOBAL resource) {
+    return resource && !GlobalFree(resource) ? TRUE : FALSE;
+}
+
+DWORD SizeofResource(HINSTANCE, HRSRC resource) {
+    const FoundResource* found = resources.find(resource.number);
+    return found != nullptr ? static_cast<DWORD>(found->bytes.size()) : 0;
+}

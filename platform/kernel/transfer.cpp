@@ -1,0 +1,140 @@
+#include "platform/kernel/transfer.h"
+
+#include "platform/kernel/descriptor.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <climits>
+#include <cstdio>
+#include <cstdlib>
+#include <memory>
+
+namespace seam {
+
+namespace {
+
+template <class Byte, class Transfer>
+ssize_t transferFully(Byte* buffer, std::size_t bytes, Transfer transfer) {
+    std::size_t done = 0;
+    while (done < bytes) {
+        const ssize_t count = transfer(buffer + done, bytes - done);
+        if (count < 0 && errno == EINTR) {
+            continue;
+        }
+        if (count < 0 && done == 0) {
+            return -1;
+        }
+        if (count <= 0) {
+            break;
+        }
+        done += static_cast<std::size_t>(count);
+    }
+    return static_cast<ssize_t>(done);
+}
+
+/// Reads on to the end of the file. The size told is no more than a start: a file of /proc tells 0.
+WholeFile readToEnd(int file, std::size_t sizeTold, std::size_t limit) {
+    constexpr std::size_t chunk = 65536;
+    std::string text;
+    std::size_t room = sizeTold + chunk;
+    while (sizeTold <= limit && text.size() <= limit) {
+        const std::size_t before = text.size();
+        text.resize(std::min(before + room, limit + 1));
+        const ssize_t count = readFully(file, text.data() + before, text.size() - before);
+        if (count < 0) {
+            return {errno, {}};
+        }
+        const std::size_t filled = before + static_cast<std::size_t>(count);
+        if (filled < text.size()) {
+            text.resize(filled);
+            return {0, std::move(text)};
+        }
+        room = chunk;
+    }
+    return {EFBIG, {}};
+}
+
+/// The path of what the links at `path` lead to; the path itself where there is nothing yet.
+std::string withoutLinks(const std::string& path) {
+    const std::unique_ptr<char, decltype(&std::free)> real(realpath(path.c_str(), nullptr),
+                                                           &std::free);
+    if (real) {
+        return real.get();
+    }
+    char target[PATH_MAX];
+    const bool missing = errno == ENOENT; // and no circle of links
+    const ssize_t length = missing ? readlink(path.c_str(), target, sizeof target) : -1;
+    if (length <= 0) {
+        return path;
+    }
+    const std::string next(target, static_cast<std::size_t>(length));
+    const bool whole = next.front() == '/';
+    return withoutLinks(whole ? next : path.substr(0, path.rfind('/') + 1) + next);
+}
+
+constexpr mode_t newFileMode = 0600;
+constexpr mode_t anybodyWrites = S_IWUSR | S_IWGRP | S_IWOTH;
+
+/// The mode that a file takes over from the one it replaces; 0 if that must not be replaced.
+mode_t modeForReplacing(const std::string& path) {
+    struct stat status = {};
+    if (stat(path.c_str(), &status) != 0) {
+        return errno == ENOENT ? newFileMode : 0;
+    }
+    const bool writable = (status.st_mode & anybodyWrites) != 0 &&
+                          faccessat(AT_FDCWD, path.c_str(), W_OK, AT_EACCESS) == 0;
+    return S_ISREG(status.st_mode) && writable ? status.st_mode & 07777 : 0;
+}
+
+} // namespace
+
+ssize_t readFully(int descriptor, void* buffer, std::size_t bytes) {
+    return transferFully(
+        static_cast<char*>(buffer), bytes,
+        [descriptor](char* at, std::size_t left) { return read(descriptor, at, left); });
+}
+
+ssize_t writeFully(int descriptor, const void* buffer, std::size_t bytes) {
+    return transferFully(
+        static_cast<const char*>(buffer), bytes,
+        [descriptor](const char* at, std::size_t left) { return write(descriptor, at, left); });
+}
+
+WholeFile readWholeFile(const std::string& path, std::size_t limit) {
+    const Descriptor file(open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC | O_NOCTTY));
+    struct stat status = {};
+    if (!file || fstat(file.number(), &status) != 0) {
+        return {errno, {}};
+    }
+    if (!S_ISREG(status.st_mode)) {
+        return {EINVAL, {}};
+    }
+    return readToEnd(file.number(), static_cast<std::size_t>(status.st_size), limit);
+}
+
+bool replaceFile(const std::string& path, std::string_view text) {
+    const std::string target = withoutLinks(path);
+    const mode_t mode = modeForReplacing(target);
+    if (mode == 0) {
+        return false;
+    }
+    std::string beside = target + ".XXXXXX";
+    const Descriptor file(mkostemp(beside.data(), O_CLOEXEC));
+    if (!file) {
+        return false;
+    }
+    const bool written =
+        writeFully(file.number(), text.data(), text.size()) == static_cast<ssize_t>(text.size()) &&
+        fchmod(file.number(), mode) == 0 && fsync(file.number()) == 0 &&
+        rename(beside.c_str(), target.c_str()) == 0;
+    if (!written) {
+        unlink(beside.c_str());
+    }
+    return written;
+}
+
+} // namespace seam
