@@ -1,0 +1,64 @@
+// A window whose procedure keeps a list of what reaches it.
+#pragma once
+
+#include "platform/harness.h"
+#include "platform/kernel.h"
+#include "platform/user.h"
+
+#include <functional>
+#include <map>
+#include <string>
+#include <vector>
+
+namespace test {
+
+struct Seen {
+    UINT message;
+    WPARAM wParam;
+    LPARAM lParam;
+};
+
+inline std::vector<Seen> seen;
+inline std::map<UINT, std::function<LRESULT(HWND, WPARAM, LPARAM)>> handlers;
+
+inline LRESULT recordingProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
+    seen.push_back({message, wParam, lParam});
+    const auto handler = handlers.find(message);
+    return handler != handlers.end() ? handler->second(window, wParam, lParam)
+                                     : DefWindowProcA(window, message, wParam, lParam);
+}
+
+/// The messages of the list among those asked for, in their order.
+inline std::vector<UINT> seenAmong(const std::vector<UINT>& wanted) {
+    std::vector<UINT> found;
+    for (const Seen& entry : seen) {
+        for (const UINT message : wanted) {
+            if (entry.message == message) {
+                found.push_back(message);
+            }
+        }
+    }
+    return found;
+}
+
+inline HWND makeWindow(int width = 40, int height = 30, DWORD style = WS_POPUP | WS_VISIBLE,
+                       HWND parent = nullptr, const char* title = "Test") {
+    WNDCLASSA windowClass{};
+    windowClass.lpfnWndProc = recordingProc;
+    windowClass.hInstance = GetModuleHandleA(nullptr);
+    windowClass.hbrBackground = HBRUSH{GetStockObject(LTGRAY_BRUSH)};
+    windowClass.lpszClassName = "TestClass";
+    RegisterClassA(&windowClass);
+    return CreateWindowExA(0, "TestClass", title, style, 0, 0, width, height, parent, nullptr,
+                           windowClass.hInstance, nullptr);
+}
+
+/// Takes and dispatches what waits now, timers left out.
+inline void handleWaiting() {
+    MSG message{};
+    while (PeekMessageA(&message, nullptr, 0, WM_TIMER - 1, PM_REMOVE)) {
+        DispatchMessageA(&message);
+    }
+}
+
+} // namespace test
