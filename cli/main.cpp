@@ -1,0 +1,42 @@
+// The program `toon`: what can be done with Toon files without a screen.
+#include "cli/make_print.h"
+
+#include <cstdio>
+#include <string>
+#include <vector>
+
+namespace {
+
+struct Command {
+    const char* name;
+    const char* usage;
+    int fewest; // arguments behind the name
+    int most;
+    int (*run)(const std::vector<std::string>& arguments); // gives the exit code
+};
+
+constexpr Command commands[] = {
+    {"make", "TEXT FILE.zkt", 2, 2, MakeCommand},
+    {"print", "FILE.zkt", 1, 1, PrintCommand},
+};
+
+int TellUsage() {
+    for (const Command& command : commands) {
+        std::fprintf(stderr, "usage: toon %s %s\n", command.name, command.usage);
+    }
+    return 2;
+}
+
+} // namespace
+
+int main(int count, char** arguments) {
+    constexpr int inFront = 2; // the program's name and the command's
+    const int behind = count - inFront;
+    for (const Command& command : commands) {
+        if (behind >= command.fewest && behind <= command.most &&
+            command.name == std::string(arguments[1])) {
+            return command.run({arguments + inFront, arguments + count});
+        }
+    }
+    return TellUsage();
+}
