@@ -187,8 +187,8 @@ int PickToonFile() {
 }
 
 static BOOL BackgroundExists(HINSTANCE instance, LONG number) {
-    char name[MAX_PATH];
-    TileName(number, name);
+    char name[TILE_NAME_SIZE];
+    TileName(name, number);
     return FindResourceA(instance, name, RT_BITMAP) ? TRUE : FALSE;
 }
 

@@ -15,7 +15,6 @@ HFONT TitleFont;
 HFONT BylineFont;
 
 static constexpr char FIRST_TILE[] = "bg01";
-static constexpr int TILE_NAME_SIZE = 16;
 
 static LONG StageWidth() {
     return LOWORD(StageSize);
@@ -28,7 +27,7 @@ static LONG StageHeight() {
 // ---- Building
 // --------------------------------------------------------------------------------------
 
-static void TileName(char* name, LONG index) {
+void TileName(char* name, LONG index) {
     wsprintfA(name, index < 10 ? "bg0%d" : "bg%d", index);
 }
 

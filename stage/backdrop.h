@@ -27,6 +27,11 @@ HBITMAP RebuildBackdrop(HWND stage, HINSTANCE instance);
 /// of its number shows bg01.
 HBITMAP BuildBackdrop(HINSTANCE instance, HWND stage);
 
+constexpr int TILE_NAME_SIZE = 16; // bytes, the NUL included
+
+/// Writes the name of the tile of a number: "bg01", "bg10".
+void TileName(char* name, LONG index);
+
 /// Blanks the stage (BlankStage) and loads the tile bgNN; null if there is none.
 HBITMAP LoadNumberedTile(HINSTANCE instance, HDC dc, LONG index);
 

@@ -161,8 +161,8 @@ TEST_F(Windows, PointerHidesByCountOrByShape) {
     EXPECT_EQ(ShowCursor(FALSE), -1);
     EXPECT_EQ(ShowCursor(TRUE), 0);
     const HCURSOR wait = LoadCursorA(nullptr, IDC_WAIT);
-    const HCURSOR before = SetCursor(wait);
-    EXPECT_EQ(SetCursor(before), wait);
+    const HCURSOR old = SetCursor(wait);
+    EXPECT_EQ(SetCursor(old), wait);
 }
 
 } // namespace
