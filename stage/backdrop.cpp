@@ -24,8 +24,7 @@ static LONG StageHeight() {
     return HIWORD(StageSize);
 }
 
-// ---- Building
-// --------------------------------------------------------------------------------------
+// ---- Building -----------------------------------------------------------------------------------
 
 void TileName(char* name, LONG index) {
     wsprintfA(name, index < 10 ? "bg0%d" : "bg%d", index);
@@ -172,8 +171,7 @@ void BlankStage(HDC dc) {
     SelectObject(dc, brush);
 }
 
-// ---- Painting
-// --------------------------------------------------------------------------------------
+// ---- Painting -----------------------------------------------------------------------------------
 
 void BlitBackdrop(HDC dc, HWND /*stage*/, HBITMAP bitmap) {
     if (!bitmap) {

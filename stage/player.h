@@ -7,8 +7,7 @@
 
 #include "platform/user.h"
 
-// ---- State: written here and by StageBegin unless a line says otherwise
-// ----------------------------
+// ---- State: written here and by StageBegin unless a line says otherwise -------------------------
 
 /// The frame that the next walk goes to; 0 when no show runs. The show cycle also clears it.
 extern LONG NextFrameIndex;
@@ -37,8 +36,7 @@ extern LONG CharacterY;
 /// The frame that is acted out.
 extern ToonFrame PlayFrame;
 
-// ---- Shows
-// ---------------------------------------------------------------------------------------
+// ---- Shows --------------------------------------------------------------------------------------
 
 /// Starts the walk to the next frame, or off the stage after the last one, and ends the pause of
 /// the frame before. Brings him on first if no show has started.
@@ -78,8 +76,7 @@ bool ShowUnderWay();
 /// The part of `range` that the show has come through, the frame walked to included.
 LONG PlayProgress(LONG range);
 
-// ---- The window's messages
-// -------------------------------------------------------------------------
+// ---- The window's messages ----------------------------------------------------------------------
 
 /// Gives the stage the wait cursor or the arrow, at once. Nothing while SaverActive is 1.
 void SetBusyCursor(HWND stage, BOOL busy);

@@ -7,8 +7,7 @@
 
 #include "platform/user.h"
 
-// ---- Messages
-// ------------------------------------------------------------------------------------
+// ---- Messages -----------------------------------------------------------------------------------
 
 constexpr UINT TM_BACKGROUND = 1028;        // to the editor: build the backdrop anew and repaint
 constexpr UINT TM_ENABLEPLAY = 1029;        // to the editor: enable the Play button by wParam
@@ -17,8 +16,7 @@ constexpr UINT TM_SHOWDONE = 1031;          // to the stage: a show or walk abou
 constexpr UINT TM_WALKDONE = 1032;          // to the stage: a walk has ended
 constexpr UINT TM_VERIFYPASSWORD = 0x8000U; // to the saver: run the password verifier
 
-// ---- Timers
-// --------------------------------------------------------------------------------------
+// ---- Timers -------------------------------------------------------------------------------------
 
 constexpr UINT_PTR TIMER_OPENING = 0; // on the editor's main window, all others on the stage
 constexpr UINT_PTR TIMER_ARRIVAL = 1;
@@ -30,8 +28,7 @@ constexpr UINT_PTR TIMER_WALK = 101;
 /// The name under which a timer stands in the record, without TIMER_; null for an unknown id.
 const char* StageTimerName(UINT_PTR timer);
 
-// ---- Who runs the stage
-// ----------------------------------------------------------------------------
+// ---- Who runs the stage -------------------------------------------------------------------------
 
 /// 1 while the stage runs in a saver or player window and leaves the editor's buttons and cursors
 /// alone, else 0. Written by the saver's start and end of a show.
@@ -50,8 +47,7 @@ void StageBegin();
 /// before this returns.
 void SendShowDone(HWND stage);
 
-// ---- Positions
-// -----------------------------------------------------------------------------------
+// ---- Positions ----------------------------------------------------------------------------------
 
 /// Sum and difference, wrapping at 32 bits: a Toon file may put the character anywhere.
 constexpr LONG WrapAdd(LONG a, LONG b) {
