@@ -12,10 +12,10 @@ constexpr std::string_view byteOrderMark = "\xEF\xBB\xBF"; // some editors put o
 
 /// Where a key stands in a text, or would stand.
 struct Place {
-    bool inSection = false;                // the section is there
-    std::size_t begin = 0;                 // the key's line with its end, or an empty range
-    std::size_t end = 0;                   // where its line belongs
-    std::optional<std::string_view> value; // as it stands behind the "=", without blanks
+    bool inSection = false;                  // the section is there
+    std::size_t begin = 0;                   // the key's line with its end, or an empty range
+    std::size_t end = 0;                     // where its line belongs
+    std::optional<std::string_view> value{}; // as it stands behind the "=", without blanks
 };
 
 /// The name in a line of the form "[name]".

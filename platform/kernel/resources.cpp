@@ -5,6 +5,7 @@
 #include "platform/kernel.h"
 #include "platform/kernel/text.h"
 
+#include <QtCore/QDir>
 #include <QtCore/QResource>
 
 #include <cstring>
@@ -14,7 +15,16 @@ namespace {
 
 struct FoundResource {
     std::string path;
-    QByteArray bytes;
+    QByteArray whole; // shares the program's own bytes where they aren't compressed
+    qsizetype start = 0;
+
+    const char* bytes() const {
+        return whole.constData() + start;
+    }
+
+    std::size_t size() const {
+        return static_cast<std::size_t>(whole.size() - start);
+    }
 };
 
 /// What has been found so far, each resource once; it stays, for nothing ever gives it back.
@@ -39,7 +49,7 @@ ResourceFolder folderOf(ResourceName type) {
 
 /// The path of the resource of this name, whatever its case; empty if there is none.
 std::string resourcePath(const char* folder, const std::string& name) {
-    for (const QString& entry : QResource(QString::fromLatin1(folder)).children()) {
+    for (const QString& entry : QDir(QString::fromLatin1(folder)).entryList(QDir::Files)) {
         const std::string candidate = entry.toStdString();
         if (seam::sameButForCase(candidate, name)) {
             return std::string(folder) + "/" + candidate;
@@ -72,18 +82,16 @@ HRSRC FindResourceA(HINSTANCE, ResourceName name, ResourceName type) {
     if (path.empty() || whole.size() <= folder.header) {
         return nullptr;
     }
-    return HRSRC{resources.add(std::make_unique<FoundResource>(path, whole.sliced(folder.header)))};
+    return HRSRC{
+        resources.add(std::make_unique<FoundResource>(FoundResource{path, whole, folder.header}))};
 }
 
 HGLOBAL LoadResource(HINSTANCE, HRSRC resource) {
     // The copy begins where a record may begin; the bytes behind a file header don't.
     const FoundResource* found = resources.find(resource.number);
-    const HGLOBAL block =
-        found != nullptr ? GlobalAlloc(GMEM_MOVEABLE, static_cast<std::size_t>(found->bytes.size()))
-                         : HGLOBAL{};
+    const HGLOBAL block = found != nullptr ? GlobalAlloc(GMEM_MOVEABLE, found->size()) : HGLOBAL{};
     if (void* target = GlobalLock(block)) {
-        std::memcpy(target, found->bytes.constData(),
-                    static_cast<std::size_t>(found->bytes.size()));
+        std::memcpy(target, found->bytes(), found->size());
         GlobalUnlock(block);
     }
     return block;
@@ -101,5 +109,5 @@ BOOL FreeResource(HGLOBAL resource) {
 
 DWORD SizeofResource(HINSTANCE, HRSRC resource) {
     const FoundResource* found = resources.find(resource.number);
-    return found != nullptr ? static_cast<DWORD>(found->bytes.size()) : 0;
+    return found != nullptr ? static_cast<DWORD>(found->size()) : 0;
 }
