@@ -1,7 +1,9 @@
 #include "resources/art/figure.h"
 
 #include "resources/art/painter.h"
+#include "resources/art/wardrobe.h"
 
+#include <algorithm>
 #include <cmath>
 #include <utility>
 
@@ -9,14 +11,11 @@ namespace art {
 
 namespace {
 
-constexpr Colour Line = DarkBlue;
-constexpr Ink Cloth = DarkCyan;
-constexpr Ink ClothShade = {DarkCyan, DarkBlue};
-
+constexpr double HandSize = 1.12;
 constexpr double UpperArm = 19;
 constexpr double LowerArm = 18;
-constexpr double Thigh = 26;
-constexpr double Shin = 25;
+constexpr double Thigh = 24.5;
+constexpr double Shin = 23.5;
 
 // Places on the trunk: `down` goes from 0 at the neck to 1 at the pelvis, `aside` is in pixels to
 // the right.
@@ -37,7 +36,7 @@ Trunk trunkOf(const Figure& figure) {
 }
 
 Point shoulder(const Figure& figure, std::size_t which) {
-    const double aside = 11.5 - 9 * figure.turn;
+    const double aside = 12 - 9.5 * figure.turn;
     return trunkOf(figure)(which == 0 ? -aside : aside, 0.16) - Point{0, figure.shoulderLift};
 }
 
@@ -49,7 +48,26 @@ Point hip(const Figure& figure, std::size_t which) {
 std::vector<Outline> placed(std::vector<Outline> outlines, Point at, double degrees, double flip) {
     for (Outline& outline : outlines) {
         for (Point& point : outline) {
-            point = at + turned({point.x, point.y * flip}, degrees);
+            point = at + turned({point.x * HandSize, point.y * flip * HandSize}, degrees);
+        }
+    }
+    return outlines;
+}
+
+std::vector<Outline> coatOutlines(const Figure& figure) {
+    const Trunk at = trunkOf(figure);
+    const double slim = 1 - 0.22 * figure.turn;
+    const double lift = figure.shoulderLift / 40;
+    std::vector<Outline> outlines = {
+        blob({at(0, -0.02), at(9 * slim, 0.02 - lift), at(14 * slim, 0.14 - lift),
+              at(13.5 * slim, 0.5), at(15 * slim, 0.95), at(13 * slim, 1.12), at(0, 1.16),
+              at(-13 * slim, 1.12), at(-15 * slim, 0.95), at(-13.5 * slim, 0.5),
+              at(-14 * slim, 0.14 - lift), at(-9 * slim, 0.02 - lift)})};
+    if (figure.tails > 0) {
+        const std::vector<Point> hang = {at(-7, 0.7), at(-10 - figure.tails * 0.3, 1.0),
+                                         at(-9 - figure.tails, 1.3)};
+        for (Outline& outline : tube(hang, 8, 4)) {
+            outlines.push_back(std::move(outline));
         }
     }
     return outlines;
@@ -74,20 +92,36 @@ std::vector<Outline> handOutlines(Grip grip) {
     return {};
 }
 
+// Takes away the line between sleeve and coat at the shoulder, where they are one piece of cloth.
+void joinSleeve(Picture& picture, const Figure& figure, Point root) {
+    const Mask coat = coverage(coatOutlines(figure), picture.width, picture.height);
+    paintWithin(picture, {{ellipse(root + Point{0, 1.5}, 5, 5.5)}, Coat, Coat, 0}, coat);
+}
+
+void paintCuff(Picture& picture, Point elbow, Point wrist) {
+    const Point along = (wrist - elbow) * (1 / std::max(distance(elbow, wrist), 0.001));
+    const Point across = {-along.y, along.x};
+    const Part cuff = {
+        {bone(wrist - across * 3.6, wrist + across * 3.6, 1.9, 1.9)}, Trim, TrimShade, 1};
+    paintOutlined(picture, cuff, Line);
+}
+
 void paintArm(Picture& picture, const Figure& figure, std::size_t which) {
     const Arm& arm = figure.arms[which];
     const Point root = shoulder(figure, which);
-    const Point elbow = joint(root, arm.wrist, UpperArm, LowerArm, arm.bend);
-    const Part hand = {placed(handOutlines(arm.grip), arm.wrist, arm.angle, arm.thumb), White,
-                       LightGrey, 2};
+    const double seen = distance(root, arm.wrist) * (1 + arm.slack) / (UpperArm + LowerArm);
+    const double scale = std::min(seen, 1.0);
+    const Point elbow = joint(root, arm.wrist, UpperArm * scale, LowerArm * scale, arm.bend);
+    const Part hand = {placed(handOutlines(arm.grip), arm.wrist, arm.angle, arm.thumb), Linen,
+                       LinenShade, 2};
     paintOutlined(picture, hand, Line);
-    const Part sleeve = {tube({root, elbow, arm.wrist}, 5.4, 4.2), Red, DarkRed, 2};
+    const Point end = mix(arm.wrist, elbow, 3 / std::max(distance(arm.wrist, elbow), 3.0));
+    const Part sleeve = {tube({root, elbow, end}, 5.4, 4.4), Coat, CoatShade, 2, CoatGlow};
     paintOutlined(picture, sleeve, Line);
-    const Point along = turned({1, 0}, arm.angle);
-    const Point across = {-along.y, along.x};
-    const Point end = arm.wrist + along * 0.5;
-    paintOutlined(picture,
-                  {{bone(end - across * 3, end + across * 3, 2, 2)}, Yellow, DarkYellow, 1}, Line);
+    if (figure.turn < 0.5 && !arm.behind) {
+        joinSleeve(picture, figure, root);
+    }
+    paintCuff(picture, elbow, arm.wrist);
 }
 
 void paintShoe(Picture& picture, const Leg& leg) {
@@ -98,51 +132,35 @@ void paintShoe(Picture& picture, const Leg& leg) {
     for (Point& point : sole) {
         point = leg.ankle + turned({point.x * side * length, point.y}, leg.angle * side);
     }
-    paintOutlined(picture, {{blob(sole)}, Yellow, DarkYellow, 2}, Line);
+    paintOutlined(picture, {{blob(sole)}, Leather, LeatherShade, 2}, Line);
 }
 
 void paintLeg(Picture& picture, const Figure& figure, std::size_t which) {
     const Leg& leg = figure.legs[which];
     const Point root = hip(figure, which);
-    const Point knee = joint(root, leg.ankle, Thigh, Shin, leg.bend);
+    const double seen = distance(root, leg.ankle) * (1 + leg.slack) / (Thigh + Shin);
+    const double scale = std::min(seen, 1.0);
+    const Point knee = joint(root, leg.ankle, Thigh * scale, Shin * scale, leg.bend);
     paintShoe(picture, leg);
     const bool far = which == 0 && figure.turn > 0.5;
     const Part trouser = {tube({root, knee, leg.ankle - Point{0, 1}}, 7, 4.6),
-                          far ? ClothShade : Cloth, ClothShade, 2};
+                          far ? TrousersShade : Trousers, TrousersShade, 2};
     paintOutlined(picture, trouser, Line);
-}
-
-std::vector<Outline> coatOutlines(const Figure& figure) {
-    const Trunk at = trunkOf(figure);
-    const double slim = 1 - 0.22 * figure.turn;
-    const double lift = figure.shoulderLift / 40;
-    std::vector<Outline> outlines = {
-        blob({at(0, -0.02), at(9 * slim, 0.02 - lift), at(14 * slim, 0.14 - lift),
-              at(13.5 * slim, 0.5), at(15 * slim, 0.95), at(13 * slim, 1.12), at(0, 1.16),
-              at(-13 * slim, 1.12), at(-15 * slim, 0.95), at(-13.5 * slim, 0.5),
-              at(-14 * slim, 0.14 - lift), at(-9 * slim, 0.02 - lift)})};
-    if (figure.tails > 0) {
-        const std::vector<Point> hang = {at(-7, 0.7), at(-10 - figure.tails * 0.3, 1.0),
-                                         at(-9 - figure.tails, 1.3)};
-        for (Outline& outline : tube(hang, 8, 4)) {
-            outlines.push_back(std::move(outline));
-        }
-    }
-    return outlines;
 }
 
 void paintCoat(Picture& picture, const Figure& figure) {
     const Trunk at = trunkOf(figure);
-    const Mask coat = paintOutlined(picture, {coatOutlines(figure), Red, DarkRed, 3}, Line);
+    const Mask coat =
+        paintOutlined(picture, {coatOutlines(figure), Coat, CoatShade, 3, CoatGlow}, Line);
     const double seam = 8 * figure.turn;
-    paintWithin(picture, {{bone(at(seam, 0), at(seam, 1.3), 0.55, 0.55)}, DarkRed, DarkRed, 0},
+    paintWithin(picture, {{bone(at(seam, 0), at(seam, 1.3), 0.55, 0.55)}, CoatShade, CoatShade, 0},
                 coat);
     for (const double down : {0.32, 0.56, 0.8}) {
-        paintWithin(picture, {{ellipse(at(seam + 3.2, down), 1.7, 1.7)}, Yellow, DarkYellow, 1},
+        paintWithin(picture, {{ellipse(at(seam + 3.2, down), 1.7, 1.7)}, Brass, BrassShade, 1},
                     coat);
     }
     const Point collar = at(1.5 * figure.turn, 0.02);
-    paintOutlined(picture, {{ellipse(collar, 10 - 2 * figure.turn, 3.6)}, White, LightGrey, 1},
+    paintOutlined(picture, {{ellipse(collar, 10 - 2 * figure.turn, 3.6)}, Linen, LinenShade, 1},
                   Line);
 }
 

@@ -25,6 +25,8 @@ struct Arm {
     int thumb = 1;
     // Painted before the trunk instead of after the head.
     bool behind = false;
+    // How much longer the arm looks than the way from shoulder to wrist, as a share of it.
+    double slack = 1;
 };
 
 // A leg is given by its ankle, which is six pixels above the sole; the knee follows.
@@ -35,6 +37,8 @@ struct Leg {
     // 1: the toe points right, -1: left. Its size tells how long the shoe looks from here.
     double toe = 1;
     int bend = 1;
+    // How much longer the leg looks than the way from hip to ankle, as a share of it.
+    double slack = 0.01;
 };
 
 // One picture of him: where everything is, seen by somebody who looks at the picture. The first arm

@@ -1,21 +1,18 @@
 #include "resources/art/head.h"
 
+#include "resources/art/wardrobe.h"
+
 #include <algorithm>
 #include <cmath>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace art {
 
 namespace {
 
-constexpr Ink Skin = {White, Yellow};
-constexpr Ink SkinShade = Yellow;
-constexpr Ink Felt = DarkCyan;
-constexpr Ink FeltShade = {DarkCyan, DarkBlue};
-constexpr Colour Line = DarkBlue;
-
-using Rows = std::vector<const char*>;
+using Rows = std::vector<std::string>;
 
 // The measures below are for a face of this length from eyes to mouth.
 constexpr double PlainLength = 17;
@@ -55,29 +52,43 @@ std::vector<Point> faceFront() {
 
 std::vector<Point> faceHalf() {
     return {{-3, -14}, {5, -12}, {9.5, -6}, {8.5, 3},  {12.5, 12}, {14, 19},  {11, 25},
-            {4.5, 27}, {-3, 25}, {-9, 19},  {-12, 12}, {-14, 4},   {-16, -5}, {-11, -12}};
+            {4.5, 27}, {-3, 25}, {-10, 19}, {-12, 12}, {-14, 4},   {-16, -5}, {-11, -12}};
 }
 
 void paintEar(Picture& picture, const Place& at, double x) {
-    const Part ear = skinPart({ellipse(at(x, 4), 3.4, 4.8)}, 1);
+    const Part ear = skinPart({ellipse(at(x, 4), 2.8, 4.2)}, 1);
     paintOutlined(picture, ear, Line);
+}
+
+// Hair sticks out below the cap, on the sides that can be seen.
+void paintHair(Picture& picture, const Place& at) {
+    const double back = -11.5 - 2 * at.turn;
+    std::vector<Outline> tufts = {ellipse(at(back - 2, -2), 4, 4.5),
+                                  ellipse(at(back - 1.5, 4), 4, 4),
+                                  ellipse(at(back - 0.5, 9.5), 3.4, 4)};
+    if (at.turn < 0.5) {
+        tufts.push_back(ellipse(at(13.5, -2), 4, 4.5));
+        tufts.push_back(ellipse(at(13, 4), 4, 4));
+        tufts.push_back(ellipse(at(12, 9.5), 3.4, 4));
+    }
+    paintOutlined(picture, {std::move(tufts), Hair, HairShade, 1}, Line);
 }
 
 void paintFace(Picture& picture, const Place& at) {
     if (at.turn < 0.5) {
-        paintEar(picture, at, 13.5 - 3 * at.turn);
-        paintEar(picture, at, -13.5);
+        paintEar(picture, at, 13 - 4 * at.turn);
+        paintEar(picture, at, -13);
     }
     const auto points = mix(faceFront(), faceHalf(), at.turn);
     const Mask face = paintOutlined(picture, skinPart({blob(at(points))}, 2), Line);
     const Part cheeks = {{ellipse(at(8.5 + 1.5 * at.turn, 13), 2.6, 2.2),
                           ellipse(at(-8.5 + 1.5 * at.turn, 13), 2.6, 2.2)},
-                         {Red, Yellow},
-                         {Red, Yellow},
+                         Blush,
+                         Blush,
                          0};
     paintWithin(picture, cheeks, face);
     if (at.turn >= 0.5) {
-        paintEar(picture, at, -6.5 - 3.5 * at.turn);
+        paintEar(picture, at, -13.5 + 3 * at.turn);
     }
 }
 
@@ -85,7 +96,7 @@ void paintNose(Picture& picture, const Place& at) {
     const Point tip = at(7.5 * at.turn, 8.8);
     const Point root = at(2.0 * at.turn, 1);
     Part nose = skinPart({bone(root, tip, 2.2, 4), ellipse(tip, 6.6, 5.2, 8 * at.side)}, 2);
-    nose.shade = {Red, Yellow};
+    nose.shade = Blush;
     const Mask mask = paintOutlined(picture, nose, Line);
     const Part shine = {{ellipse(tip + Point{-2.2, -2}, 1.8, 1.3)}, White, White, 0};
     paintWithin(picture, shine, mask);
@@ -108,10 +119,10 @@ void paintCap(Picture& picture, const Place& at, double swing) {
                             {back + 11.5, -9},
                             {back, -8}})));
     paintOutlined(picture, {std::move(felt), Felt, FeltShade, 2}, Line);
-    paintOutlined(picture, {{ellipse(tip + Point{0, 3}, 3.6, 3.6)}, Yellow, DarkYellow, 1}, Line);
+    paintOutlined(picture, {{ellipse(tip + Point{0, 3}, 3.6, 3.6)}, Bobble, BobbleShade, 1}, Line);
     const Part band = {{bone(at(back - 11.5, -8.6), at(back + 11.5 + at.turn, -9.4), 2.4, 2.4)},
-                       White,
-                       LightGrey,
+                       Trim,
+                       TrimShade,
                        1};
     paintOutlined(picture, band, Line);
 }
@@ -120,22 +131,22 @@ void paintCap(Picture& picture, const Place& at, double swing) {
 Rows eyeRows(Eyes eyes) {
     if (eyes == Eyes::Open) {
         return {" bbb bbb  ", "bWWWbWWWb ", "bWWWbWWWb ", "bWbbbWbbb ",
-                "bWbbbWbbb ", "bWbbbWbbb ", " bbb bbb  "};
+                "bWbbbWbbb ", "bWWWbWWWb ", " bbb bbb  "};
     }
-    return {" bbb bbb  ", "b   b   b ", "b   b   b ", "b   b   b ",
-            "b   b   b ", "bbbbbbbbb ", " bbb bbb  "};
+    return {" bbb bbb  ", "bsssbsssb ", "bsssbsssb ", "bsssbsssb ",
+            "bsssbsssb ", "bbbsbbbsb ", " bbb bbb  "};
 }
 
 Rows browRows(Brows brows) {
     switch (brows) {
     case Brows::Level:
-        return {"          ", "          ", "bbb   bbb "};
+        return {"          ", " bb   bb  "};
     case Brows::Raised:
-        return {"bbb   bbb ", "          "};
+        return {" bbb bbb  "};
     case Brows::OneUp:
-        return {"      bbb ", "          ", "bbb       "};
+        return {"     bbb  ", "bbb       "};
     case Brows::Worried:
-        return {"          ", "  bb bb   ", "bb     bb "};
+        return {"  bb bb   ", "bb     bb "};
     }
     return {};
 }
@@ -152,19 +163,13 @@ Rows mouthRows(Mouth mouth) {
     return {};
 }
 
-void stampFacing(Picture& picture, Point corner, double side, const Rows& rows) {
-    std::vector<std::string> kept;
-    Rows facing;
-    for (const char* row : rows) {
-        kept.emplace_back(row);
+void stampFacing(Picture& picture, Point corner, double side, Rows rows) {
+    for (std::string& row : rows) {
         if (side < 0) {
-            std::reverse(kept.back().begin(), kept.back().end());
+            std::reverse(row.begin(), row.end());
         }
     }
-    for (const std::string& row : kept) {
-        facing.push_back(row.c_str());
-    }
-    stamp(picture, static_cast<int>(corner.x), static_cast<int>(corner.y), facing);
+    stamp(picture, static_cast<int>(corner.x), static_cast<int>(corner.y), rows, Skin);
 }
 
 } // namespace
@@ -184,6 +189,7 @@ Point chin(const Head& head) {
 
 void paintHead(Picture& picture, const Head& head) {
     const Place at(head);
+    paintHair(picture, at);
     paintFace(picture, at);
     paintCap(picture, at, head.capSwing);
     paintNose(picture, at);

@@ -60,14 +60,35 @@ bool touches(const Mask& mask, int x, int y) {
            mask.at(x, y + 1) != 0;
 }
 
+// Takes away pixels that hang on by one side only: they would make a knot in the line.
+Mask withoutBumps(const Mask& mask) {
+    Mask even = mask;
+    for (int y = 0; y < mask.height; ++y) {
+        for (int x = 0; x < mask.width; ++x) {
+            const int sides =
+                mask.at(x - 1, y) + mask.at(x + 1, y) + mask.at(x, y - 1) + mask.at(x, y + 1);
+            if (sides < 2) {
+                even.set(x, y, 0);
+            }
+        }
+    }
+    return even;
+}
+
+Ink inkAt(const Part& part, const Mask& mask, int x, int y) {
+    if (mask.at(x + part.shadow, y + part.shadow) == 0) {
+        return part.shade;
+    }
+    return part.glow && mask.at(x - 2, y - 2) == 0 ? *part.glow : part.lit;
+}
+
 void fillInk(Picture& picture, const Part& part, const Mask& mask, const Mask& within) {
     for (int y = 0; y < picture.height; ++y) {
         for (int x = 0; x < picture.width; ++x) {
             if (mask.at(x, y) == 0 || within.at(x, y) == 0) {
                 continue;
             }
-            const bool dark = mask.at(x + part.shadow, y + part.shadow) == 0;
-            picture.set(x, y, (dark ? part.shade : part.lit).at(x, y));
+            picture.set(x, y, inkAt(part, mask, x, y).at(x, y));
         }
     }
 }
@@ -120,7 +141,7 @@ Mask coverage(const std::vector<Outline>& outlines, int width, int height) {
 }
 
 Mask paintOutlined(Picture& picture, const Part& part, Colour line) {
-    Mask mask = coverage(part.outlines, picture.width, picture.height);
+    Mask mask = withoutBumps(coverage(part.outlines, picture.width, picture.height));
     for (int y = 0; y < picture.height; ++y) {
         for (int x = 0; x < picture.width; ++x) {
             if (mask.at(x, y) == 0 && touches(mask, x, y)) {
@@ -136,13 +157,13 @@ void paintWithin(Picture& picture, const Part& part, const Mask& within) {
     fillInk(picture, part, coverage(part.outlines, picture.width, picture.height), within);
 }
 
-void stamp(Picture& picture, int left, int top, const std::vector<const char*>& rows) {
+void stamp(Picture& picture, int left, int top, const std::vector<std::string>& rows, Ink skin) {
     int y = top;
-    for (const std::string row : rows) {
+    for (const std::string& row : rows) {
         int x = left;
         for (const char letter : row) {
             if (letter != ' ') {
-                picture.set(x, y, stampColour(letter));
+                picture.set(x, y, letter == 's' ? skin.at(x, y) : stampColour(letter));
             }
             ++x;
         }

@@ -4,6 +4,8 @@
 #include "resources/art/picture.h"
 
 #include <cstdint>
+#include <optional>
+#include <string>
 #include <vector>
 
 namespace art {
@@ -32,6 +34,8 @@ struct Part {
     Ink lit = White;
     Ink shade = LightGrey;
     int shadow = 2;
+    // The rim at the left and above, one pixel wide, where the light falls on it.
+    std::optional<Ink> glow = std::nullopt;
 };
 
 // The pixels of which at least half lies inside.
@@ -42,9 +46,10 @@ Mask paintOutlined(Picture& picture, const Part& part, Colour line);
 // Paints the part without a line, on those pixels only that the mask has.
 void paintWithin(Picture& picture, const Part& part, const Mask& within);
 
-// Lines of letters, one for each pixel, painted from the given corner: a blank leaves a pixel as it
-// is, the letters stand for the colours that stampColour names.
-void stamp(Picture& picture, int left, int top, const std::vector<const char*>& rows);
+// Lines of letters, one for each pixel, painted from the given corner. A blank leaves a pixel as it
+// is and s gives it the ink `skin`; the others are the sixteen colours in their order: .rgybmcd are
+// black and the dark ones, lRGYBMCW light grey and the bright ones.
+void stamp(Picture& picture, int left, int top, const std::vector<std::string>& rows, Ink skin);
 
 // Fills see-through spots of at most `limit` pixels that the figure encloses.
 void fillSpecks(Picture& picture, std::size_t limit, Colour colour);

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdlib>
+#include <iterator>
 #include <numbers>
 #include <stdexcept>
 
@@ -11,16 +13,16 @@ namespace {
 
 constexpr double Turn = 2 * std::numbers::pi;
 
-// Drifting mist: white and light grey, with a fixed grain of four by four pixels between them. The
-// size isn't a multiple of four, so the grain of three by three is what fits.
-Tile mist() {
+// Herringbone cloth, light grey on white.
+Tile herringbone() {
     constexpr int Size = 135;
-    constexpr double Grain[3][3] = {{0.1, 0.55, 0.3}, {0.75, 0.9, 0.45}, {0.35, 0.65, 0.2}};
+    constexpr int Rib = 15;
+    constexpr int Thread = 5;
     Tile tile{Picture(Size, Size), {SixteenColours.begin(), SixteenColours.end()}};
     for (int y = 0; y < Size; ++y) {
         for (int x = 0; x < Size; ++x) {
-            const double light = 1.9 * clouds(x, y, Size, 3, 3, 11) - 0.5;
-            tile.picture.set(x, y, light > Grain[y % 3][x % 3] ? White : LightGrey);
+            const int slope = std::abs(x % Rib - Rib / 2);
+            tile.picture.set(x, y, (y + slope) % Thread < 2 ? LightGrey : White);
         }
     }
     return tile;
@@ -32,9 +34,9 @@ Tile linen() {
     return shadedTile(Size, {214, 196, 160}, {246, 236, 212}, [](double x, double y) {
         const bool across = (static_cast<int>(x / 4) + static_cast<int>(y / 4)) % 2 == 0;
         const double along = std::fmod(across ? y : x, 4.0);
-        const double round = 0.5 - 0.14 * std::fabs(along - 1.5);
+        const double round = 0.55 - 0.14 * std::fabs(along - 1.5);
         const double uneven = across ? hills(x, y, Size, 6, 24, 3) : hills(x, y, Size, 24, 6, 4);
-        return round + 0.35 * uneven + (across ? 0.06 : 0);
+        return round + 0.26 * uneven + (across ? 0.06 : 0);
     });
 }
 
@@ -48,10 +50,10 @@ Tile plaster() {
 // A board of light wood, its grain running across.
 Tile maple() {
     constexpr int Size = 96;
-    return shadedTile(Size, {222, 184, 134}, {248, 222, 180}, [](double x, double y) {
+    return shadedTile(Size, {226, 194, 150}, {250, 228, 192}, [](double x, double y) {
         const double bend = 9 * hills(x, y, Size, 2, 4, 31);
         const double grain = std::sin(Turn * ((y + bend) * 8 / Size));
-        return 0.5 + 0.16 * grain + 0.4 * (hills(x, y, Size, 4, 48, 32) - 0.5);
+        return 0.55 + 0.1 * grain + 0.3 * (hills(x, y, Size, 4, 48, 32) - 0.5);
     });
 }
 
@@ -77,9 +79,9 @@ Tile scales() {
 Tile marble() {
     constexpr int Size = 96;
     return shadedTile(Size, {214, 176, 176}, {248, 230, 226}, [](double x, double y) {
-        const double bend = 1.6 * clouds(x, y, Size, 3, 4, 41);
+        const double bend = 1.2 * clouds(x, y, Size, 4, 4, 41);
         const double vein = std::fabs(std::sin(Turn * ((x + y) / Size + bend)));
-        return 0.45 + 0.35 * std::min(1.0, vein * 2.2) + 0.3 * (clouds(x, y, Size, 4, 3, 47) - 0.5);
+        return 0.6 + 0.18 * std::min(1.0, vein * 1.4) + 0.3 * (clouds(x, y, Size, 4, 3, 47) - 0.5);
     });
 }
 
@@ -111,19 +113,20 @@ Tile water() {
         double second = 0;
         const double first = nearest(points, std::fmod(x + sway + Size, Size),
                                      std::fmod(y + dip + Size, Size), Size, second);
-        return 0.3 + 0.5 * std::exp(-(second - first) / 2.2);
+        return 0.38 + 0.34 * std::exp(-(second - first) / 3.5);
     });
 }
 
 // A quilt of soft lozenges in lilac.
 Tile quilt() {
     constexpr int Size = 80;
-    const Field height = [](double x, double y) {
-        const double a = std::fabs(std::sin(Turn * (x + y) / 2 * 4 / Size));
-        const double b = std::fabs(std::sin(Turn * (x - y) / 2 * 4 / Size));
-        return std::sqrt(a * b);
-    };
-    return shadedTile(Size, {196, 182, 220}, {238, 230, 248}, relief(height, 0.6));
+    return shadedTile(Size, {196, 182, 220}, {238, 230, 248}, [](double x, double y) {
+        // Two ways across the lozenge, each 0 at a seam and 1 in the middle.
+        const double down = std::fabs(std::sin(Turn * (x + y) * 2 / Size));
+        const double up = std::fabs(std::sin(Turn * (x - y) * 2 / Size));
+        const double tilt = std::sin(Turn * (x + y) * 4 / Size);
+        return 0.3 + 0.4 * std::sqrt(down * up) + 0.12 * tilt * up;
+    });
 }
 
 // Creased packing paper.
@@ -143,8 +146,8 @@ Tile paper() {
 
 Tile drawTile(int number) {
     using Draw = Tile (*)();
-    constexpr Draw Draws[] = {mist,   linen,  plaster, maple, scales,
-                              marble, bricks, water,   quilt, paper};
+    constexpr Draw Draws[] = {herringbone, linen,  plaster, maple, scales,
+                              marble,      bricks, water,   quilt, paper};
     if (number < 1 || number > static_cast<int>(std::size(Draws))) {
         throw std::out_of_range("there are ten backdrops");
     }
