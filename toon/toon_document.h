@@ -21,7 +21,7 @@ static_assert(std::endian::native == std::endian::little,
 constexpr std::size_t TOON_MAGIC_SIZE = 32;
 constexpr std::size_t TOON_CAPTION_SIZE = 52; // NUL included
 constexpr std::size_t TOON_TEXT_SIZE = 70;    // NUL included
-constexpr std::size_t TOON_NAME_SIZE = 256;   // NUL included
+constexpr std::size_t TOON_PATH_SIZE = 256;   // NUL included
 constexpr DWORD TOON_VERSION = 0x20001;
 constexpr LONG TOON_FRAME_LIMIT =
     251; // frames that the editor makes; a longer file loads and plays
@@ -73,7 +73,7 @@ extern LONG FrameCount;
 extern LONG CurrentFrameIndex;
 
 /// Path of the Toon, empty while untitled. ToonOpenNamed, the editor and file dialogs write it.
-extern char ToonFileName[TOON_NAME_SIZE];
+extern char ToonFileName[TOON_PATH_SIZE];
 
 /// 1 while changes are unsaved. ToonSetDirty writes it.
 extern DWORD ToonDirty;
