@@ -1,0 +1,24 @@
+// The memory behind the pixels of a bitmap.
+#pragma once
+
+#include "platform/types.h"
+
+#include <cstddef>
+#include <memory>
+
+namespace seam {
+
+/// Gives the pixels back; see makePixels.
+struct PixelRelease {
+    std::size_t count = 0;
+    void operator()(DWORD* pixels) const;
+};
+
+using PixelBlock = std::unique_ptr<DWORD[], PixelRelease>;
+
+/// Room for `count` pixels with any contents; null if there is no memory. A few freed blocks of the
+/// size of a sprite are kept for the next caller: a step of a walk makes and frees four bitmaps,
+/// and the allocator would hand their pages back to the system and fault them in again each time.
+PixelBlock makePixels(std::size_t count);
+
+} // namespace seam
