@@ -352,6 +352,10 @@ void Assemble(Reader& reader) {
 } // namespace
 
 ToonFromText TextToToon(std::string_view text) {
+    constexpr std::string_view byteOrderMark = "\xEF\xBB\xBF";
+    if (text.starts_with(byteOrderMark)) {
+        text.remove_prefix(byteOrderMark.size());
+    }
     Reader reader;
     while (!text.empty() && reader.result.error.empty()) {
         const std::size_t end = text.find('\n');

@@ -16,7 +16,7 @@
 
 #include <cstring>
 
-char NextToonFile[TOON_NAME_SIZE];
+char NextToonFile[NEXT_TOON_SIZE];
 LONG ToonFileCount;
 LONG BackgroundCount;
 LONG LastBackground;
@@ -97,7 +97,7 @@ void ShowReset(HWND window) {
 /// Goes on to the first entry whose name NextToonFile holds: a name that is cut would be that of
 /// another file. `more` tells whether `entry` holds one to begin with.
 static BOOL SkipLongNames(HANDLE scan, WIN32_FIND_DATAA* entry, BOOL more) {
-    while (more && std::strlen(entry->cFileName) >= TOON_NAME_SIZE) {
+    while (more && std::strlen(entry->cFileName) >= NEXT_TOON_SIZE) {
         more = FindNextFileA(scan, entry);
     }
     return more;
@@ -174,7 +174,7 @@ int PickToonFile() {
     if (PickIntroToon()) {
         return 1;
     }
-    char name[TOON_NAME_SIZE] = "";
+    char name[NEXT_TOON_SIZE] = "";
     if (!PickRandomToonFile(name)) {
         return 0;
     }

@@ -6,11 +6,11 @@
 
 #include "platform/user.h"
 
-constexpr int TOON_NAME_SIZE = 128; // bytes, NUL included
+constexpr int NEXT_TOON_SIZE = 128; // bytes, NUL included
 
 /// The bare name of the Toon that the next show plays, in the current directory; empty for a walk
 /// about. Written here and by the player of a single Toon.
-extern char NextToonFile[TOON_NAME_SIZE];
+extern char NextToonFile[NEXT_TOON_SIZE];
 
 /// How many entries matched "*.zkt" at the last count. Written by CountToonFiles.
 extern LONG ToonFileCount;
