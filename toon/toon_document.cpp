@@ -11,7 +11,7 @@ ToonHeader ToonDocHeader;
 HGLOBAL FrameStore;
 LONG FrameCount = 1;
 LONG CurrentFrameIndex = 0;
-char ToonFileName[TOON_NAME_SIZE];
+char ToonFileName[TOON_PATH_SIZE];
 DWORD ToonDirty = 0;
 LONG ToonSpeed = 3;
 LONG BackgroundIndex = 0;
