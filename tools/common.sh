@@ -26,14 +26,20 @@ as_root() {
     fi
 }
 
-# install_packages: gets what is missing; says nothing and does nothing if nothing is.
+# install_packages: gets what is missing, and says so; says nothing and does nothing if nothing is.
 install_packages() {
     local missing
     mapfile -t missing < <(missing_packages)
     [ "${#missing[@]}" -gt 0 ] || return 0
+    mkdir -p build
     echo "Installing Debian packages: ${missing[*]}"
-    as_root apt-get update -q </dev/null
-    as_root apt-get install -q -y --no-install-recommends "${missing[@]}" </dev/null
+    {
+        as_root apt-get update &&
+            as_root apt-get install -y --no-install-recommends "${missing[@]}"
+    } </dev/null >build/packages.log 2>&1 || {
+        cat build/packages.log
+        return 1
+    }
 }
 
 # configure PRESET: says nothing if all is well.
