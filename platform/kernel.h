@@ -67,7 +67,9 @@ constexpr HANDLE INVALID_HANDLE_VALUE{0xFFFFFFFF};
 /// Starts a scan for a pattern, with or without a directory in front: `*` stands for any run of
 /// characters, `?` for one or none at the end of the name, and "*.*" for every name; case doesn't
 /// matter. Names come in the order of their bytes, directories among them. Names of MAX_PATH bytes
-/// and more are passed over. INVALID_HANDLE_VALUE if nothing matches.
+/// and more are passed over, and so are "." and "..". A link tells of what it leads to, one that
+/// leads nowhere of itself. A pattern without `*` and `?` gives the one entry that the path means.
+/// INVALID_HANDLE_VALUE if nothing matches.
 HANDLE FindFirstFileA(const char* pattern, WIN32_FIND_DATAA* found);
 BOOL FindNextFileA(HANDLE search, WIN32_FIND_DATAA* found);
 BOOL FindClose(HANDLE search);
@@ -84,11 +86,12 @@ BOOL SetCurrentDirectoryA(const char* path);
 constexpr UINT GMEM_MOVEABLE = 0x0002;
 constexpr UINT GMEM_ZEROINIT = 0x0040;
 
-/// A movable block; null on failure. A block of 0 bytes is given and can't be locked.
+/// A movable block of under 2 GiB; null on failure. A block of 0 bytes is given and can't be
+/// locked.
 HGLOBAL GlobalAlloc(UINT flags, std::size_t bytes);
 
 /// Changes the size and keeps the contents; GMEM_ZEROINIT clears what is new. On failure null,
-/// and the old block stays as it was. The handle stays the same.
+/// and the old block stays as it was; so does a locked one. The handle stays the same.
 HGLOBAL GlobalReAlloc(HGLOBAL block, std::size_t bytes, UINT flags);
 
 /// The block's first byte, good until the matching GlobalUnlock; null on failure.
@@ -116,7 +119,8 @@ void SetCommandLineArguments(int count, const char* const* arguments);
 /// Finds a resource of the program file by name or number; null if there is none.
 HRSRC FindResourceA(HINSTANCE instance, ResourceName name, ResourceName type);
 
-/// Gives the resource's bytes a handle. A bitmap's bytes begin with its BITMAPINFOHEADER.
+/// Gives a copy of the resource's bytes a handle, until FreeResource. A bitmap's bytes begin with
+/// its BITMAPINFOHEADER.
 HGLOBAL LoadResource(HINSTANCE instance, HRSRC resource);
 const void* LockResource(HGLOBAL resource);
 BOOL FreeResource(HGLOBAL resource);
@@ -145,7 +149,9 @@ DWORD WallClockSeconds();
 // is text: "[section]" lines, "key=value" lines, CR LF at each end; names match whatever their
 // case, blanks round names and values are dropped, and one pair of quotes round a value is.
 // A file is written whole beside the old one and renamed into its place; one that is read-only
-// by its mode bits is left alone. Lines that are neither are kept as they stand.
+// by its mode bits is left alone. Lines that are neither are kept as they stand. A file of over
+// 16 MiB counts as one without keys and is left alone too. Of two sections or keys of the same
+// name the first holds.
 
 /// The key's value as a number, read as decimal digits up to the first other character, wrapping
 /// at 32 bits; `otherwise` if the key is missing.

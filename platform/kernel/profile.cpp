@@ -12,8 +12,9 @@
 
 namespace {
 
-/// A larger file counts as one with no keys, and nothing is written to it.
-constexpr std::size_t largestProfile = 256 << 20;
+/// A larger file is somebody's mistake, and reading it would hold up the start: it counts as one
+/// with no keys, and nothing is written to it.
+constexpr std::size_t largestProfile = 16 << 20;
 
 const char* orEmpty(const char* text) {
     return text != nullptr ? text : "";

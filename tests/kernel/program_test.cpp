@@ -1,0 +1,114 @@
+#include "platform/harness.h"
+#include "platform/kernel.h"
+#include "platform/kernel/string_table.h"
+
+#include <gtest/gtest.h>
+
+#include <string>
+
+namespace {
+
+std::string bytesOf(HRSRC resource) {
+    const HGLOBAL loaded = LoadResource(nullptr, resource);
+    const void* bytes = LockResource(loaded);
+    const DWORD size = SizeofResource(nullptr, resource);
+    const std::string text =
+        bytes != nullptr ? std::string(static_cast<const char*>(bytes), size) : "none";
+    EXPECT_EQ(FreeResource(loaded), bytes != nullptr ? TRUE : FALSE);
+    return text;
+}
+
+TEST(Resource, IsFoundByNameOrNumberWhateverTheCase) {
+    const struct {
+        ResourceName name;
+        ResourceName type;
+        const char* expected;
+    } cases[] = {
+        {"tiny", RT_BITMAP, "INFOHEADER"}, // without the header of its file
+        {"TINY", RT_BITMAP, "INFOHEADER"}, {2003, RT_DIALOG, "a dialog"},
+        {"2003", RT_DIALOG, "a dialog"},   {"aBOUT", RT_DIALOG, "a dialog"},
+        {"tiny", RT_DIALOG, "none"},       {"tin", RT_BITMAP, "none"},
+        {"", RT_BITMAP, "none"},           {"../dialog/2003", RT_BITMAP, "none"},
+        {"headless", RT_BITMAP, "none"},   {"table", RT_STRING, "none"},
+        {"tiny", "bitmap", "none"},
+    };
+
+    seam::HandleCounts before;
+    seam::countKernelHandles(before);
+    for (const auto& one : cases) {
+        EXPECT_EQ(bytesOf(FindResourceA(nullptr, one.name, one.type)), one.expected)
+            << (one.name.text != nullptr ? one.name.text : "a number");
+    }
+    seam::HandleCounts after;
+    seam::countKernelHandles(after);
+    EXPECT_EQ(after, before);
+}
+
+TEST(Resource, LookedUpAgainIsTheSame) {
+    EXPECT_EQ(FindResourceA(nullptr, "tiny", RT_BITMAP), FindResourceA(nullptr, "Tiny", RT_BITMAP));
+}
+
+TEST(StringTable, GivesTextsCutToTheBuffer) {
+    const struct {
+        UINT id;
+        int size;
+        std::string expected;
+    } cases[] = {
+        {1, 30, "First text"},       {1, 11, "First text"},  {1, 10, "First tex"}, {1, 1, ""},
+        {2, 30, "one\rtwo \\r \\x"}, {65535, 30, "caf\xe9"}, {3, 30, ""},          {4, 30, ""},
+    };
+
+    for (const auto& one : cases) {
+        char buffer[30] = "untouched";
+        EXPECT_EQ(LoadStringA(nullptr, one.id, buffer, one.size),
+                  static_cast<int>(one.expected.size()));
+        EXPECT_EQ(buffer, one.expected);
+    }
+    EXPECT_EQ(LoadStringA(nullptr, 1, nullptr, 0), 0);
+    EXPECT_EQ(LoadStringA(nullptr, 1, nullptr, -1), 0);
+}
+
+TEST(StringTable, PassesOverLinesThatAreNone) {
+    const seam::StringTable table =
+        seam::parseStringTable("\n7\n8\t\n-1\tx\n99999999999\ty\n\t\n9\ta\tb\\");
+    EXPECT_EQ(table, (seam::StringTable{{8, ""}, {9, "a\tb\\"}}));
+}
+
+TEST(Program, PutsItsArgumentsTogether) {
+    const struct {
+        std::vector<const char*> arguments;
+        const char* expected;
+    } cases[] = {
+        {{}, "\"\""},
+        {{"/usr/bin/dorbo"}, "\"/usr/bin/dorbo\""},
+        {{"/my games/dorbo", "/p", "123"}, "\"/my games/dorbo\" /p 123"},
+        {{"dorbo", "", "a b"}, "\"dorbo\"  a b"},
+        {{"/a\" /s \"/dorbo", "-c"}, "\"/a /s /dorbo\" -c"},
+    };
+
+    for (const auto& one : cases) {
+        SetCommandLineArguments(static_cast<int>(one.arguments.size()), one.arguments.data());
+        EXPECT_STREQ(GetCommandLineA(), one.expected);
+    }
+}
+
+TEST(Program, HasNoModuleButItself) {
+    EXPECT_TRUE(GetModuleHandleA(nullptr));
+    EXPECT_FALSE(GetModuleHandleA("IMM32.DLL"));
+    EXPECT_FALSE(LoadLibraryA("libc.so.6"));
+}
+
+TEST(Format, WritesTextsAndNumbers) {
+    char buffer[100];
+    EXPECT_EQ(wsprintfA(buffer, "%s|%d|%u|%%", "text", -5, 4000000000U), 20);
+    EXPECT_STREQ(buffer, "text|-5|4000000000|%");
+}
+
+TEST(Format, StopsAtTheLengthOfThePlatform) {
+    const std::string text(2000, 't');
+    std::string buffer(2001, '#');
+    EXPECT_EQ(wsprintfA(buffer.data(), "%s", text.c_str()), 1023);
+    EXPECT_EQ(buffer, text.substr(0, 1023) + '\0' + std::string(977, '#'));
+}
+
+} // namespace
