@@ -13,7 +13,7 @@ Picture drawBubble() {
                           {158.8, 8.0}, {158.8, 87.0}, {157.5, 91.0}, {155.5, 93.0},
                           {152, 94.0},  {26, 94.0},    {22.5, 93.0},  {20.5, 91.0},
                           {19.2, 87.0}, {19.2, 8.0},   {20.5, 4.0},   {22.5, 2.0}};
-    const Outline tail = {{22, 40}, {17, 42}, {9, 47}, {1, 50.5}, {9, 52.5}, {17, 55}, {22, 59}};
+    const Outline tail = {{22, 40}, {17, 42}, {9, 47}, {-1, 50.5}, {9, 52.5}, {17, 55}, {22, 59}};
     Picture picture(Width, Height);
     paintOutlined(picture, {{body, tail}, White, White, 0}, DarkBlue);
     return picture;

@@ -9,16 +9,36 @@ namespace {
 constexpr int Columns = 5;
 constexpr int Pitch = CellSize + 1;
 
+void copyCell(Picture& sheet, int column, int number, const Picture& figure, Point corner) {
+    for (int y = 0; y < CellSize; ++y) {
+        for (int x = 0; x < CellSize; ++x) {
+            const auto colour =
+                figure.at(static_cast<int>(corner.x) + x, static_cast<int>(corner.y) + y);
+            sheet.set(column * Pitch + x, number * Pitch + y, colour);
+        }
+    }
+}
+
+Picture drawFace(int number, Eyes eyes, Mouth mouth) {
+    Figure figure = pose(number);
+    figure.head.eyes = eyes;
+    figure.head.mouth = mouth;
+    return drawFigure(figure);
+}
+
 // Columns from the left: eyes shut, eyes as in the pose, two shapes of the mouth, mouth as in the
 // pose.
-Picture drawCell(int column, int number) {
-    Figure figure = pose(number);
-    figure.head.eyes = column == 0 ? Eyes::Shut : Eyes::Open;
-    figure.head.mouth = column == 2 ? Mouth::Open : column == 3 ? Mouth::Round : Mouth::Smile;
-    const auto index = static_cast<std::size_t>(number);
-    const Point corner = column < 2 ? EyeCells[index] : MouthCells[index];
-    return cut(drawFigure(figure), static_cast<int>(corner.x), static_cast<int>(corner.y), CellSize,
-               CellSize);
+void drawRow(Picture& sheet, int number) {
+    const Point eyes = EyeCells[static_cast<std::size_t>(number)];
+    const Point mouth = MouthCells[static_cast<std::size_t>(number)];
+    const Picture plain = drawFace(number, Eyes::Open, Mouth::Smile);
+    const Picture talking = drawFace(number, Eyes::Shut, Mouth::Open);
+    const Picture amazed = drawFace(number, Eyes::Open, Mouth::Round);
+    copyCell(sheet, 0, number, talking, eyes);
+    copyCell(sheet, 1, number, plain, eyes);
+    copyCell(sheet, 2, number, talking, mouth);
+    copyCell(sheet, 3, number, amazed, mouth);
+    copyCell(sheet, 4, number, plain, mouth);
 }
 
 } // namespace
@@ -26,14 +46,7 @@ Picture drawCell(int column, int number) {
 Picture drawExpressions() {
     Picture sheet(Columns * Pitch - 1, PoseCount * Pitch - 1, White);
     for (int number = 0; number < PoseCount; ++number) {
-        for (int column = 0; column < Columns; ++column) {
-            const Picture cell = drawCell(column, number);
-            for (int y = 0; y < CellSize; ++y) {
-                for (int x = 0; x < CellSize; ++x) {
-                    sheet.set(column * Pitch + x, number * Pitch + y, cell.at(x, y));
-                }
-            }
-        }
+        drawRow(sheet, number);
     }
     return sheet;
 }

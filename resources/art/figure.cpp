@@ -11,6 +11,9 @@ namespace art {
 
 namespace {
 
+// See-through spots up to this many pixels would look like dirt in the figure.
+constexpr std::size_t LargestSpeck = 12;
+
 constexpr double HandSize = 1.12;
 constexpr double UpperArm = 19;
 constexpr double LowerArm = 18;
@@ -202,7 +205,7 @@ Picture drawFigure(const Figure& figure) {
             paintArm(picture, figure, which);
         }
     }
-    fillSpecks(picture, 12, Line);
+    fillSpecks(picture, LargestSpeck, Line);
     return picture;
 }
 

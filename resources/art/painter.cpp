@@ -34,20 +34,31 @@ std::vector<Span> spansOfRow(const Outline& outline, double y) {
     return spans;
 }
 
-bool crosses(const Outline& outline, double y) {
-    const auto above = [y](Point point) { return point.y <= y; };
-    return std::any_of(outline.begin(), outline.end(), above) &&
-           !std::all_of(outline.begin(), outline.end(), above);
+// An outline and the rows that it reaches over.
+struct Extent {
+    const Outline* outline;
+    double top;
+    double bottom;
+};
+
+std::vector<Extent> extents(const std::vector<Outline>& outlines) {
+    std::vector<Extent> all;
+    for (const Outline& outline : outlines) {
+        const auto [top, bottom] = std::minmax_element(outline.begin(), outline.end(),
+                                                       [](Point a, Point b) { return a.y < b.y; });
+        all.push_back({&outline, top->y, bottom->y});
+    }
+    return all;
 }
 
-void fillFineRow(std::vector<bool>& row, const std::vector<Outline>& outlines, double y) {
+void fillFineRow(std::vector<bool>& row, const std::vector<Extent>& outlines, double y) {
     std::fill(row.begin(), row.end(), false);
     const int width = static_cast<int>(row.size());
-    for (const Outline& outline : outlines) {
-        if (!crosses(outline, y)) {
+    for (const Extent& extent : outlines) {
+        if (y < extent.top || y > extent.bottom) {
             continue;
         }
-        for (const auto& [from, to] : spansOfRow(outline, y)) {
+        for (const auto& [from, to] : spansOfRow(*extent.outline, y)) {
             for (int x = std::max(from, 0); x < std::min(to, width); ++x) {
                 row[static_cast<std::size_t>(x)] = true;
             }
@@ -124,11 +135,12 @@ std::vector<std::pair<int, int>> collectHole(const Picture& picture, Mask& seen,
 
 Mask coverage(const std::vector<Outline>& outlines, int width, int height) {
     Mask mask(width, height);
+    const std::vector<Extent> all = extents(outlines);
     std::vector<bool> row(static_cast<std::size_t>(width * Fine));
     for (int y = 0; y < height; ++y) {
         std::vector<int> counts(static_cast<std::size_t>(width));
         for (int line = 0; line < Fine; ++line) {
-            fillFineRow(row, outlines, y + (line + 0.5) / Fine);
+            fillFineRow(row, all, y + (line + 0.5) / Fine);
             for (std::size_t x = 0; x < row.size(); ++x) {
                 counts[x / Fine] += row[x] ? 1 : 0;
             }

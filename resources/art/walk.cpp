@@ -59,9 +59,10 @@ Leg stepping(double phase, double size) {
         // The round tip of the shoe would dip below the ground.
         leg.ankle.y -= 1.2 * std::sin(leg.angle * std::numbers::pi / 180);
     }
-    if (leg.angle < 0 && air == 0) {
-        // The heel comes down first: it is what stands on the ground, and the toe is in the air.
-        leg.ankle.y -= HeelFromBall * std::sin(-leg.angle * std::numbers::pi / 180);
+    if (leg.angle < 0) {
+        // With the toe up the heel is lowest. It comes down to the ground, not below.
+        const double dip = HeelFromBall * std::sin(-leg.angle * std::numbers::pi / 180);
+        leg.ankle.y -= std::max(0.0, dip - (Ground - ball.y));
     }
     leg.bend = -1;
     leg.slack = 1;
