@@ -117,13 +117,13 @@ void paintArm(Picture& picture, const Figure& figure, std::size_t which) {
     const Point elbow = joint(root, arm.wrist, UpperArm * scale, LowerArm * scale, arm.bend);
     const Part hand = {placed(handOutlines(arm.grip), arm.wrist, arm.angle, arm.thumb), Linen,
                        LinenShade, 2};
-    paintOutlined(picture, hand, Line);
     const Point end = mix(arm.wrist, elbow, 3 / std::max(distance(arm.wrist, elbow), 3.0));
     const Part sleeve = {tube({root, elbow, end}, 5.4, 4.4), Coat, CoatShade, 2, CoatGlow};
     paintOutlined(picture, sleeve, Line);
     if (figure.turn < 0.5 && !arm.behind) {
         joinSleeve(picture, figure, root);
     }
+    paintOutlined(picture, hand, Line);
     paintCuff(picture, elbow, arm.wrist);
 }
 

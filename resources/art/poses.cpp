@@ -62,7 +62,7 @@ void think(Figure& figure) {
     figure.head.brows = Brows::Raised;
     figure.pelvis.x = 62;
     figure.arms[1] = {{52, 80}, 185, Grip::Fist, -1, 1, false, 1};
-    figure.arms[0] = {{60, 59}, -104, Grip::Pointing, 1, 1, false, 10};
+    figure.arms[0] = {{60, 58}, -104, Grip::Pointing, 1, 1, false, 10};
     figure.legs = {planted(52, -0.9), planted(72, 0.7)};
 }
 
