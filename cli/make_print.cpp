@@ -4,14 +4,23 @@
 
 #include <cstdio>
 #include <fstream>
-#include <iterator>
+#include <optional>
 
 namespace {
 
 std::optional<std::string> ReadFile(const std::string& path) {
-    std::ifstream file(path, std::ios::binary);
-    std::string bytes{std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-    if (!file.is_open() || file.bad()) {
+    std::FILE* file = std::fopen(path.c_str(), "rb");
+    std::string bytes;
+    char part[4096];
+    std::size_t length = 0;
+    while (file != nullptr && (length = std::fread(part, 1, sizeof part, file)) > 0) {
+        bytes.append(part, length);
+    }
+    const bool complete = file != nullptr && std::ferror(file) == 0;
+    if (file != nullptr) {
+        std::fclose(file);
+    }
+    if (!complete) {
         std::fprintf(stderr, "toon: can't read %s\n", path.c_str());
         return std::nullopt;
     }

@@ -180,10 +180,10 @@ void PrintRecord(std::string& text, std::span<const Key> keys, const char* recor
         }
         text += key.name;
         if (key.kind == Kind::text) {
-            text += " " + Quoted(WithoutTrailingNuls(field, key.size));
+            text.append(" ").append(Quoted(WithoutTrailingNuls(field, key.size)));
         } else {
             for (std::size_t i = 0; i < key.count; ++i) {
-                text += " " + std::to_string(NumberAt(field + i * key.size, key.size));
+                text.append(" ").append(std::to_string(NumberAt(field + i * key.size, key.size)));
             }
         }
         text += "\n";
@@ -214,7 +214,7 @@ std::optional<std::string> ToonToText(std::string_view bytes) {
         PrintRecord(text, frameKeys, bytes.data(), reinterpret_cast<const char*>(&madeFrame));
     }
     if (!bytes.empty()) {
-        text += "\nrest " + Quoted(bytes) + "\n";
+        text.append("\nrest ").append(Quoted(bytes)).append("\n");
     }
     return text;
 }
@@ -235,7 +235,7 @@ struct Reader {
 };
 
 std::string InLine(const Reader& reader, const std::string& what) {
-    return "line " + std::to_string(reader.line) + ": " + what;
+    return std::string("line ").append(std::to_string(reader.line)).append(": ").append(what);
 }
 
 void Fail(Reader& reader, const std::string& what) {

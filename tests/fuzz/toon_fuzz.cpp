@@ -1,0 +1,62 @@
+// Any bytes for the loader of Toons: it may refuse them, and must keep its promises.
+//
+//   cmake --preset debug -B build/fuzz -DDORBO_FUZZ=ON
+//   cmake --build build/fuzz --target toon_fuzz
+//   mkdir -p build/fuzz/toons; export QT_QPA_PLATFORM=offscreen
+//   build/fuzz/tests/fuzz/toon_fuzz -max_total_time=60 build/fuzz/toons tests/toon/bad toons
+#include "cli/toon_text.h"
+#include "platform/harness.h"
+#include "tests/fuzz/scratch_directory.h"
+#include "toon/toon_document.h"
+
+#include <cstdlib>
+#include <cstring>
+
+namespace {
+
+void demand(bool kept) {
+    if (!kept) {
+        std::abort();
+    }
+}
+
+/// Every frame in force can be read and has its NUL, and there is none behind them.
+void checkFrames() {
+    ToonFrame frame{};
+    demand(FrameCount >= 0);
+    for (LONG i = 0; i < FrameCount; ++i) {
+        demand(FrameGet(i, &frame) == 1);
+        demand(strnlen(frame.text, sizeof frame.text) < sizeof frame.text);
+    }
+    demand(FrameGet(FrameCount, &frame) == 0);
+    demand(strnlen(CaptionText, sizeof CaptionText) < sizeof CaptionText);
+}
+
+void checkText(std::string_view bytes) {
+    const std::optional<std::string> text = ToonToText(bytes);
+    if (text) {
+        demand(TextToToon(*text).bytes == bytes);
+    }
+    TextToToon(bytes); // may fail, and must end
+}
+
+} // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
+    static const std::filesystem::path& scratch = scratchDirectory();
+    seam::answerBoxes([](const std::string&, const std::string&, UINT) { return IDOK; });
+    writeBytes(scratch / "x.zkt", bytes, size);
+    const int opened = ToonOpenNamed(nullptr, "x.zkt");
+    checkFrames();
+    if (opened == 1) {
+        const LONG before = FrameCount;
+        demand(before > 0);
+        demand(ToonSave(nullptr) == 1);
+        demand(ToonReload(nullptr) == before);
+        FrameStoreInsert(before / 2);
+        FrameStoreDelete(0);
+        checkFrames();
+    }
+    checkText({reinterpret_cast<const char*>(bytes), size});
+    return 0;
+}
