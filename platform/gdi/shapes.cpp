@@ -3,6 +3,7 @@
 #include "platform/gdi/objects.h"
 
 #include <algorithm>
+#include <cstdint>
 #include <cstdlib>
 #include <utility>
 
@@ -19,8 +20,11 @@ struct Line {
     bool steep;                // the major direction is y
 
     std::int64_t minorAt(std::int64_t i) const {
-        const std::int64_t doubled = 2 * i * std::abs(rise) + length;
-        const std::int64_t offset = doubled / (2 * length);
+        const auto steps = static_cast<std::uint64_t>(length);
+        const auto product =
+            static_cast<std::uint64_t>(i) * static_cast<std::uint64_t>(std::abs(rise));
+        const bool roundUp = 2 * (product % steps) >= steps;
+        const auto offset = static_cast<std::int64_t>(product / steps + (roundUp ? 1 : 0));
         return minor + (rise < 0 ? -offset : offset);
     }
 };
