@@ -11,7 +11,9 @@
 
 #include <QApplication>
 #include <QMessageBox>
+#include <QPainter>
 #include <QScreen>
+#include <qdrawutil.h>
 
 #include <cstdio>
 #include <exception>
@@ -34,18 +36,44 @@ QMessageBox::Icon iconOf(UINT type) {
     }
 }
 
-int answerOf(int button) {
+/// A box that was closed without a button counts as cancelled where it asks.
+int answerOf(int button, bool asks) {
     switch (button) {
     case QMessageBox::Yes:
         return IDYES;
     case QMessageBox::No:
         return IDNO;
-    case QMessageBox::Cancel:
-        return IDCANCEL;
     default:
-        return IDOK;
+        return asks ? IDCANCEL : IDOK;
     }
 }
+
+/// A box that gives the keyboard back to its owner before it goes: were it the other way round, the
+/// window manager would give it to somebody else.
+class Box : public QMessageBox {
+  public:
+    explicit Box(HWND owner) : owner_(owner) {}
+
+    void setVisible(bool visible) override {
+        if (!visible && isVisible()) {
+            SetForegroundWindow(owner_);
+        }
+        QMessageBox::setVisible(visible);
+    }
+
+  protected:
+    /// Where no window manager draws a frame round it, the box draws its own.
+    void paintEvent(QPaintEvent* event) override {
+        QMessageBox::paintEvent(event);
+        if ((windowFlags() & Qt::FramelessWindowHint) != 0) {
+            QPainter painter(this);
+            qDrawWinPanel(&painter, rect(), palette());
+        }
+    }
+
+  private:
+    HWND owner_;
+};
 
 /// Puts the box over its owner. A window that stays above all others, out of the window manager's
 /// hands, would hide a box that isn't the same.
@@ -89,7 +117,7 @@ int MessageBoxA(HWND owner, const char* text, const char* caption, UINT type) {
     }
     flushWindows();
     // On the heap and without a parent: the owner may be destroyed while the box is up.
-    const auto box = std::make_unique<QMessageBox>();
+    const auto box = std::make_unique<Box>(topLevelOf(owner));
     box->setWindowTitle(shownText(title));
     box->setText(shownText(text));
     box->setTextFormat(Qt::PlainText);
@@ -103,10 +131,7 @@ int MessageBoxA(HWND owner, const char* text, const char* caption, UINT type) {
     box->show();
     box->activateWindow();
     wakeToolkitLoop();
-    const int answer = answerOf(box->exec());
-    box->hide();
-    SetForegroundWindow(topLevelOf(owner)); // on a bare X server nothing else would
-    return answer;
+    return answerOf(box->exec(), asks);
 }
 
 BOOL MessageBeep(UINT /*type*/) {

@@ -1,4 +1,5 @@
 // Runs of the real program: exit codes, modes, what ends it and what it leaves behind.
+#include "tests/program/bitmaps.h"
 #include "tests/program/ground.h"
 
 #include <algorithm>
@@ -20,9 +21,10 @@ class Run : public testing::Test {
                                    ground.toons() / name);
     }
 
-    /// Waits until the saver covers the screen.
+    /// Waits until the saver's title stands on the screen.
     void waitForSaver() {
-        ASSERT_TRUE(ground::waitFor([&] { return ground.grab() != bare; }));
+        const ground::Picture tile = ground::loadPicture("bg01");
+        ASSERT_TRUE(ground::waitFor([&] { return ground.grab().at(0, 0) == tile.at(0, 0); }));
     }
 
     /// The number behind a key of the settings file.
@@ -43,7 +45,7 @@ TEST_F(Run, CommandLineChoosesModeAndExitCode) {
     };
 
     const Case cases[] = {
-        {{"X"}, refused},       {{"9"}, refused},         {{"\tS"}, refused},
+        {{"X"}, refused},       {{"9"}, refused},         {{"-\tS"}, refused},
         {{}, refused},          {{"/"}, refused},         {{"-", "--", "/"}, refused},
         {{"C"}, refused},       {{"/c:123"}, refused},    {{"P"}, refused},
         {{"P", "0"}, refused},  {{"P", "77"}, refused},   {{"/P:1"}, refused},
@@ -121,8 +123,11 @@ TEST_F(Run, ToonThatDoesNotLoadShowsItsBoxAndAKeyEndsTheSaver) {
     ASSERT_TRUE(ground::waitFor([&] { return (box = ground.grab()) != title; }));
     EXPECT_EQ(box.at(400, 10), title.at(400, 10)) << "the stage stands behind the box";
     // The box takes the keyboard; its answer leaves the stage as it stood.
-    ground.press("Return");
-    ASSERT_TRUE(ground::waitFor([&] { return ground.grab() == title; }));
+    const auto answered = [&] {
+        ground.press("Return"); // seen only once it has the keyboard
+        return ground::waitFor([&] { return ground.grab() == title; }, 1);
+    };
+    ASSERT_TRUE(ground::waitFor(answered));
     EXPECT_TRUE(saver.running());
     ground.press("space");
     EXPECT_EQ(saver.exitCode(), 0);
