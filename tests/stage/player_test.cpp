@@ -79,6 +79,21 @@ TEST_F(Player, EntersFromTheSideNearerToTheFrameAsRecorded) {
     EXPECT_EQ(events({"enter"}).front(), "enter draw=[-150,333] side=left");
 }
 
+TEST_F(Player, LeavesByTheSideNearerToHisCorner) {
+    const LONG cases[][2] = {{520, -150}, {576, -150}, {577, 1074}, {900, 1074}};
+    for (const auto& one : cases) {
+        openToon({frame(one[0], 333, 0, 1, 0, "")});
+        EnterShow(stage);
+        WalkToNextFrame(stage);
+        StopWalkTimer(stage);
+        Record.clear();
+        WalkOffStage(stage);
+        EXPECT_EQ(events({"walk_off"}).front(),
+                  "walk_off target=[" + std::to_string(one[1]) + ",268]");
+        StopWalkTimer(stage);
+    }
+}
+
 TEST_F(Player, ScalesTheCornerNotTheCentre) {
     openToon({frame(1000, 600, 0, 1, 0, "")});
     ToonDocHeader.windowSize = MAKELONG(2048, 384);
