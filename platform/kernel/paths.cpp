@@ -22,14 +22,12 @@ bool liesIn(std::string_view path, std::string_view folder) {
     return path.starts_with(folder) && (path.size() == folder.size() || path[folder.size()] == '/');
 }
 
+/// The medium that holds the path, else C:. No medium lies in another.
 const Drive& driveOf(std::string_view path, const std::vector<Drive>& known) {
-    const Drive* found = &known.front();
-    for (const Drive& drive : known) {
-        if (liesIn(path, drive.root) && drive.root.size() >= found->root.size()) {
-            found = &drive;
-        }
-    }
-    return *found;
+    const auto medium = std::find_if(known.begin() + 1, known.end(), [path](const Drive& drive) {
+        return liesIn(path, drive.root);
+    });
+    return medium != known.end() ? *medium : known.front();
 }
 
 std::vector<std::string> namesOf(std::string_view path, std::string_view marks) {

@@ -87,9 +87,12 @@ HRSRC FindResourceA(HINSTANCE, ResourceName name, ResourceName type) {
 }
 
 HGLOBAL LoadResource(HINSTANCE, HRSRC resource) {
-    // The copy begins where a record may begin; the bytes behind a file header don't.
     const FoundResource* found = resources.find(resource.number);
-    const HGLOBAL block = found != nullptr ? GlobalAlloc(GMEM_MOVEABLE, found->size()) : HGLOBAL{};
+    if (found == nullptr) {
+        return nullptr;
+    }
+    // The copy begins where a record may begin; the bytes behind a file header don't.
+    const HGLOBAL block = GlobalAlloc(GMEM_MOVEABLE, found->size());
     if (void* target = GlobalLock(block)) {
         std::memcpy(target, found->bytes(), found->size());
         GlobalUnlock(block);

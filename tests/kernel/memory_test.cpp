@@ -27,10 +27,10 @@ TEST(MemoryBlock, GrowsWithItsContentsAndClearsWhatIsNew) {
     std::memset(bytes, 7, 92);
     EXPECT_FALSE(GlobalUnlock(block));
     EXPECT_EQ(GlobalReAlloc(block, 40, GMEM_ZEROINIT), block);
-    EXPECT_EQ(GlobalReAlloc(block, 92 * 1000, GMEM_ZEROINIT), block);
+    EXPECT_EQ(GlobalReAlloc(block, 92000, GMEM_ZEROINIT), block);
     bytes = GlobalLock(block);
     EXPECT_EQ(static_cast<char*>(bytes)[39], 7);
-    EXPECT_TRUE(allZero(bytes, 40, 92 * 1000));
+    EXPECT_TRUE(allZero(bytes, 40, 92000));
     GlobalUnlock(block);
     EXPECT_EQ(liveBlocks(), before + 1);
     EXPECT_FALSE(GlobalFree(block));
@@ -42,7 +42,7 @@ TEST(MemoryBlock, StaysAsItWasWhenItCannotGrow) {
     std::memcpy(GlobalLock(block), "abc", 4);
     EXPECT_FALSE(GlobalReAlloc(block, 8, 0)); // locked, so that it must not move
     GlobalUnlock(block);
-    EXPECT_FALSE(GlobalReAlloc(block, std::size_t{1} << 40, 0));
+    EXPECT_FALSE(GlobalReAlloc(block, 0x80000000, 0));
     EXPECT_STREQ(static_cast<char*>(GlobalLock(block)), "abc");
     GlobalFree(block);
     EXPECT_FALSE(GlobalAlloc(GMEM_MOVEABLE, static_cast<std::size_t>(-92)));

@@ -12,7 +12,7 @@ std::string bytesOf(HRSRC resource) {
     const HGLOBAL loaded = LoadResource(nullptr, resource);
     const void* bytes = LockResource(loaded);
     const DWORD size = SizeofResource(nullptr, resource);
-    const std::string text =
+    std::string text =
         bytes != nullptr ? std::string(static_cast<const char*>(bytes), size) : "none";
     EXPECT_EQ(FreeResource(loaded), bytes != nullptr ? TRUE : FALSE);
     return text;
@@ -36,8 +36,10 @@ TEST(Resource, IsFoundByNameOrNumberWhateverTheCase) {
     seam::HandleCounts before;
     seam::countKernelHandles(before);
     for (const auto& one : cases) {
-        EXPECT_EQ(bytesOf(FindResourceA(nullptr, one.name, one.type)), one.expected)
-            << (one.name.text != nullptr ? one.name.text : "a number");
+        const std::string told = one.name.text != nullptr ? one.name.text : "a number";
+        const HRSRC found = FindResourceA(nullptr, one.name, one.type);
+        EXPECT_EQ(bytesOf(found), one.expected) << told;
+        EXPECT_EQ(static_cast<bool>(found), one.expected != std::string("none")) << told;
     }
     seam::HandleCounts after;
     seam::countKernelHandles(after);
