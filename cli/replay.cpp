@@ -5,8 +5,13 @@
 #include "platform/trace.h"
 #include "saver/saver_guard.h"
 #include "saver/saver_main.h"
+#include "saver/show_cycle.h"
+#include "stage/face.h"
+#include "stage/player.h"
+#include "stage/random_walk.h"
 #include "stage/stage.h"
 #include "toon/settings.h"
+#include "toon/toon_document.h"
 
 #include <cstdio>
 #include <cstdlib>
@@ -78,6 +83,20 @@ HWND createStage(const ReplayOptions& options) {
                            options.height, nullptr, nullptr, windowClass.hInstance, nullptr);
 }
 
+/// What outlives a stage, as it stands in a fresh process: a replay doesn't depend on the one
+/// before it.
+void forgetEarlierStages() {
+    ToonDocHeader = {};
+    PlayFrame = {};
+    WalkFrame = {};
+    CaptionText[0] = '\0';
+    ToonSpeed = 3;
+    LastMouthShape = 0;
+    PreviousStatement = 0;
+    LastBackground = 0;
+    StageRepaintFlag = 1;
+}
+
 void setStartSettings(const ReplayOptions& options) {
     WalkingStyle = options.toons.empty() ? 0 : 1;
     Statements = options.statements ? 1 : 0;
@@ -92,6 +111,7 @@ void setStartSettings(const ReplayOptions& options) {
 
 void Replay(const ReplayOptions& options, const std::function<void(const std::string&)>& line) {
     const Ground ground(options.toons);
+    forgetEarlierStages();
     setStartSettings(options);
     lineSink = line;
     showsLeft = options.shows;
