@@ -1,56 +1,39 @@
 #include "platform/gdi/pixel_block.h"
 
-#include <algorithm>
-#include <array>
 #include <cstdlib>
-#include <utility>
+#include <sys/mman.h>
 
 namespace seam {
 
 namespace {
 
-struct SpareBlock {
-    DWORD* pixels = nullptr;
-    std::size_t count = 0;
-};
-
-/// Together they hold at most half a megabyte.
-constexpr std::size_t largestSpare = 32768;
-
-/// Free blocks; written by makePixels and PixelRelease only.
-constinit std::array<SpareBlock, 4> spares{};
-
-SpareBlock* spareOf(std::size_t count) {
-    auto* const found =
-        std::find_if(spares.begin(), spares.end(), [count](const SpareBlock& spare) {
-            return spare.pixels != nullptr && spare.count == count;
-        });
-    return found == spares.end() ? nullptr : found;
-}
+/// From a megabyte on pixels are mapped, so that a freed picture of the stage goes back to the
+/// system at once. In the heap it would leave a hole that small bitmaps nibble at, until the next
+/// picture of that size no longer fits there. The bitmaps of a sprite, made and freed at each step,
+/// are best off in the heap: their pages stay.
+constexpr std::size_t mappedFrom = std::size_t{1} << 20U;
 
 } // namespace
 
 void PixelRelease::operator()(DWORD* pixels) const {
-    static constinit std::size_t nextVictim = 0;
-    if (count > largestSpare) {
+    const std::size_t bytes = count * sizeof(DWORD);
+    if (bytes < mappedFrom) {
         std::free(pixels);
-        return;
+    } else {
+        munmap(pixels, bytes);
     }
-    auto* place = std::find_if(spares.begin(), spares.end(),
-                               [](const SpareBlock& spare) { return spare.pixels == nullptr; });
-    if (place == spares.end()) {
-        place = &spares.at(nextVictim);
-        nextVictim = (nextVictim + 1) % spares.size();
-        std::free(place->pixels);
-    }
-    *place = {pixels, count};
 }
 
 PixelBlock makePixels(std::size_t count) {
-    if (SpareBlock* spare = spareOf(count)) {
-        return {std::exchange(spare->pixels, nullptr), PixelRelease{count}};
+    const std::size_t bytes = count * sizeof(DWORD);
+    void* memory = nullptr;
+    if (bytes < mappedFrom) {
+        memory = std::malloc(bytes);
+    } else {
+        memory = mmap(nullptr, bytes, PROT_READ | PROT_WRITE, MAP_PRIVATE | MAP_ANONYMOUS, -1, 0);
+        memory = memory == MAP_FAILED ? nullptr : memory;
     }
-    return {static_cast<DWORD*>(std::malloc(count * sizeof(DWORD))), PixelRelease{count}};
+    return {static_cast<DWORD*>(memory), PixelRelease{count}};
 }
 
 } // namespace seam

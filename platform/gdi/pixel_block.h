@@ -16,9 +16,7 @@ struct PixelRelease {
 
 using PixelBlock = std::unique_ptr<DWORD[], PixelRelease>;
 
-/// Room for `count` pixels with any contents; null if there is no memory. A few freed blocks of the
-/// size of a sprite are kept for the next caller: a step of a walk makes and frees four bitmaps,
-/// and the allocator would hand their pages back to the system and fault them in again each time.
+/// Room for `count` pixels with any contents; null if there is no memory.
 PixelBlock makePixels(std::size_t count);
 
 } // namespace seam

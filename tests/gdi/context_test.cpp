@@ -69,6 +69,20 @@ TEST(Context, BitmapsOfNoSizeOrOutOfAllReasonAreRefused) {
     DeleteDC(dc);
 }
 
+TEST(Context, APictureOfAWholeStageCanBeMadeAndFilled) {
+    Memory colour({"W"});
+    HBITMAP picture = CreateCompatibleBitmap(colour.dc, 1920, 1080);
+    HDC dc = CreateCompatibleDC(nullptr);
+    const HGDIOBJ before = SelectObject(dc, picture);
+    const RECT corner{1919, 1079, 1920, 1080};
+    FillRect(dc, &corner, HBRUSH{GetStockObject(WHITE_BRUSH)});
+    EXPECT_EQ(GetPixel(dc, 1919, 1079), RGB(255, 255, 255));
+    EXPECT_EQ(GetPixel(dc, 1918, 1079), RGB(0, 0, 0));
+    SelectObject(dc, before);
+    DeleteDC(dc);
+    EXPECT_TRUE(DeleteObject(picture));
+}
+
 TEST(Context, ABitmapIsSelectedIntoOneContextAtATime) {
     Memory first({"R"});
     HDC second = CreateCompatibleDC(first.dc);

@@ -72,7 +72,8 @@ TEST(Lines, BreakWithinAWordThatIsTooWide) {
 }
 
 TEST(Encoding, IsWindows1252WithItsHolesAsControls) {
-    EXPECT_EQ(fromWindows1252("A\xE4\x80\x85\x9F", 5), QStringLiteral(u"A\u00E4\u20AC\u2026\u0178"));
+    EXPECT_EQ(fromWindows1252("A\xE4\x80\x85\x9F", 5),
+              QStringLiteral(u"A\u00E4\u20AC\u2026\u0178"));
     const QString holes = fromWindows1252("\x81\x8D\x8F\x90\x9D", 5);
     const char16_t expected[] = {0x81, 0x8D, 0x8F, 0x90, 0x9D};
     EXPECT_EQ(holes, QString::fromUtf16(expected, 5));
