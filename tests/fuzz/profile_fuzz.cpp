@@ -3,7 +3,8 @@
 //   cmake --preset debug -B build/fuzz -DDORBO_FUZZ=ON
 //   cmake --build build/fuzz --target profile_fuzz
 //   mkdir -p build/fuzz/profiles; dict=tests/fuzz/profile.dict
-//   build/fuzz/tests/fuzz/profile_fuzz -max_total_time=60 -dict=$dict build/fuzz/profiles
+//   corpus="build/fuzz/profiles tests/fuzz/profiles"
+//   build/fuzz/tests/fuzz/profile_fuzz -max_total_time=60 -max_len=400 -dict=$dict $corpus
 #include "tests/fuzz/scratch_directory.h"
 #include "toon/settings.h"
 

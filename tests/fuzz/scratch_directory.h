@@ -6,17 +6,14 @@
 #include <fstream>
 #include <string>
 
-/// Makes it the current directory.
 inline const std::filesystem::path& scratchDirectory() {
     struct Scratch {
         Scratch() {
             std::string name = "/dev/shm/dorbo-fuzz-XXXXXX";
             path = mkdtemp(name.data());
-            std::filesystem::current_path(path);
         }
 
         ~Scratch() {
-            std::filesystem::current_path("/");
             std::filesystem::remove_all(path);
         }
 

@@ -43,10 +43,10 @@ void checkText(std::string_view bytes) {
 } // namespace
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
-    static const std::filesystem::path& scratch = scratchDirectory();
+    static const std::filesystem::path file = scratchDirectory() / "x.zkt";
     seam::answerBoxes([](const std::string&, const std::string&, UINT) { return IDOK; });
-    writeBytes(scratch / "x.zkt", bytes, size);
-    const int opened = ToonOpenNamed(nullptr, "x.zkt");
+    writeBytes(file, bytes, size);
+    const int opened = ToonOpenNamed(nullptr, file.c_str());
     checkFrames();
     if (opened == 1) {
         const LONG before = FrameCount;
