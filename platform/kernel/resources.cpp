@@ -3,9 +3,7 @@
 
 #include "platform/handle_table.h"
 #include "platform/kernel.h"
-#include "platform/kernel/text.h"
 
-#include <QtCore/QDir>
 #include <QtCore/QResource>
 
 #include <cstring>
@@ -14,7 +12,7 @@
 namespace {
 
 struct FoundResource {
-    std::string path;
+    QString path;
     QByteArray whole; // shares the program's own bytes where they aren't compressed
     qsizetype start = 0;
 
@@ -47,18 +45,18 @@ ResourceFolder folderOf(ResourceName type) {
     return type.number == RT_DIALOG.number ? ResourceFolder{":/dialog", 0} : ResourceFolder{};
 }
 
-/// The path of the resource of this name, whatever its case; empty if there is none.
-std::string resourcePath(const char* folder, const std::string& name) {
-    for (const QString& entry : QDir(QString::fromLatin1(folder)).entryList(QDir::Files)) {
-        const std::string candidate = entry.toStdString();
-        if (seam::sameButForCase(candidate, name)) {
-            return std::string(folder) + "/" + candidate;
-        }
+/// The path of the resource of this name, whatever its case; empty if there is none. The resources
+/// themselves have names in lower case.
+QString resourcePath(const char* folder, const std::string& name) {
+    if (name.find('/') != std::string::npos) {
+        return {}; // would lead into another type's folder
     }
-    return {};
+    const QString path =
+        QString::fromLatin1(folder) + QLatin1Char('/') + QString::fromStdString(name).toLower();
+    return QResource(path).isValid() ? path : QString();
 }
 
-DWORD handleOf(const std::string& path) {
+DWORD handleOf(const QString& path) {
     DWORD handle = 0;
     resources.forEach([&](DWORD number, const FoundResource& resource) {
         handle = resource.path == path ? number : handle;
@@ -74,12 +72,12 @@ HRSRC FindResourceA(HINSTANCE, ResourceName name, ResourceName type) {
         return nullptr;
     }
     const std::string wanted = name.text != nullptr ? name.text : std::to_string(name.number);
-    const std::string path = resourcePath(folder.path, wanted);
-    if (const DWORD known = path.empty() ? 0 : handleOf(path); known != 0) {
+    const QString path = resourcePath(folder.path, wanted);
+    if (const DWORD known = path.isEmpty() ? 0 : handleOf(path); known != 0) {
         return HRSRC{known};
     }
-    const QByteArray whole = QResource(QString::fromStdString(path)).uncompressedData();
-    if (path.empty() || whole.size() <= folder.header) {
+    const QByteArray whole = QResource(path).uncompressedData();
+    if (path.isEmpty() || whole.size() <= folder.header) {
         return nullptr;
     }
     return HRSRC{
