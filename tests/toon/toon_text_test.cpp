@@ -63,6 +63,36 @@ TEST(ToonText, ShippedToonsShowEveryPoseAndAnIntro) {
     EXPECT_THAT(poses, ElementsAre(0, 1, 2, 3, 4, 5, 6, 7));
 }
 
+/// Height in pixels of a text as the speech bubble draws it.
+int heightInBubble(const char* text) {
+    constexpr LONG bubbleWidth = 120;
+    const HDC dc = CreateCompatibleDC(nullptr);
+    const HFONT font = CreateFontA(-14, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, 0, "MS Serif");
+    const HGDIOBJ before = SelectObject(dc, font);
+    RECT area{0, 0, bubbleWidth, 0};
+    const int height = DrawTextA(dc, text, static_cast<int>(std::strlen(text)), &area,
+                                 DT_CENTER | DT_WORDBREAK | DT_NOPREFIX);
+    SelectObject(dc, before);
+    DeleteObject(font);
+    DeleteDC(dc);
+    return height;
+}
+
+TEST(ToonText, ShippedTextsFitTheBubble) {
+    constexpr int bubbleHeight = 71;
+    ASSERT_GT(GetSystemMetrics(SM_CXSCREEN), 0); // fonts need a screen
+    ToonFrame frame{};
+    for (const std::string& name : shippedToons()) {
+        ASSERT_EQ(ToonOpenNamed(nullptr, (toonDirectory / (name + ".zkt")).c_str()), 1);
+        for (LONG i = 0; FrameGet(i, &frame); ++i) {
+            EXPECT_LE(heightInBubble(frame.text), bubbleHeight) << name << ": " << frame.text;
+        }
+    }
+    FrameStoreFree();
+    // A text that doesn't fit is told from one that does.
+    EXPECT_GT(heightInBubble("One\rtwo\rthree\rfour\rfive\rsix"), bubbleHeight);
+}
+
 TEST(ToonText, BadToonsWithAWholeHeaderComeBackByteForByte) {
     for (const auto& entry : std::filesystem::directory_iterator(test::badDirectory)) {
         SCOPED_TRACE(entry.path().filename());
