@@ -5,6 +5,7 @@
 #include <QStyleFactory>
 
 #include <cstdio>
+#include <memory>
 #include <xcb/xcb.h>
 
 namespace seam {
@@ -15,17 +16,18 @@ int argumentCount = 1;
 char programName[] = "dorbo";
 char* arguments[] = {programName, nullptr};
 
-/// The toolkit ends the process where it finds no display, so we look first.
-bool displayAnswers() {
+/// A connection to the X server, closed in the end; null where another platform was asked for. The
+/// toolkit ends the process where it finds no display, so we look first. The connection outlasts
+/// the making of the toolkit's own: a bare server starts anew when its last client leaves.
+using Probe = std::unique_ptr<xcb_connection_t, decltype(&xcb_disconnect)>;
+
+Probe probeDisplay() {
     const QByteArray platform = qgetenv("QT_QPA_PLATFORM");
     if (!platform.isEmpty() && !platform.startsWith("xcb")) {
-        return true;
+        return {nullptr, &xcb_disconnect};
     }
     qputenv("QT_QPA_PLATFORM", "xcb");
-    xcb_connection_t* connection = xcb_connect(nullptr, nullptr);
-    const bool answers = xcb_connection_has_error(connection) == 0;
-    xcb_disconnect(connection);
-    return answers;
+    return {xcb_connect(nullptr, nullptr), &xcb_disconnect};
 }
 
 /// Grey dialogs with blue selections, whatever the desktop's theme.
@@ -49,7 +51,8 @@ QPalette classicPalette() {
 }
 
 bool makeToolkit() {
-    if (!displayAnswers()) {
+    const Probe probe = probeDisplay();
+    if (probe != nullptr && xcb_connection_has_error(probe.get()) != 0) {
         std::fputs("dorbo: there is no display to show anything on\n", stderr);
         return false;
     }
