@@ -87,7 +87,7 @@ void Step(benchmark::State& state) {
     SpriteStamp(dc, figure, &sprite);
     SpriteSaveUnder(dc, &sprite);
     SpriteDraw(dc, &sprite);
-    for (auto _ : state) {
+    while (state.KeepRunning()) {
         const POINT next = NextPlace({sprite.x, sprite.y});
         HDC stamping = GetDC(nullptr);
         SpriteStamp(stamping, figure, &sprite);
@@ -103,7 +103,7 @@ void Floor(benchmark::State& state) {
     const std::vector<DWORD> figure = FigurePixels();
     const std::vector<DWORD> under(figure.size(), 0xFF6080A0);
     POINT place{0, 0};
-    for (auto _ : state) {
+    while (state.KeepRunning()) {
         RestorePlain(Stage().pixels(), place.x, place.y, under.data(), figureSize);
         place = NextPlace(place);
         CompositePlain(Stage().pixels(), place.x, place.y, figure.data(), figureSize);

@@ -15,7 +15,8 @@ constexpr COLORREF RGB(int red, int green, int blue) {
 
 // ---- Device contexts -------------------------------------------------------------------------
 
-/// A memory context. The argument only says which display it is compatible with.
+/// A memory context. The argument only says which display it is compatible with. Nothing can be
+/// drawn on the bitmap of a fresh one.
 HDC CreateCompatibleDC(HDC dc);
 BOOL DeleteDC(HDC dc);
 
@@ -188,7 +189,7 @@ DWORD GetSysColor(int index); ///< black for an index without a colour
 
 /// A font. A negative height is the character height in pixels, a positive one that of the cell;
 /// a weight of 600 and more is bold. "MS Serif" is drawn with Liberation Serif, anything else with
-/// Liberation Sans. The eight numbers between weight and face must be 0.
+/// Liberation Sans. All other numbers must be 0. Null if one isn't, or for a height above 1000.
 HFONT CreateFontA(int height, int width, int escapement, int orientation, int weight, DWORD italic,
                   DWORD underline, DWORD strikeOut, DWORD charSet, DWORD outputPrecision,
                   DWORD clipPrecision, DWORD quality, DWORD pitchAndFamily, const char* face);

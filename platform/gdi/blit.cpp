@@ -84,7 +84,7 @@ bool shareMemory(const PixelView& a, const PixelView& b) {
     const auto pixels = [](const PixelView& view) {
         return static_cast<std::ptrdiff_t>(view.stride) * view.height;
     };
-    const std::less<const DWORD*> before;
+    const std::less<> before;
     return before(a.bits, b.bits + pixels(b)) && before(b.bits, a.bits + pixels(a));
 }
 

@@ -34,6 +34,10 @@ Rows withFigure(Rows picture, const Rows& figure, int left, int top) {
 }
 
 class Sprites : public testing::Test {
+  public:
+    Sprites(const Sprites&) = delete;
+    Sprites& operator=(const Sprites&) = delete;
+
   protected:
     Sprites() : start_(liveObjects()), ring_(makeBitmap(ring)), cross_(makeBitmap(cross)) {
         stage = std::make_unique<TestSurface>(backdrop);
@@ -46,9 +50,6 @@ class Sprites : public testing::Test {
         EXPECT_EQ(liveObjects(), start_) << "something was left behind";
         stage.reset();
     }
-
-    Sprites(const Sprites&) = delete;
-    Sprites& operator=(const Sprites&) = delete;
 
     template <class Action>
     static void onStage(Action action) {

@@ -11,6 +11,7 @@ namespace {
 
 std::vector<std::string> pieces(const QString& text, const std::vector<TextLine>& lines) {
     std::vector<std::string> result;
+    result.reserve(lines.size());
     for (const TextLine& line : lines) {
         result.push_back(text.mid(line.start, line.end - line.start).toStdString());
     }

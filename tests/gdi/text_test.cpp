@@ -15,6 +15,10 @@ HFONT makeFont(int height, int weight = 400) {
 
 /// A green picture on which text is drawn in black with a font of 14 pixels.
 class Text : public testing::Test {
+  public:
+    Text(const Text&) = delete;
+    Text& operator=(const Text&) = delete;
+
   protected:
     Text() : font_(makeFont(-14)), before_(SelectObject(memory_.dc, font_)) {
         TEXTMETRICA metrics{};
@@ -27,14 +31,11 @@ class Text : public testing::Test {
         DeleteObject(font_);
     }
 
-    Text(const Text&) = delete;
-    Text& operator=(const Text&) = delete;
-
-    int draw(const char* text, RECT area, UINT format) {
+    int draw(const char* text, RECT area, UINT format) const {
         return DrawTextA(memory_.dc, text, -1, &area, format);
     }
 
-    int widthOf(const std::string& text) {
+    int widthOf(const std::string& text) const {
         SIZE size{};
         GetTextExtentPointA(memory_.dc, text.c_str(), static_cast<int>(text.size()), &size);
         return size.cx;
@@ -95,7 +96,7 @@ TEST_F(Text, EachLineIsCentred) {
     const Rows rows = memory_.text();
     const int wide = widthOf("wide line");
     const int narrow = widthOf("i");
-    const auto top = static_cast<std::ptrdiff_t>(20 + lineHeight_);
+    const std::ptrdiff_t top = 20 + lineHeight_;
     const Rows second(rows.begin() + top, rows.end());
     EXPECT_EQ(cells(), (RECT{10 + (121 - wide) / 2, 20, 10 + (121 - wide) / 2 + wide,
                              20 + 2 * lineHeight_}));
