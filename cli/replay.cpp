@@ -13,9 +13,12 @@
 #include "toon/settings.h"
 #include "toon/toon_document.h"
 
+#include <charconv>
 #include <cstdio>
 #include <cstdlib>
 #include <filesystem>
+#include <limits>
+#include <optional>
 #include <stdexcept>
 
 namespace {
@@ -23,7 +26,6 @@ namespace {
 namespace fs = std::filesystem;
 
 constexpr const char* replayClass = "ReplayClass";
-constexpr std::int64_t stepTime = 1000; // how far the clock goes between two looks for an end
 
 std::function<void(const std::string&)> lineSink;
 int showsLeft = 0;
@@ -32,18 +34,24 @@ int showsDone = 0;
 /// A directory with the Toons and a home for the settings, entered while it lives.
 class Ground {
   public:
-    explicit Ground(const std::vector<std::string>& toons) {
+    Ground() {
         std::string pattern = fs::temp_directory_path() / "toon-trace-XXXXXX";
         if (mkdtemp(pattern.data()) == nullptr) {
             throw std::runtime_error("no directory for the replay can be made");
         }
         root_ = pattern;
+        if (const char* home = std::getenv(homeVariable)) {
+            homeBefore_ = home;
+        }
+    }
+
+    void enter(const std::vector<std::string>& toons) const {
         fs::create_directories(root_ / "home");
         fs::create_directories(root_ / "toons");
         for (const std::string& toon : toons) {
             fs::copy_file(toon, root_ / "toons" / fs::path(toon).filename());
         }
-        setenv("XDG_CONFIG_HOME", (root_ / "home").c_str(), 1);
+        setenv(homeVariable, (root_ / "home").c_str(), 1);
         fs::current_path(root_ / "toons");
     }
 
@@ -54,16 +62,25 @@ class Ground {
         std::error_code ignored;
         fs::current_path(before_, ignored);
         fs::remove_all(root_, ignored);
+        if (homeBefore_) {
+            setenv(homeVariable, homeBefore_->c_str(), 1);
+        } else {
+            unsetenv(homeVariable);
+        }
     }
 
   private:
+    static constexpr const char* homeVariable = "XDG_CONFIG_HOME";
+
     fs::path before_ = fs::current_path();
+    std::optional<std::string> homeBefore_;
     fs::path root_;
 };
 
-/// The saver's procedure, but that the stage closes at the end of the last show.
+/// The saver's procedure, but that the stage closes at the end of the last show. The first walk
+/// about tells of its end twice; it is over when the second message comes.
 LRESULT replayProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
-    if (message == TM_SHOWDONE) {
+    if (message == TM_SHOWDONE && RandomWalkActive == 0) {
         ++showsDone;
         if (--showsLeft <= 0) {
             DestroyWindow(window);
@@ -110,7 +127,8 @@ void setStartSettings(const ReplayOptions& options) {
 } // namespace
 
 void Replay(const ReplayOptions& options, const std::function<void(const std::string&)>& line) {
-    const Ground ground(options.toons);
+    const Ground ground;
+    ground.enter(options.toons);
     forgetEarlierStages();
     setStartSettings(options);
     lineSink = line;
@@ -121,8 +139,9 @@ void Replay(const ReplayOptions& options, const std::function<void(const std::st
     TraceStart();
     TraceSink = [](const char* event) { lineSink(event); };
     const HWND stage = createStage(options);
-    while (IsWindow(stage) && seam::liveHandles().timers > 0 &&
-           seam::runUntil(seam::clockNow() + stepTime)) {
+    auto due = seam::nextDeadline();
+    while (due && seam::runUntil(*due)) {
+        due = seam::nextDeadline();
     }
     DestroyWindow(stage);
     Trace("end odometer=%u shows=%d", PacesWalked, showsDone);
@@ -133,20 +152,36 @@ void Replay(const ReplayOptions& options, const std::function<void(const std::st
 
 namespace {
 
+/// Reads a decimal number that is all of the text and lies within the bounds.
+template <class Number>
+bool readNumber(const std::string& text, Number lowest, Number highest, Number& number) {
+    Number read{};
+    const char* end = text.data() + text.size();
+    const auto [stopped, error] = std::from_chars(text.data(), end, read);
+    if (error != std::errc() || stopped != end || read < lowest || read > highest) {
+        return false;
+    }
+    number = read;
+    return true;
+}
+
 /// Reads one option with its value; false if it is none that we know.
 bool readOption(const std::string& name, const std::string& value, ReplayOptions& options) {
+    constexpr int largestSide = 0x7FFF;
     if (name == "--size") {
-        return std::sscanf(value.c_str(), "%dx%d", &options.width, &options.height) == 2 &&
-               options.width > 0 && options.height > 0 && options.width <= 0x7FFF &&
-               options.height <= 0x7FFF;
+        const auto cross = value.find('x');
+        return cross != std::string::npos &&
+               readNumber(value.substr(0, cross), 1, largestSide, options.width) &&
+               readNumber(value.substr(cross + 1), 1, largestSide, options.height);
     }
     if (name == "--shows") {
-        return std::sscanf(value.c_str(), "%d", &options.shows) == 1;
+        return readNumber(value, 1, std::numeric_limits<int>::max(), options.shows);
     }
+    constexpr auto largest = std::numeric_limits<std::uint32_t>::max();
     if (name == "--seed") {
-        return std::sscanf(value.c_str(), "%u", &options.seed) == 1;
+        return readNumber(value, 0U, largest, options.seed);
     }
-    return name == "--paces" && std::sscanf(value.c_str(), "%u", &options.paces) == 1;
+    return name == "--paces" && readNumber(value, 0U, largest, options.paces);
 }
 
 } // namespace

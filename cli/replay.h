@@ -18,10 +18,10 @@ struct ReplayOptions {
     bool statements = true;  // whether walks about use the table of statements
 };
 
-/// Hands each line of the record to `line`. A stage that stands still for good, as after a Toon
-/// that doesn't load, is closed; message boxes are answered with OK. The settings are those of a
-/// fresh user and lie in a directory that goes at the end. Throws std::filesystem::filesystem_error
-/// if the files can't be copied.
+/// Hands each line of the record to `line`. A stage that stands still for good, as after a Toon that
+/// doesn't load, is closed; message boxes are answered with OK. The settings are those of a fresh
+/// user and lie in a directory that goes at the end. Throws a std::exception that tells why if the
+/// files can't be copied.
 void Replay(const ReplayOptions& options, const std::function<void(const std::string&)>& line);
 
 /// `toon trace [--size WxH] [--seed N] [--shows N] [--paces N] [FILE...]`: prints the record; gives

@@ -50,8 +50,8 @@ ToonHeader NewHeader() {
     ToonHeader header{};
     std::memcpy(header.magic, ToonMagic, sizeof ToonMagic);
     header.version = TOON_VERSION;
-    header.speed = 3;
-    header.background = 1;
+    header.speed = TOON_DEFAULT_SPEED;
+    header.background = TOON_DEFAULT_BACKGROUND;
     return header;
 }
 

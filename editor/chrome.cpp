@@ -1,5 +1,5 @@
 // The editor's buttons and progress bar, as far as the stage asks for them. There is no editor
-// window yet, so there is nothing to change: in the saver and the player these do nothing anyway.
+// window yet, so there is nothing to change.
 #include "stage/editor_host.h"
 
 void SetPlayButton(int /*state*/) {}

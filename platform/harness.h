@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <functional>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -20,6 +21,9 @@ void useSystemClock();
 
 /// Milliseconds of the clock in use.
 std::int64_t clockNow();
+
+/// When the next timer is due; nothing while none runs.
+std::optional<std::int64_t> nextDeadline();
 
 /// Handles messages until the clock moved by hand has come to `milliseconds`, or until a loop has
 /// been asked to end; gives false then. Deadlines at `milliseconds` itself are met.

@@ -13,7 +13,9 @@ static void RequestClose(HWND window) {
 }
 
 LRESULT SaverGuardProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
-    if (message == WM_DESTROY) {
+    if (message == WM_CREATE) {
+        CloseWaits = 0;
+    } else if (message == WM_DESTROY) {
         PostQuitMessage(0);
     }
     return ShowProc(window, message, wParam, lParam);

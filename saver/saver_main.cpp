@@ -178,6 +178,7 @@ int RunSaver(HWND parent) {
         LoadPasswordModule();
     }
     int result = EXIT_REFUSED;
+    SaverWindow = nullptr;
     if (RegisterSaverClass()) {
         SaverWindow = CreateSaverWindow(parent);
     }

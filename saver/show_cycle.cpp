@@ -122,6 +122,8 @@ static BOOL FindNextToon(HANDLE scan, WIN32_FIND_DATAA* entry) {
 }
 
 LONG CountToonFiles() {
+    // Meant: whatever has such a name counts, a directory too; its load fails like that of any bad
+    // file.
     WIN32_FIND_DATAA entry{};
     ToonFileCount = 0;
     const HANDLE scan = FindFirstToon(&entry);
@@ -220,6 +222,7 @@ void PickBackground(HWND window) {
 
 void ChooseNextShow(HWND window) {
     if (WalkingStyle == STYLE_TOONS) {
+        // Meant: these two changes are saved as the user's choice when the stage ends.
         Backgrounds = 1;
         PickToonFile();
         if (NextToonFile[0] == '\0') {
@@ -277,6 +280,17 @@ static LRESULT OnTimer(HWND window, HINSTANCE instance, UINT_PTR timer) {
     return 0;
 }
 
+/// The stage has another size: its picture is made anew, and a walk under way goes on.
+static LRESULT OnSize(HWND window, HINSTANCE instance, DWORD size) {
+    if (size != StageSize) {
+        StageSize = size;
+        RebuildBackdrop(window, instance);
+        StageRepaintFlag = 1;
+        InvalidateRect(window, nullptr, FALSE);
+    }
+    return 0;
+}
+
 static LRESULT OnShowDone(HWND window, HINSTANCE instance) {
     ShowReset(window);
     ChooseNextShow(window);
@@ -293,6 +307,8 @@ LRESULT ShowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
         ShowTeardown(window);
         PostQuitMessage(0);
         return 0;
+    case WM_SIZE:
+        return OnSize(window, instance, static_cast<DWORD>(lParam));
     case WM_PAINT:
         PaintStage(window, &StageRepaintFlag);
         return 0;

@@ -14,7 +14,7 @@ char StageTitle[STAGE_TITLE_SIZE];
 HFONT TitleFont;
 HFONT BylineFont;
 
-static constexpr char FIRST_TILE[] = "bg01";
+static constexpr LONG FIRST_TILE = 1;
 
 static LONG StageWidth() {
     return LOWORD(StageSize);
@@ -33,19 +33,14 @@ void TileName(char* name, LONG index) {
 /// Meant: background 0 shows bg01 by a plain load; from 1 on tiles are loaded with their palette,
 /// which blanks the stage in between.
 static HBITMAP LoadTile(HINSTANCE instance, HDC dc) {
-    char name[TILE_NAME_SIZE] = "bg01";
     HBITMAP tile;
     if (BackgroundIndex != 0) {
         tile = LoadNumberedTile(instance, dc, BackgroundIndex);
-        if (tile) {
-            TileName(name, BackgroundIndex);
-        }
     }
-    if (!tile) {
-        tile = LoadBitmapA(instance, FIRST_TILE);
-    }
+    char name[TILE_NAME_SIZE];
+    TileName(name, tile ? BackgroundIndex : FIRST_TILE);
     Trace("rebuild_backdrop index=%d tile=%s", BackgroundIndex, name);
-    return tile;
+    return tile ? tile : LoadBitmapA(instance, name);
 }
 
 HBITMAP RebuildBackdrop(HWND stage, HINSTANCE instance) {
@@ -54,6 +49,7 @@ HBITMAP RebuildBackdrop(HWND stage, HINSTANCE instance) {
     }
     BackdropBitmap = BuildBackdrop(instance, stage);
     if (!BackdropBitmap) {
+        // Meant: no bitmap of this name exists, so that a stage without memory has no backdrop.
         BackdropBitmap = LoadBitmapA(instance, "background");
     }
     return BackdropBitmap;

@@ -4,8 +4,8 @@
 
 #include "platform/user.h"
 
-/// The stage-sized picture, null before the first build. Owned here; a host that ends with the
-/// process may delete it and set it to null.
+/// The stage-sized picture, null before the first build. Owned here; the editor deletes it at its
+/// end and sets it to null.
 extern HBITMAP BackdropBitmap;
 
 /// 1 once the big title has been painted. Set here, cleared by the stage's host.
@@ -42,8 +42,8 @@ HBITMAP LoadPaletteBitmap(HINSTANCE instance, HDC dc, const char* name);
 /// and the bottom are cut by the target. Nothing for no bitmap.
 void TileBitmap(HDC dc, LONG left, LONG top, LONG right, LONG bottom, HBITMAP bitmap);
 
-/// Shows a grey stage with a black line round it until the next paint: only between two walks about
-/// of the saver, once the title has gone.
+/// Shows a grey stage with a black line round it until the next paint: only in a saver or player
+/// window, with Backgrounds on, once the title has been painted.
 void BlankStage(HDC dc);
 
 /// Copies a stage-sized bitmap to the whole stage; nothing for no bitmap.

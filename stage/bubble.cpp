@@ -4,6 +4,7 @@
 #include "stage/character.h"
 #include "stage/stage.h"
 #include "stage/walk.h"
+#include "toon/toon_document.h"
 
 #include <cstring>
 
@@ -24,13 +25,6 @@ void LoadBubbleArt(HWND stage, HINSTANCE instance) {
     BubbleRightBitmap = LoadBitmapA(instance, "bubright");
     BubbleLeftBitmap = LoadBitmapA(instance, "bubleft");
     PositionBubble(stage, 0, 0);
-}
-
-static void FreeBitmap(HBITMAP* bitmap) {
-    if (*bitmap) {
-        DeleteObject(*bitmap);
-    }
-    *bitmap = nullptr;
 }
 
 void FreeBubbleArt() {
@@ -120,8 +114,7 @@ static void EscapeReturns(const char* text, char* escaped) {
 }
 
 static void TraceBubble(const char* text) {
-    constexpr std::size_t longest = 70;
-    char escaped[2 * longest] = {};
+    char escaped[2 * TOON_TEXT_SIZE] = {};
     EscapeReturns(text, escaped);
     const RECT area = TextRectangle();
     Trace("bubble_show rect=[%d,%d,%d,%d] text_rect=[%d,%d,%d,%d] text=%s", BubbleSprite.drawX,

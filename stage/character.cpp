@@ -43,10 +43,7 @@ void FreeCharacterArt() {
     FreeBubbleArt();
     BubbleHidden = 1;
     for (HBITMAP& picture : CharacterArt) {
-        if (picture) {
-            DeleteObject(picture);
-        }
-        picture = nullptr;
+        FreeBitmap(&picture);
     }
     CharacterArtLoaded = 0;
 }

@@ -30,10 +30,7 @@ void LoadExpressionSheet(HINSTANCE instance) {
 }
 
 void FreeExpressionSheet() {
-    if (ExpressionSheet) {
-        DeleteObject(ExpressionSheet);
-    }
-    ExpressionSheet = nullptr;
+    FreeBitmap(&ExpressionSheet);
 }
 
 const ToonFrame* FollowedFrame() {

@@ -27,18 +27,12 @@ static constexpr UINT ARRIVAL_INTERVAL = 500; // ms
 static constexpr LONG WALK_OFF_POSE = 0;
 static constexpr LONG CLICK_POSE = 0;
 
-static LONG ClientWidth(HWND stage) {
-    RECT client = {};
-    GetClientRect(stage, &client);
-    return client.right - client.left;
-}
-
 void EnterShow(HWND stage) {
     NextFrameIndex = 0;
     FrameGet(0, &PlayFrame);
     // Meant: the place is taken as recorded, neither scaled nor turned from centre to corner.
     CharacterY = PlayFrame.y;
-    CharacterX = OffStageX(ClientWidth(stage), PlayFrame.x);
+    CharacterX = OffStageSide(stage, PlayFrame.x);
     PlaceCharacterOffStage(stage, CharacterX, CharacterY);
     ShowStarted = 1;
 }
@@ -60,7 +54,8 @@ int WalkToNextFrame(HWND stage) {
 }
 
 UINT_PTR WalkOffStage(HWND stage) {
-    const LONG targetX = OffStageX(ClientWidth(stage), CharacterX);
+    // Meant: the nearer side is that of his corner, not of his middle.
+    const LONG targetX = OffStageSide(stage, CharacterX);
     Trace("walk_off target=[%d,%d]", targetX, CharacterY);
     const UINT_PTR begun =
         WalkTo(stage, CharacterX, CharacterY, targetX, CharacterY, WALK_OFF_POSE);
@@ -138,6 +133,7 @@ static void BeginArrival(HWND stage, const char* text, LONG seconds) {
 }
 
 void ArrivalPause(HWND stage, const char* text, LONG seconds) {
+    // Meant: a frame without a pause comes here as a cancelling call, and the show stands for good.
     if (seconds == 0) {
         CancelPause(stage);
     } else if (PendingPause != 0) {

@@ -66,7 +66,7 @@ static LONG PickStatement(DWORD allowStatements) {
     }
     LONG statement = 0;
     do {
-        statement = RandomInt(FIRST_STATEMENT, LAST_STATEMENT);
+        statement = RandomInt(FIRST_STATEMENT, LastStatementId);
     } while (statement == PreviousStatement);
     return statement;
 }
@@ -119,9 +119,7 @@ int PrepareRandomWalk(HWND stage, LONG statement) {
     FillStatement(instance, statement);
     SetBusyCursor(stage, 1);
     DisableButtons();
-    RECT client = {};
-    GetClientRect(stage, &client);
-    CharacterX = OffStageX(client.right, WalkFrame.x);
+    CharacterX = OffStageSide(stage, WalkFrame.x);
     CharacterY = WalkFrame.y;
     PlaceCharacterOffStage(stage, CharacterX, CharacterY);
     WalkingOut = 0;
@@ -149,9 +147,7 @@ void RandomPauseOver(HWND stage) {
         ArrivalPause(stage, nullptr, 0);
     }
     if (WalkingOut == 0) {
-        RECT client = {};
-        GetClientRect(stage, &client);
-        WalkFrame.x = OffStageX(client.right, WalkFrame.x);
+        WalkFrame.x = OffStageSide(stage, WalkFrame.x);
         WalkToRandomFrame(stage);
     }
     WalkingOut = 1;

@@ -27,7 +27,7 @@ extern LONG PreviousStatement;
 constexpr LONG STATEMENT_PACES = -1; // how far he has walked
 constexpr LONG STATEMENT_NONE = 0;   // he stands and says nothing
 constexpr LONG FIRST_STATEMENT = 4;
-constexpr LONG LAST_STATEMENT = 65;
+constexpr LONG LastStatementId = 65;
 
 constexpr LONG RANDOM_HIGHEST = 3276;
 
@@ -38,8 +38,10 @@ void SeedRandom(DWORD seed);
 /// can't be met give the lower one.
 LONG RandomInt(LONG low, LONG high);
 
-/// Chooses a walk and starts it. 0, and nothing changed, while a show or any walk is under way or
-/// the frame editor is open, else 1. `allowStatements` nonzero lets him say one of the table.
+/// Chooses a walk and starts it. 0, and nothing changed, while a show is under way, he is walking,
+/// or the frame editor is open, else 1; during the pause of a walk about too, whose WalkFrame is
+/// then overwritten: whoever may ask at that time keeps the user from it. `allowStatements` nonzero
+/// lets him say one of the table.
 int PickRandomWalk(HWND stage, DWORD allowStatements);
 
 /// Brings him to his starting place with the statement in WalkFrame. 0, and nothing changed, while

@@ -172,16 +172,17 @@ BOOL SpriteHitTest(const Sprite* sprite, POINT point) {
     return PtInRect(&area, point);
 }
 
+void FreeBitmap(HBITMAP* bitmap) {
+    if (*bitmap) {
+        DeleteObject(*bitmap);
+    }
+    *bitmap = nullptr;
+}
+
 void SpriteFree(Sprite* sprite) {
-    if (sprite->image) {
-        DeleteObject(sprite->image);
-    }
-    if (sprite->savedUnder) {
-        DeleteObject(sprite->savedUnder);
-    }
     sprite->frameBitmap = nullptr;
-    sprite->image = nullptr;
-    sprite->savedUnder = nullptr;
+    FreeBitmap(&sprite->image);
+    FreeBitmap(&sprite->savedUnder);
 }
 
 void SpriteStampOnce(HDC dc, HBITMAP bitmap, LONG x, LONG y) {

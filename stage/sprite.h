@@ -44,6 +44,9 @@ void SpriteMove(HWND window, Sprite* sprite, LONG x, LONG y);
 /// Nonzero if the point lies in the Sprite's rectangle, see-through corners included.
 BOOL SpriteHitTest(const Sprite* sprite, POINT point);
 
+/// Deletes the bitmap if there is one, and forgets it.
+void FreeBitmap(HBITMAP* bitmap);
+
 /// Frees what the Sprite owns and forgets all three bitmaps.
 void SpriteFree(Sprite* sprite);
 

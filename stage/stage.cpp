@@ -29,6 +29,12 @@ const char* StageTimerName(UINT_PTR timer) {
     }
 }
 
+LONG OffStageSide(HWND stage, LONG x) {
+    RECT client = {};
+    GetClientRect(stage, &client);
+    return OffStageX(client.right, x);
+}
+
 void StageBegin() {
     TraceTimerName = StageTimerName;
     WalkTimerRunning = 0;

@@ -37,9 +37,10 @@ extern DWORD SaverActive;
 /// 1 once the saver runs as a child of a given window. Written by the saver.
 extern DWORD PreviewMode;
 
-/// Puts the whole stage at rest, as it stands in a fresh process, before a new stage window has set
-/// a timer. What outlives a stage stays: the last mouth shape, the last statement and background,
-/// the speed and the caption. Art, fonts and backdrop aren't touched. Timers stand under their
+/// Puts the whole stage at rest before a new stage window has set a timer. What outlives a stage
+/// stays: the last mouth shape, the last statement and background, the speed and the caption, where
+/// he last stood and walked to. OpeningDone and TitleShown are the host's to clear. Art, fonts and
+/// backdrop aren't touched. Timers stand under their
 /// names in the record from here on.
 void StageBegin();
 
@@ -67,3 +68,6 @@ constexpr LONG OffStageX(LONG width, LONG x) {
     constexpr LONG beyondRightEdge = 50;
     return width / 2 <= x ? width + beyondRightEdge : OFF_LEFT_X;
 }
+
+/// The same on the side of the stage that is nearer to x.
+LONG OffStageSide(HWND stage, LONG x);

@@ -139,7 +139,8 @@ void WalkStep(HWND stage) {
         ShowWalkStep(stage, WalkedSprite, WalkPath, WalkStepIndex);
         return;
     }
-    // The walk is over before the message goes out: its handler may plan the next one.
+    // Meant: the pose has stood for one interval. The walk is over before the message goes out: its
+    // handler may plan the next one.
     WalkStepIndex = 0;
     WalkTimerRunning = 0;
     KillTimer(stage, TIMER_WALK);

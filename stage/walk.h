@@ -19,9 +19,10 @@ constexpr LONG WALK_STRIDE = 20; // pixels aimed at per stride
 /// pose. Written by BuildWalkPath.
 extern PathStep WalkPath[WALK_PATH_ENTRIES];
 
-/// The entry last drawn, 0 for a walk just planned; and the last one. Written here and by
-/// StageBegin.
+/// The entry last drawn, 0 for a walk just planned. Written here and by StageBegin.
 extern LONG WalkStepIndex;
+
+/// The walk's last entry. Written by BuildWalkPath.
 extern LONG WalkLastIndex;
 
 /// Milliseconds between ticks, kept for ResumeWalkTimer. Written by StartWalkTimer.

@@ -11,13 +11,13 @@ LONG Backgrounds = 1;
 DWORD PacesWalked = 0;
 char Directory[DIRECTORY_SIZE];
 
-static const char SettingsFile[] = "Dorbo95.ini";
-static const char SettingsSection[] = "Fenky Dorbo Screen Saver";
-static const char WalkingStyleKey[] = "Walking Style";
-static const char StatementsKey[] = "Statements";
-static const char BackgroundsKey[] = "Backgrounds";
-static const char PacesWalkedKey[] = "Paces Walked";
-static const char DirectoryKey[] = "Directory";
+static const char SETTINGS_FILE[] = "Dorbo95.ini";
+static const char SETTINGS_SECTION[] = "Fenky Dorbo Screen Saver";
+static const char WALKING_STYLE_KEY[] = "Walking Style";
+static const char STATEMENTS_KEY[] = "Statements";
+static const char BACKGROUNDS_KEY[] = "Backgrounds";
+static const char PACES_WALKED_KEY[] = "Paces Walked";
+static const char DIRECTORY_KEY[] = "Directory";
 
 void EnsureTrailingBackslash(char* text) {
     const std::size_t length = std::strlen(text);
@@ -38,41 +38,46 @@ static void CopyDirectory(char* target, const char* source) {
 }
 
 static LONG ReadSwitch(const char* key, LONG otherwise) {
-    return static_cast<LONG>(GetPrivateProfileIntA(SettingsSection, key, otherwise, SettingsFile));
+    return static_cast<LONG>(
+        GetPrivateProfileIntA(SETTINGS_SECTION, key, otherwise, SETTINGS_FILE));
 }
 
-static void ReadDirectory() {
+/// The current directory, for a settings file that names none.
+static void ReadFallback(char* fallback) {
     char current[DIRECTORY_SIZE] = "";
     GetCurrentDirectoryA(sizeof current, current);
-    char fallback[DIRECTORY_SIZE];
     CopyDirectory(fallback, current);
+}
 
+static void ReadDirectory(const char* fallback) {
     // Two bytes more than Directory has, so that a value that doesn't fit shows as one.
     char value[DIRECTORY_SIZE + 2] = "";
-    GetPrivateProfileStringA(SettingsSection, DirectoryKey, fallback, value, sizeof value,
-                             SettingsFile);
+    GetPrivateProfileStringA(SETTINGS_SECTION, DIRECTORY_KEY, fallback, value, sizeof value,
+                             SETTINGS_FILE);
     CopyDirectory(Directory, value);
 }
 
 void SettingsLoad() {
-    WalkingStyle = ReadSwitch(WalkingStyleKey, WalkingStyle);
-    Statements = ReadSwitch(StatementsKey, Statements);
-    Backgrounds = ReadSwitch(BackgroundsKey, Backgrounds);
-    PacesWalked = GetPrivateProfileIntA(SettingsSection, PacesWalkedKey, 0, SettingsFile);
-    ReadDirectory();
+    char fallback[DIRECTORY_SIZE];
+    ReadFallback(fallback);
+    WalkingStyle = ReadSwitch(WALKING_STYLE_KEY, WalkingStyle);
+    Statements = ReadSwitch(STATEMENTS_KEY, Statements);
+    Backgrounds = ReadSwitch(BACKGROUNDS_KEY, Backgrounds);
+    PacesWalked = GetPrivateProfileIntA(SETTINGS_SECTION, PACES_WALKED_KEY, 0, SETTINGS_FILE);
+    ReadDirectory(fallback);
     WalkingStyleChoice = WalkingStyle;
 }
 
 void WriteIntSetting(const char* section, const char* key, DWORD value) {
     char text[40];
     wsprintfA(text, "%u", value);
-    WritePrivateProfileStringA(section, key, text, SettingsFile);
+    WritePrivateProfileStringA(section, key, text, SETTINGS_FILE);
 }
 
 void SettingsSave() {
-    WriteIntSetting(SettingsSection, WalkingStyleKey, static_cast<DWORD>(WalkingStyle));
-    WriteIntSetting(SettingsSection, StatementsKey, static_cast<DWORD>(Statements));
-    WriteIntSetting(SettingsSection, BackgroundsKey, static_cast<DWORD>(Backgrounds));
-    WriteIntSetting(SettingsSection, PacesWalkedKey, PacesWalked);
-    WritePrivateProfileStringA(SettingsSection, DirectoryKey, Directory, SettingsFile);
+    WriteIntSetting(SETTINGS_SECTION, WALKING_STYLE_KEY, static_cast<DWORD>(WalkingStyle));
+    WriteIntSetting(SETTINGS_SECTION, STATEMENTS_KEY, static_cast<DWORD>(Statements));
+    WriteIntSetting(SETTINGS_SECTION, BACKGROUNDS_KEY, static_cast<DWORD>(Backgrounds));
+    WriteIntSetting(SETTINGS_SECTION, PACES_WALKED_KEY, PacesWalked);
+    WritePrivateProfileStringA(SETTINGS_SECTION, DIRECTORY_KEY, Directory, SETTINGS_FILE);
 }

@@ -23,8 +23,8 @@ OPENFILENAME ToonFileDialog;
 /// Records that FrameStore has room for, 0 while it is absent.
 static LONG FrameStoreSize = 0;
 
-static constexpr UINT SaveMenuItem = 113;
-static constexpr std::size_t MessageSize = 512; // the longest message with the longest name in it
+static constexpr UINT SAVE_MENU_ITEM = 113;
+static constexpr std::size_t MESSAGE_SIZE = 512; // the longest message with the longest name in it
 
 // ---- Frames -----------------------------------------------------------------------------------
 
@@ -86,15 +86,18 @@ int FrameStoreGrow() {
 }
 
 int FrameStoreInsert(LONG index) {
-    const LONG behind = FrameCount - index;
-    if (index < 0 || behind < 0 || FrameCount >= TOON_FRAME_LIMIT) {
+    if (index < 0 || index > FrameCount || FrameCount >= TOON_FRAME_LIMIT) {
         return 0;
     }
+    const LONG behind = FrameCount - index;
     ++FrameCount;
     if (!FrameStoreGrow()) {
         return 0;
     }
     ToonFrame* frames = static_cast<ToonFrame*>(GlobalLock(FrameStore));
+    if (frames == nullptr) {
+        return 0;
+    }
     std::memmove(frames + index + 1, frames + index, static_cast<std::size_t>(FrameBytes(behind)));
     frames[index] = {};
     GlobalUnlock(FrameStore);
@@ -153,11 +156,11 @@ int FramePut(LONG index, const ToonFrame* in) {
 
 void ToonSetDirty(HWND window, DWORD dirty) {
     ToonDirty = dirty;
-    EnableMenuItem(GetMenu(window), SaveMenuItem, dirty != 0 ? MF_ENABLED : MF_GRAYED);
+    EnableMenuItem(GetMenu(window), SAVE_MENU_ITEM, dirty != 0 ? MF_ENABLED : MF_GRAYED);
 }
 
-/// position * present / recorded, truncated toward zero. The product wraps at 32 bits, as a Toon
-/// with a far-off position has always had it. A recorded size of 0 leaves the axis alone. Meant.
+/// position * present / recorded, truncated toward zero. Meant: the product wraps at 32 bits, which
+/// decides where a far-off position comes to lie, and a recorded size of 0 leaves the axis alone.
 static LONG ScaleAxis(LONG position, LONG present, WORD recorded) {
     if (recorded == 0) {
         return position;
@@ -184,8 +187,8 @@ void ToonNewDefaults() {
     CopyText(ToonDocHeader.caption, CaptionText, TOON_CAPTION_SIZE);
     ToonDocHeader.windowSize = StageSize;
     ToonDocHeader.frameCount = 1;
-    ToonDocHeader.speed = 3;
-    ToonDocHeader.background = 1;
+    ToonDocHeader.speed = TOON_DEFAULT_SPEED;
+    ToonDocHeader.background = TOON_DEFAULT_BACKGROUND;
 }
 
 int ToonFileSetup(HWND owner) {
@@ -228,7 +231,7 @@ int ToonReadHeader(HWND owner, HFILE file) {
         return 0;
     }
     if (ToonDocHeader.version != TOON_VERSION) {
-        char message[MessageSize];
+        char message[MESSAGE_SIZE];
         wsprintfA(message, "Invalid ToonFile Version %s.", ToonFileName);
         TellError(owner, message, MB_ICONEXCLAMATION);
         return 0;
@@ -251,7 +254,7 @@ static int WriteToon(HFILE file, const void* frames) {
 }
 
 int ToonSave(HWND owner) {
-    char message[MessageSize];
+    char message[MESSAGE_SIZE];
     HoldFrameCount();
     OFSTRUCT found;
     const HFILE file = FrameStore
@@ -288,7 +291,8 @@ static LONG CountFrames(HFILE file) {
     return count <= INT32_MAX ? static_cast<LONG>(count) : -1;
 }
 
-/// Reads `count` records into the store; what doesn't come stays zero, after a message.
+/// Reads `count` records into the store and closes the file; what doesn't come stays zero, after a
+/// message.
 static void ReadFrames(HWND owner, HFILE file, LONG count) {
     const LONG bytes = FrameBytes(count);
     const HCURSOR before = ShowWaitCursor();
@@ -296,21 +300,24 @@ static void ReadFrames(HWND owner, HFILE file, LONG count) {
     const LONG read = frames == nullptr ? 0 : _hread(file, frames, bytes);
     SetCursor(before);
     if (read < bytes) {
-        char message[MessageSize];
+        char message[MESSAGE_SIZE];
         wsprintfA(message, "Error reading %s.", ToonFileName);
         TellError(owner, message, MB_ICONEXCLAMATION);
     }
+    _lclose(file);
     GlobalUnlock(FrameStore);
 }
 
-/// Loads an open file. Gives its number of frames, 0 for failure.
+/// Loads an open file and closes it. Gives its number of frames, 0 for failure.
 static LONG ReadToon(HWND owner, HFILE file) {
     const LONG count = CountFrames(file);
     if (!FrameStoreAlloc(count)) {
         TellError(owner, "Not enough memory.", MB_ICONHAND);
+        _lclose(file);
         return 0;
     }
     if (!ToonReadHeader(owner, file)) {
+        _lclose(file);
         return 0;
     }
     ReadFrames(owner, file, count);
@@ -328,7 +335,6 @@ LONG ToonLoad(HWND owner) {
         return 0;
     }
     const LONG count = ReadToon(owner, file);
-    _lclose(file);
     if (count == 0) {
         HoldFrameCount();
         return 0;

@@ -23,6 +23,8 @@ constexpr std::size_t TOON_CAPTION_SIZE = 52; // NUL included
 constexpr std::size_t TOON_TEXT_SIZE = 70;    // NUL included
 constexpr std::size_t TOON_PATH_SIZE = 256;   // NUL included
 constexpr DWORD TOON_VERSION = 0x20001;
+constexpr LONG TOON_DEFAULT_SPEED = 3;
+constexpr LONG TOON_DEFAULT_BACKGROUND = 1;
 constexpr LONG TOON_FRAME_LIMIT =
     251; // frames that the editor makes; a longer file loads and plays
 
@@ -66,7 +68,7 @@ extern ToonHeader ToonDocHeader;
 /// The frames, null while absent. Only this file's operations write it.
 extern HGLOBAL FrameStore;
 
-/// Frames in force, 1 at program start. Loads, stage starts, New, Insert and Delete write it.
+/// Frames in force, 1 at program start. Only this file and the editor write it.
 extern LONG FrameCount;
 
 /// The frame that is edited or walked to. The editor, loads and the player write it.
@@ -149,18 +151,19 @@ int ToonWriteHeader(HFILE file);
 /// message for a version that isn't TOON_VERSION.
 int ToonReadHeader(HWND owner, HFILE file);
 
-/// Writes the Toon to ToonFileName, over what was there. 0 after a message. Without a store
-/// nothing is touched, so that a Toon that failed to load can't empty its file.
+/// Writes the Toon to ToonFileName, over what was there. 0 after a message; without a store that
+/// is all, and the file stays. FrameCount is held to what the store has.
 int ToonSave(HWND owner);
 
-/// Reads the file ToonFileName, the number of whole records in it decides how many frames. Gives
-/// that number, 0 for none and for failure, mostly after a message. Past its opening the frames of
-/// before are gone. FrameCount never exceeds the store afterwards.
+/// Reads the file ToonFileName. Its size decides how many frames there are, (size - 103) / 92: a
+/// last record that lacks one byte counts too. Gives that number, 0 for none and for failure,
+/// mostly after a message. Past its opening the frames of before are gone. FrameCount never exceeds
+/// the store afterwards.
 LONG ToonLoad(HWND owner);
 
 /// Reads the file again, 0 without a name.
 LONG ToonReload(HWND owner);
 
-/// Loads a Toon by name for the saver and the player, and selects its first frame. 1, or 0 after
-/// a message. A name that doesn't fit ToonFileName is never cut to another's: 0.
+/// Loads a Toon by name for the saver and the player, and selects its first frame. 1, or 0 as
+/// ToonLoad. A name that doesn't fit ToonFileName is never cut to another's: 0.
 int ToonOpenNamed(HWND stage, const char* name);

@@ -8,9 +8,6 @@
 
 namespace seam {
 
-/// When the next timer is due, by the seam's clock; nothing if none runs.
-std::optional<std::int64_t> nextDeadline();
-
 /// The timer that has waited longest, if one is due now and its window and id fit the filters.
 struct DueTimer {
     HWND window;

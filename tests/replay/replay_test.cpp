@@ -56,13 +56,38 @@ void holdAgainstRecord(const ReplayOptions& options, const std::string& name) {
     EXPECT_EQ(now.size(), recorded.size()) << name;
 }
 
+/// A directory for the Toons that are made here.
+class Workshop {
+  public:
+    Workshop() {
+        std::string pattern = fs::temp_directory_path() / "replay-test-XXXXXX";
+        path_ = mkdtemp(pattern.data());
+    }
+
+    Workshop(const Workshop&) = delete;
+    Workshop& operator=(const Workshop&) = delete;
+
+    ~Workshop() {
+        std::error_code ignored;
+        fs::remove_all(path_, ignored);
+    }
+
+    const fs::path& path() const {
+        return path_;
+    }
+
+  private:
+    fs::path path_;
+};
+
 /// The Toon file of a name: one of those that come with the program, or made from the text here.
 fs::path toonFile(const std::string& name) {
     const fs::path text = here / "toons" / (name + ".txt");
     if (!fs::exists(text)) {
         return shipped / (name + ".zkt");
     }
-    fs::path made = fs::temp_directory_path() / (name + ".zkt");
+    static const Workshop workshop;
+    fs::path made = workshop.path() / (name + ".zkt");
     EXPECT_EQ(MakeCommand({text, made}), 0);
     return made;
 }
@@ -114,6 +139,23 @@ Lines valuesOf(const Lines& lines, const std::string& event, const std::string& 
         }
     }
     return values;
+}
+
+ReplayOptions walksAbout(bool statements) {
+    ReplayOptions options;
+    options.statements = statements;
+    options.shows = 4;
+    options.paces = 4711;
+    return options;
+}
+
+TEST(WalkAbout, RunsAsRecordedWithStatementsAndWithout) {
+    holdAgainstRecord(walksAbout(true), "walk-about");
+    holdAgainstRecord(walksAbout(false), "walk-about-silent");
+}
+
+TEST(Cycle, RunsAsRecorded) {
+    holdAgainstRecord(cycleOfThree(5, 4), "cycle-of-three");
 }
 
 TEST(Cycle, PlaysTheIntroFirstAndNeverTheSameTwiceInARow) {

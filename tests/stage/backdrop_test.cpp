@@ -110,7 +110,7 @@ TEST_F(Backdrop, EveryNumberedTileHasTheColoursOfItsPlainLoad) {
     }
 }
 
-TEST_F(Backdrop, BlanksTheStageOnlyBetweenTwoWalksOfTheSaver) {
+TEST_F(Backdrop, BlanksTheStageOnlyInASaverOnceTheTitleIsPainted) {
     const struct {
         DWORD saver;
         LONG backgrounds;

@@ -88,7 +88,7 @@ TEST_F(RandomWalk, NeverSaysTheSameTwiceInARow) {
         pick(1);
         EXPECT_NE(PreviousStatement, before);
         EXPECT_TRUE(PreviousStatement == STATEMENT_PACES ||
-                    (PreviousStatement >= FIRST_STATEMENT && PreviousStatement <= LAST_STATEMENT));
+                    (PreviousStatement >= FIRST_STATEMENT && PreviousStatement <= LastStatementId));
         paces += PreviousStatement == STATEMENT_PACES ? 1 : 0;
         winks += WalkFrame.wink;
     }
@@ -223,7 +223,7 @@ TEST(StatementTable, HoldsSixtyTwoThatFitTheBubble) {
     std::size_t longest = 0;
     int broken = 0;
     std::set<std::string> all;
-    for (LONG id = FIRST_STATEMENT; id <= LAST_STATEMENT; ++id) {
+    for (LONG id = FIRST_STATEMENT; id <= LastStatementId; ++id) {
         char text[TOON_TEXT_SIZE] = {};
         const auto length = static_cast<std::size_t>(
             LoadStringA(GetModuleHandleA(nullptr), static_cast<UINT>(id), text, sizeof(text)));
