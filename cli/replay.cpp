@@ -140,7 +140,7 @@ void Replay(const ReplayOptions& options, const std::function<void(const std::st
     TraceSink = [](const char* event) { lineSink(event); };
     const HWND stage = createStage(options);
     auto due = seam::nextDeadline();
-    while (due && seam::runUntil(*due)) {
+    while (due && *due <= options.longest && seam::runUntil(*due)) {
         due = seam::nextDeadline();
     }
     DestroyWindow(stage);

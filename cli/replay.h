@@ -15,13 +15,14 @@ struct ReplayOptions {
     std::uint32_t seed = 1;  // of the random numbers
     int shows = 1;           // after how many ends of a show the stage closes
     std::uint32_t paces = 0; // the odometer at the start; 0 plays intro.zkt first
-    bool statements = true;  // whether walks about use the table of statements
+    std::int64_t longest = 24LL * 60 * 60 * 1000; // ms, after which the stage closes at the latest
+    bool statements = true;                       // whether walks about use the table of statements
 };
 
-/// Hands each line of the record to `line`. A stage that stands still for good, as after a Toon that
-/// doesn't load, is closed; message boxes are answered with OK. The settings are those of a fresh
-/// user and lie in a directory that goes at the end. Throws a std::exception that tells why if the
-/// files can't be copied.
+/// Hands each line of the record to `line`. A stage that stands still for good, as after a Toon
+/// that doesn't load, is closed; message boxes are answered with OK. The settings are those of a
+/// fresh user and lie in a directory that goes at the end. Throws a std::exception that tells why
+/// if the files can't be copied.
 void Replay(const ReplayOptions& options, const std::function<void(const std::string&)>& line);
 
 /// `toon trace [--size WxH] [--seed N] [--shows N] [--paces N] [FILE...]`: prints the record; gives
