@@ -8,7 +8,6 @@
 #include <limits>
 
 using testing::ElementsAre;
-using testing::IsEmpty;
 
 namespace {
 
@@ -43,7 +42,8 @@ TEST_F(Face, CopiesTheCellOfItsPoseOntoTheScreen) {
     std::vector<DWORD> cell;
     for (int y = 33; y < 43; ++y) {
         for (int x = 33; x < 43; ++x) {
-            cell.push_back(sheet.pixels[static_cast<std::size_t>(y * sheet.width + x)] & 0xFFFFFF);
+            const int place = y * sheet.width + x;
+            cell.push_back(sheet.pixels[static_cast<std::size_t>(place)] & 0xFFFFFF);
         }
     }
     EXPECT_EQ(pixels({455, 334, 465, 344}), cell);
@@ -83,10 +83,16 @@ TEST_F(Face, BlinksOnlyForAFrameThatWinks) {
 }
 
 TEST_F(Face, FollowsTheRandomWalkWhileThereIsOne) {
-    RandomWalkActive = 1;
-    EXPECT_EQ(FollowedFrame(), &WalkFrame);
-    RandomWalkActive = 0;
-    EXPECT_EQ(FollowedFrame(), &PlayFrame);
+    PlayFrame.wink = 0;
+    WalkFrame = frame(0, 0, 5, 0, 1, "");
+    for (const DWORD walking : {1U, 0U}) {
+        RandomWalkActive = walking;
+        ShowExpression(stage, EXPRESSION_EYES_OPEN);
+        ShowExpression(stage, EXPRESSION_MOUTH_FIRST);
+    }
+    EXPECT_THAT(events({"face"}), ElementsAre("face expr=2 src=[11,55] dst=[463,316]",
+                                              "face expr=3 src=[22,55] dst=[459,331]",
+                                              "face expr=3 src=[22,33] dst=[455,334]"));
 }
 
 TEST_F(Face, TalksAQuarterOfItsLettersInTicks) {

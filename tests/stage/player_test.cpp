@@ -192,17 +192,20 @@ TEST_F(Player, TellsHowFarTheShowHasCome) {
 }
 
 TEST_F(Player, BeginsCleanOnEveryStage) {
-    openToon({frame(500, 400, 3, 2, 1, "Hello you there")});
-    PlayNextFrame(stage);
-    ASSERT_TRUE(runUntilEvent("tick timer=TALK"));
-    const LONG mouth = LastMouthShape;
-    RandomWalkActive = WalkingOut = 1;
-    openStage(1024, 768);
-    StageBegin();
-    EXPECT_EQ(WalkTimerRunning + AwaitingArrival + ShowStarted + Talking, 0U);
-    EXPECT_EQ(RandomWalkActive + WalkingOut, 0U);
-    EXPECT_EQ(NextFrameIndex + PendingPause, 0);
-    EXPECT_STREQ(PendingText, "");
-    EXPECT_EQ(BubbleHidden + PlayIdle, 2U);
-    EXPECT_EQ(LastMouthShape, mouth);
+    for (const char* moment : {"draw", "walk_done", "tick timer=TALK"}) {
+        openToon({frame(500, 400, 3, 2, 1, "Hello you there")});
+        PlayNextFrame(stage);
+        ASSERT_TRUE(runUntilEvent(moment)) << moment;
+        const LONG mouth = LastMouthShape;
+        RandomWalkActive = WalkingOut = 1;
+        openStage(1024, 768);
+        BubbleHidden = 0;
+        StageBegin();
+        EXPECT_EQ(WalkTimerRunning + AwaitingArrival + ShowStarted + Talking, 0U) << moment;
+        EXPECT_EQ(RandomWalkActive + WalkingOut, 0U) << moment;
+        EXPECT_EQ(NextFrameIndex + PendingPause + WalkStepIndex, 0) << moment;
+        EXPECT_STREQ(PendingText, "") << moment;
+        EXPECT_EQ(BubbleHidden + PlayIdle, 2U) << moment;
+        EXPECT_EQ(LastMouthShape, mouth) << moment;
+    }
 }
