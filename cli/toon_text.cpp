@@ -264,7 +264,7 @@ void ReadText(Reader& reader, const Key& key, std::string_view word, char* field
                std::string(key.name) + " is longer than " + std::to_string(key.high) +
                    " characters");
     std::memset(field, 0, key.size);
-    std::memcpy(field, bytes->data(), bytes->size());
+    std::copy(bytes->begin(), bytes->end(), field);
 }
 
 void ReadNumbers(Reader& reader, const Key& key, std::string_view words, char* field) {

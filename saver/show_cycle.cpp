@@ -151,7 +151,7 @@ int PickRandomToonFile(char* name) {
         FindNextToon(scan, &entry); // in a directory that has shrunk the last entry stands
     }
     FindClose(scan);
-    std::strcpy(name, entry.cFileName);
+    CopyText(name, entry.cFileName, NEXT_TOON_SIZE);
     return 1;
 }
 
@@ -165,7 +165,7 @@ int PickIntroToon() {
         return 0;
     }
     FindClose(scan);
-    std::strcpy(NextToonFile, entry.cFileName);
+    CopyText(NextToonFile, entry.cFileName, NEXT_TOON_SIZE);
     return 1;
 }
 
@@ -184,7 +184,7 @@ int PickToonFile() {
          ++i) {
         PickRandomToonFile(name);
     }
-    std::strcpy(NextToonFile, name);
+    CopyText(NextToonFile, name, NEXT_TOON_SIZE);
     return 1;
 }
 

@@ -3,6 +3,7 @@
 #include "platform/drawing_kit.h"
 #include "platform/kernel.h"
 #include "platform/trace.h"
+#include "stage/bubble.h"
 #include "stage/character.h"
 #include "stage/stage.h"
 #include "toon/settings.h"
@@ -194,12 +195,16 @@ LRESULT PaintStage(HWND stage, DWORD* repaintFlag) {
         DrawTitles(dc, stage);
     }
     if (CharacterArtLoaded == 1) {
-        if (*repaintFlag != 0) {
+        const bool saves = *repaintFlag != 0;
+        if (saves) {
             // After the titles, so that he walks off one without wiping it.
             SpriteSaveUnder(dc, &CharacterSprite);
             *repaintFlag = 0;
         }
         SpriteDraw(dc, &CharacterSprite);
+        if (saves) {
+            SaveUnderBubble(dc);
+        }
     }
     RestoreDC(dc, -1);
     EndPaint(stage, &paint);

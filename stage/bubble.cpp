@@ -153,6 +153,12 @@ int DrawBubbleText(HWND stage, const char* text) {
     return height;
 }
 
+void SaveUnderBubble(HDC dc) {
+    if (BubbleStands) {
+        SpriteSaveUnder(dc, &BubbleSprite);
+    }
+}
+
 void HideBubble(HWND stage) {
     if (BubbleStands) {
         const HDC dc = GetDC(stage);

@@ -33,6 +33,10 @@ void ShowBubble(HWND stage, const char* text);
 /// Puts back what lay under the bubble, if one stands, and sets BubbleHidden.
 void HideBubble(HWND stage);
 
+/// A repaint of the stage has wiped the bubble, if one stands: what HideBubble puts back is taken
+/// anew from dc, for the stage may look different now.
+void SaveUnderBubble(HDC dc);
+
 /// Sets BubbleSide by the anchor and the direction of the last walk, then PositionBubble. The
 /// bubble stands in front of him unless he is in that outer quarter of the stage or it doesn't fit
 /// there.

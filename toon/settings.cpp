@@ -1,6 +1,7 @@
 #include "toon/settings.h"
 
 #include "platform/kernel.h"
+#include "toon/toon_document.h"
 
 #include <cstring>
 
@@ -33,7 +34,7 @@ static void CopyDirectory(char* target, const char* source) {
     const std::size_t length = std::strlen(source);
     const bool closed = length > 0 && source[length - 1] == '\\';
     const std::size_t needed = length + (closed ? 1 : 2);
-    std::strcpy(target, needed <= DIRECTORY_SIZE ? source : "");
+    CopyText(target, needed <= DIRECTORY_SIZE ? source : "", DIRECTORY_SIZE);
     EnsureTrailingBackslash(target);
 }
 

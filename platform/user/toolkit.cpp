@@ -62,8 +62,8 @@ bool makeToolkit() {
     QApplication::setStyle(QStringLiteral("windows"));
     QApplication::setPalette(classicPalette());
     // It lives as long as the process: windows may be destroyed by handlers of static objects.
-    auto* application = new QApplication(argumentCount, static_cast<char**>(arguments));
-    application->setQuitOnLastWindowClosed(false);
+    new QApplication(argumentCount, static_cast<char**>(arguments));
+    QApplication::setQuitOnLastWindowClosed(false);
     return true;
 }
 

@@ -191,7 +191,7 @@ using namespace seam;
 WORD RegisterClassA(const WNDCLASSA* windowClass) {
     const std::string name =
         windowClass->lpszClassName == nullptr ? "" : windowClass->lpszClassName;
-    if (name.empty() || windowClass->lpfnWndProc == nullptr || classes().count(name) != 0) {
+    if (name.empty() || windowClass->lpfnWndProc == nullptr || classes().contains(name)) {
         return 0;
     }
     classes()[name] = {name,
