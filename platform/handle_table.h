@@ -3,6 +3,7 @@
 
 #include "platform/types.h"
 
+#include <deque>
 #include <memory>
 #include <utility>
 #include <vector>
@@ -31,8 +32,8 @@ class HandleTable {
     DWORD add(std::unique_ptr<Object> object) {
         std::size_t slot = 0;
         if (!free_.empty()) {
-            slot = free_.back();
-            free_.pop_back();
+            slot = free_.front(); // the one that has lain longest: its old handles are the oldest
+            free_.pop_front();
         } else if (slots_.size() <= slotMask) {
             slot = slots_.size();
             slots_.emplace_back();
@@ -96,7 +97,7 @@ class HandleTable {
 
     HandleKind kind_;
     std::vector<Slot> slots_;
-    std::vector<std::size_t> free_;
+    std::deque<std::size_t> free_;
     std::size_t live_ = 0;
 };
 

@@ -6,7 +6,7 @@
 #include "platform/user/window.h"
 
 #include <QAbstractNativeEventFilter>
-#include <QCoreApplication>
+#include <QGuiApplication>
 
 #include <cstdlib>
 #include <memory>
@@ -56,6 +56,10 @@ class HostFilter : public QAbstractNativeEventFilter {
             break;
         }
         return false;
+    }
+
+    void forget(HWND child) {
+        std::erase_if(hosts_, [child](const Host& host) { return host.child == child; });
     }
 
   private:
@@ -139,8 +143,17 @@ void followHost(HWND parent, HWND child) {
     // It may have gone since we looked: the error is ours to take, not the toolkit's to print.
     const auto error = own(xcb_request_check(connection, request));
     hostFilter().follow({parent.number, static_cast<xcb_window_t>(window->native->winId()), child});
-    if (error != nullptr) {
+    SIZE size{};
+    if (error != nullptr || !foreignSize(parent, size)) {
         queuePosted({child, WM_CLOSE, 0, 0, 0});
+        return;
+    }
+    window->native->resize(size.cx, size.cy); // it may have changed before we were told of changes
+}
+
+void leaveHost(HWND child) {
+    if (qGuiApp != nullptr) {
+        hostFilter().forget(child);
     }
 }
 

@@ -20,6 +20,9 @@ bool foreignSize(HWND window, SIZE& size);
 /// a new size of `parent` becomes that of `child`.
 void followHost(HWND parent, HWND child);
 
+/// Ends that.
+void leaveHost(HWND child);
+
 /// The window with the keyboard, by the X server's word.
 HWND foreignFocus();
 

@@ -22,7 +22,8 @@ namespace seam {
 namespace {
 
 /// The X server fetches pixels from memory that it shares with us, some time after it is told to.
-/// Drawing sooner than this after a flush first waits until it has.
+/// Drawing sooner than this after a flush first waits until it has. A server that is held up for
+/// longer can show a step half drawn; asking it at each step would cost twice the wake-ups.
 constexpr std::int64_t fetchTime = 50;
 
 QRect toQt(const RECT& area) {
@@ -70,16 +71,15 @@ void NativeWindow::touch(const RECT& area) {
         store_.beginPaint(rectangle);
         store_.endPaint();
     }
-    dirty_ += rectangle;
+    dirty_ |= rectangle;
 }
 
 void NativeWindow::flush() {
     if (dirty_.isEmpty() || !isExposed()) {
         return; // the expose event that makes it visible shows all of it
     }
-    // One rectangle: a step of a sprite touches two that overlap, and each piece costs a request.
-    const QRect area = dirty_.boundingRect();
-    dirty_ = QRegion();
+    const QRect area = dirty_;
+    dirty_ = QRect();
     if (!shadow_.isNull()) {
         store_.beginPaint(area);
         QPainter(storeImage()).drawImage(area.topLeft(), shadow_, area);
@@ -99,8 +99,7 @@ void NativeWindow::resizePicture(QSize size) {
     shadow_ = QImage();
     store_.resize(size);
     const QImage* image = storeImage();
-    if (image != nullptr && image->format() != QImage::Format_RGB32 &&
-        image->format() != QImage::Format_ARGB32_Premultiplied) {
+    if (image != nullptr && image->format() != QImage::Format_RGB32) {
         shadow_ = QImage(size, QImage::Format_RGB32);
         shadow_.fill(Qt::black);
     }
@@ -122,14 +121,11 @@ bool NativeWindow::event(QEvent* event) {
 }
 
 void NativeWindow::exposeEvent(QExposeEvent* /*event*/) {
-    if (isExposed()) {
-        dirty_ = QRect(QPoint(0, 0), size());
-        flush();
-    }
+    // A paint event follows, which says what has come to light.
 }
 
 void NativeWindow::paintEvent(QPaintEvent* event) {
-    dirty_ += event->region();
+    dirty_ |= event->region().boundingRect();
     flush();
 }
 
@@ -144,11 +140,11 @@ void NativeWindow::resizeEvent(QResizeEvent* event) {
 }
 
 void NativeWindow::keyPressEvent(QKeyEvent* event) {
-    queueKey(owner_, *event, true);
+    queueKey(keyTarget(owner_), *event, true);
 }
 
 void NativeWindow::keyReleaseEvent(QKeyEvent* event) {
-    queueKey(owner_, *event, false);
+    queueKey(keyTarget(owner_), *event, false);
 }
 
 void NativeWindow::queueMouse(UINT message, const QMouseEvent& event, WPARAM wParam) {

@@ -7,7 +7,7 @@
 
 #include <QBackingStore>
 #include <QImage>
-#include <QRegion>
+#include <QRect>
 #include <QWindow>
 
 #include <cstdint>
@@ -50,7 +50,7 @@ class NativeWindow : public QWindow, public Surface {
     HWND owner_;
     QBackingStore store_;
     QImage shadow_; // the picture where the display's pixels have another form than ours
-    QRegion dirty_;
+    QRect dirty_;   // one rectangle: what a step touches overlaps, and each piece costs a request
     std::int64_t flushed_ = 0; // when the server was last told to fetch pixels
 };
 

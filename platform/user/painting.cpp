@@ -3,6 +3,8 @@
 #include "platform/harness.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
+#include "platform/user/roster.h"
+#include "platform/user/text.h"
 #include "platform/user/window.h"
 
 using namespace seam;
@@ -18,8 +20,8 @@ HDC GetDC(HWND window) {
                : makeSurfaceContext(*found->native, clientOf(*found));
 }
 
-int ReleaseDC(HWND window, HDC dc) {
-    return findWindow(window) != nullptr && DeleteDC(dc) != FALSE ? 1 : 0;
+int ReleaseDC(HWND /*window*/, HDC dc) {
+    return DeleteDC(dc) != FALSE ? 1 : 0;
 }
 
 HDC BeginPaint(HWND window, PAINTSTRUCT* paint) {
@@ -75,7 +77,11 @@ static LRESULT eraseBackground(const Window& window, HDC dc) {
 
 static LRESULT setTitle(Window& window, const char* title) {
     window.title = title == nullptr ? "" : title;
-    window.native->setTitle(QString::fromUtf8(window.title.c_str()));
+    window.native->setTitle(shownText(window.title));
+    if (!window.parent) {
+        leaveRoster(window.handle);
+        joinRoster(window);
+    }
     return TRUE;
 }
 

@@ -83,8 +83,11 @@ bool takePaint(const Filter& filter, MSG& message) {
             found = window.handle;
         }
     });
+    if (!found || !filter.takes(WM_PAINT)) {
+        return false;
+    }
     message = {found, WM_PAINT, 0, 0, messageTime()};
-    return static_cast<bool>(found) && filter.takes(WM_PAINT);
+    return true;
 }
 
 bool takeTimer(const Filter& filter, bool remove, MSG& message) {
@@ -274,7 +277,9 @@ LRESULT SendMessageA(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
 
 BOOL PostMessageA(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
     if (findWindow(window) == nullptr) {
-        return IsWindow(window); // another program's window has no queue of ours
+        const bool passedOn =
+            message == WM_CLOSE || message == WM_HELP || message == WM_CONTEXTMENU;
+        return passedOn && IsWindow(window) ? TRUE : FALSE; // it has no queue of ours
     }
     queuePosted({window, message, wParam, lParam, 0});
     return TRUE;

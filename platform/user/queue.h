@@ -5,7 +5,7 @@
 
 namespace seam {
 
-/// Queues a message behind the posted ones, or behind the input that waits. time and pt are filled
+/// Queues a message behind the posted ones, or behind the input that waits. time is filled
 /// in. Wakes whichever loop is waiting.
 void queuePosted(const MSG& message);
 void queueInput(const MSG& message);

@@ -1,5 +1,6 @@
 #include "platform/user/roster.h"
 
+#include "platform/kernel/descriptor.h"
 #include "platform/user/native_window.h"
 
 #include <QSocketNotifier>
@@ -16,28 +17,6 @@
 namespace seam {
 
 namespace {
-
-/// A file descriptor that closes itself.
-class Descriptor {
-  public:
-    explicit Descriptor(int number) : number_(number) {}
-
-    Descriptor(const Descriptor&) = delete;
-    Descriptor& operator=(const Descriptor&) = delete;
-
-    ~Descriptor() {
-        if (number_ >= 0) {
-            close(number_);
-        }
-    }
-
-    int number() const {
-        return number_;
-    }
-
-  private:
-    int number_;
-};
 
 struct Listener {
     std::unique_ptr<Descriptor> socket;
@@ -98,15 +77,16 @@ struct Visitor {
 
 void receive(int listener, HWND window) {
     const int accepted = accept4(listener, nullptr, nullptr, SOCK_CLOEXEC | SOCK_NONBLOCK);
-    if (accepted < 0) {
-        return;
+    Descriptor socket(accepted);
+    if (accepted < 0 || !isOurs(socket)) {
+        return; // another user's process is sent away at once
     }
-    auto* visitor = new Visitor{Descriptor(accepted)};
+    auto* visitor = new Visitor{std::move(socket)};
     QObject::connect(&visitor->notifier, &QSocketNotifier::activated, &visitor->notifier,
                      [visitor, window] {
                          char byte = 0;
                          const std::unique_ptr<Visitor> ended(visitor);
-                         if (isOurs(ended->socket) && read(ended->socket.number(), &byte, 1) == 1) {
+                         if (read(ended->socket.number(), &byte, 1) == 1) {
                              SetForegroundWindow(window);
                          }
                      });

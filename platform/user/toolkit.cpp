@@ -23,10 +23,12 @@ using Probe = std::unique_ptr<xcb_connection_t, decltype(&xcb_disconnect)>;
 
 Probe probeDisplay() {
     const QByteArray platform = qgetenv("QT_QPA_PLATFORM");
-    if (!platform.isEmpty() && !platform.startsWith("xcb")) {
+    if (platform.startsWith("offscreen") || platform.startsWith("minimal")) {
         return {nullptr, &xcb_disconnect};
     }
-    qputenv("QT_QPA_PLATFORM", "xcb");
+    if (!platform.startsWith("xcb")) {
+        qputenv("QT_QPA_PLATFORM", "xcb"); // the one that this program is written for
+    }
     return {xcb_connect(nullptr, nullptr), &xcb_disconnect};
 }
 
@@ -58,7 +60,10 @@ bool makeToolkit() {
     }
     // A pixel of ours is a pixel of the screen: the pictures are drawn for it.
     qputenv("QT_ENABLE_HIGHDPI_SCALING", "0");
-    qunsetenv("QT_SCALE_FACTOR");
+    for (const char* variable :
+         {"QT_SCALE_FACTOR", "QT_SCREEN_SCALE_FACTORS", "QT_USE_PHYSICAL_DPI"}) {
+        qunsetenv(variable);
+    }
     QApplication::setStyle(QStringLiteral("windows"));
     QApplication::setPalette(classicPalette());
     // It lives as long as the process: windows may be destroyed by handlers of static objects.

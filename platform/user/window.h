@@ -47,17 +47,21 @@ struct Window {
 /// The record of a window of this program; null for any other number.
 Window* findWindow(HWND window);
 
-/// Calls visit for each window of this program, in the order of their making within a slot's use.
+/// Calls visit for each window of this program, in the order of their slots.
 void forEachWindow(const std::function<void(Window&)>& visit);
 
 /// The handle of the window's top-level window.
 HWND topLevelOf(HWND window);
 
+/// Which window takes the keys that reach this one: the one that SetFocus named, if both lie in the
+/// same top-level window.
+HWND keyTarget(HWND window);
+
 /// Adds to what has to be painted; the area is clipped to the window.
 void invalidate(Window& window, RECT area, bool erase);
 
-/// The window's native size has changed: keeps the new size, asks for a full repaint where it grew
-/// and queues WM_SIZE.
+/// The window's native size has changed: keeps the new size, asks for a full repaint and posts
+/// WM_SIZE.
 void windowResized(Window& window, int width, int height);
 
 } // namespace seam

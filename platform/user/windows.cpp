@@ -9,6 +9,7 @@
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
 #include "platform/user/roster.h"
+#include "platform/user/text.h"
 #include "platform/user/timers.h"
 #include "platform/user/toolkit.h"
 
@@ -50,19 +51,20 @@ std::unique_ptr<NativeWindow> makeNative(const Window& window, DWORD exStyle) {
     }
     auto native =
         std::make_unique<NativeWindow>(window.handle, place, (exStyle & WS_EX_TOPMOST) != 0, host);
-    native->setTitle(QString::fromLatin1(window.title));
+    native->setTitle(shownText(window.title));
     return native;
 }
 
-void show(Window& window) {
-    if (window.visible || !window.native) {
+void show(HWND handle) {
+    SendMessageA(handle, WM_SHOWWINDOW, TRUE, 0);
+    Window* window = findWindow(handle); // its handler may have destroyed it
+    if (window == nullptr || window->visible) {
         return;
     }
-    SendMessageA(window.handle, WM_SHOWWINDOW, TRUE, 0);
-    window.visible = true;
-    invalidate(window, {0, 0, window.width(), window.height()}, true);
-    applyCursor(*window.native);
-    window.native->show();
+    window->visible = true;
+    invalidate(*window, {0, 0, window->width(), window->height()}, true);
+    applyCursor(*window->native);
+    window->native->show();
 }
 
 /// Everything that lies in the window or is owned by it, the innermost last.
@@ -76,6 +78,18 @@ std::vector<HWND> withChildren(HWND window) {
         });
     }
     return found;
+}
+
+/// The next one of them to be told of its end; null when all have been. A handler may have made
+/// another one.
+HWND firstNotDying(HWND window) {
+    for (const HWND one : withChildren(window)) {
+        const Window* record = findWindow(one);
+        if (record != nullptr && !record->dying) {
+            return one;
+        }
+    }
+    return {};
 }
 
 void sendSizeAndPlace(const Window& window) {
@@ -108,6 +122,7 @@ void removeWindow(HWND handle) {
         focus = {};
     }
     leaveRoster(handle);
+    leaveHost(handle);
     table().take(handle.number);
 }
 
@@ -151,7 +166,7 @@ void windowResized(Window& window, int width, int height) {
     window.place.right = window.place.left + width;
     window.place.bottom = window.place.top + height;
     invalidate(window, {0, 0, width, height}, true);
-    queueInput({window.handle, WM_SIZE, 0, static_cast<LPARAM>(MAKELONG(width, height)), 0});
+    queuePosted({window.handle, WM_SIZE, 0, static_cast<LPARAM>(MAKELONG(width, height)), 0});
 }
 
 void countUserHandles(HandleCounts& counts) {
@@ -208,7 +223,8 @@ HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DW
                      void* parameter) {
     const auto windowClass = classes().find(className == nullptr ? "" : className);
     const bool child = (style & WS_CHILD) != 0;
-    if (windowClass == classes().end() || (child && !IsWindow(parent)) || !toolkit()) {
+    if (windowClass == classes().end() ||
+        (child && findWindow(parent) == nullptr && !foreignExists(parent)) || !toolkit()) {
         return {};
     }
     auto made = std::make_unique<Window>();
@@ -236,7 +252,7 @@ HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DW
         return {};
     }
     if ((style & WS_VISIBLE) != 0) {
-        show(window);
+        show(handle);
     }
     return findWindow(handle) != nullptr ? handle : HWND{};
 }
@@ -246,15 +262,11 @@ BOOL DestroyWindow(HWND window) {
     if (found == nullptr || found->dying) {
         return FALSE;
     }
-    found->dying = true;
-    SendMessageA(window, WM_DESTROY, 0, 0);
-    std::vector<HWND> doomed = withChildren(window);
-    std::for_each(doomed.begin() + 1, doomed.end(), [](HWND child) {
-        if (Window* record = findWindow(child)) {
-            record->dying = true;
-            SendMessageA(child, WM_DESTROY, 0, 0);
-        }
-    });
+    while (HWND next = firstNotDying(window)) {
+        findWindow(next)->dying = true;
+        SendMessageA(next, WM_DESTROY, 0, 0);
+    }
+    const std::vector<HWND> doomed = withChildren(window);
     std::for_each(doomed.rbegin(), doomed.rend(), removeWindow);
     return TRUE;
 }
@@ -294,9 +306,9 @@ BOOL ShowWindow(HWND window, int command) {
         return FALSE;
     }
     const bool before = found->visible;
-    if (command != SW_HIDE) {
-        show(*found);
-    } else if (before) {
+    if (command != SW_HIDE && !before) {
+        show(window);
+    } else if (command == SW_HIDE && before) {
         found->visible = false;
         found->native->hide();
     }
@@ -308,15 +320,18 @@ BOOL MoveWindow(HWND window, int x, int y, int width, int height, BOOL repaint) 
     if (found == nullptr) {
         return FALSE;
     }
+    width = std::max(width, 1);
+    height = std::max(height, 1);
+    const bool grown = width > found->width() || height > found->height();
     const bool sized = width != found->width() || height != found->height();
     const bool moved = x != found->place.left || y != found->place.top;
-    found->place = {x, y, x + std::max(width, 1), y + std::max(height, 1)};
+    found->place = {x, y, x + width, y + height};
     const QRect place(QPoint(x, y) + originOf(*found), QSize(found->width(), found->height()));
     if (sized) {
         found->native->resizePicture(place.size());
     }
     found->native->setGeometry(place);
-    if (repaint != FALSE) {
+    if (repaint != FALSE || grown) {
         invalidate(*found, {0, 0, found->width(), found->height()}, true);
     }
     if (sized || moved) {

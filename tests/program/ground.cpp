@@ -30,6 +30,9 @@ bool waitFor(const std::function<bool()>& condition, double seconds) {
 Process::Process(const std::vector<std::string>& command,
                  const std::map<std::string, std::string>& set, const fs::path& directory) {
     pid_ = fork();
+    if (pid_ < 0) {
+        throw std::runtime_error("no process can be made");
+    }
     if (pid_ != 0) {
         return;
     }

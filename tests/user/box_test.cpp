@@ -94,20 +94,23 @@ TEST_F(Boxes, TimersAndPaintsGoOnBehindThem) {
 }
 
 TEST_F(Boxes, RunTheirOwnLoopWithinAHandlerAndGoOnAfterIt) {
-    // A box in a timer's handler, a loop of the program's within the box, then the box again.
+    // A loop of the program's within the box's own, ended by a timer; then the box goes on.
     constexpr UINT innerMessage = 0x8001;
     int after = 0;
     handlers[WM_TIMER] = [&](HWND, WPARAM timer, LPARAM) {
+        KillTimer(window, 1);
         if (timer == 1) {
             PostMessageA(window, innerMessage, 0, 0);
+        } else if (timer == 3) {
+            KillTimer(window, 3);
+            PostQuitMessage(0);
         } else if (++after == 3) {
             whenUp([](QMessageBox& box) { press(box, Qt::Key_Return); });
         }
-        KillTimer(window, 1);
         return LRESULT{0};
     };
     handlers[innerMessage] = [&](HWND, WPARAM, LPARAM) {
-        PostQuitMessage(0);
+        SetTimer(window, 3, 1, nullptr);
         MSG inner{};
         while (GetMessageA(&inner, nullptr, 0, 0)) {
             DispatchMessageA(&inner);

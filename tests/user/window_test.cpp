@@ -1,6 +1,10 @@
 // Windows: their making and end, their picture, painting, and handles that have gone stale.
 #include "tests/user/test_window.h"
 
+#include <QGuiApplication>
+#include <QKeyEvent>
+#include <QWindow>
+
 #include <gtest/gtest.h>
 
 namespace {
@@ -22,6 +26,7 @@ class Windows : public testing::Test {
         MSG message{};
         while (PeekMessageA(&message, nullptr, 0, 0, PM_REMOVE)) {
         }
+        seam::useSystemClock();
     }
 
     static DWORD pixel(HWND window, int x, int y) {
@@ -64,6 +69,49 @@ TEST_F(Windows, RefusedCreationLeavesNothing) {
     EXPECT_FALSE(CreateWindowExA(0, "NoSuchClass", "", WS_POPUP, 0, 0, 9, 9, nullptr, nullptr,
                                  nullptr, nullptr));
     EXPECT_FALSE(test::makeWindow(9, 9, WS_CHILD, HWND{12345})) << "no such window off X11";
+}
+
+TEST_F(Windows, AWindowMayGoWhileItIsShown) {
+    handlers[WM_SHOWWINDOW] = [](HWND window, WPARAM, LPARAM) {
+        DestroyWindow(window);
+        return LRESULT{0};
+    };
+    EXPECT_FALSE(test::makeWindow());
+    const HWND hidden = test::makeWindow(10, 10, WS_POPUP);
+    EXPECT_FALSE(ShowWindow(hidden, SW_SHOWNORMAL));
+    EXPECT_FALSE(IsWindow(hidden));
+}
+
+TEST_F(Windows, EachIsToldOfItsEndOnceWhateverItDoesThen) {
+    const HWND parent = test::makeWindow();
+    const HWND child = test::makeWindow(10, 10, WS_CHILD, parent);
+    HWND late;
+    std::vector<HWND> destroyed;
+    handlers[WM_DESTROY] = [&](HWND window, WPARAM, LPARAM) {
+        destroyed.push_back(window);
+        if (window == child) {
+            DestroyWindow(parent);
+            late = test::makeWindow(5, 5, WS_CHILD, parent);
+        }
+        return LRESULT{0};
+    };
+    DestroyWindow(parent);
+    EXPECT_EQ(destroyed, (std::vector<HWND>{parent, child, late}));
+    EXPECT_FALSE(IsWindow(late));
+}
+
+TEST_F(Windows, KeysGoToTheWindowThatHasTheFocus) {
+    const HWND parent = test::makeWindow();
+    const HWND child = test::makeWindow(10, 10, WS_CHILD | WS_VISIBLE, parent);
+    test::handleWaiting();
+    SetFocus(child);
+    QKeyEvent event(QEvent::KeyPress, Qt::Key_A, Qt::NoModifier);
+    QCoreApplication::sendEvent(QGuiApplication::topLevelWindows().constLast(), &event);
+    MSG message{};
+    ASSERT_TRUE(PeekMessageA(&message, nullptr, WM_KEYDOWN, WM_KEYDOWN, PM_REMOVE));
+    EXPECT_EQ(message.hwnd, child);
+    DestroyWindow(parent);
+    EXPECT_FALSE(SetFocus(nullptr)) << "it went with the window";
 }
 
 TEST_F(Windows, DestroyingTakesTheChildrenAlong) {
@@ -127,7 +175,7 @@ TEST_F(Windows, DrawingShowsAtOnceAndAPaintIsClippedToItsArea) {
     EXPECT_EQ(pixel(window, 0, 0), 0xFF0000U) << "outside any paint, at once";
     DestroyWindow(window);
     FillRect(dc, &all, red); // the window's picture has gone: nothing is drawn, nothing breaks
-    EXPECT_TRUE(DeleteDC(dc));
+    EXPECT_TRUE(ReleaseDC(window, dc)) << "also once the window has gone";
     DeleteObject(red);
 }
 
@@ -143,6 +191,9 @@ TEST_F(Windows, ResizingKeepsThePictureAndPaintsAnew) {
     EXPECT_EQ(pixel(window, 1, 1), 0U);
     ASSERT_EQ(test::seenAmong({WM_SIZE}).size(), 1U);
     EXPECT_EQ(seen.front().lParam, 60 | (20 << 16));
+    test::handleWaiting();
+    EXPECT_EQ(test::seenAmong({WM_PAINT}).size(), 1U);
+    EXPECT_EQ(pixel(window, 59, 19), 0xC0C0C0U);
     DestroyWindow(window);
 }
 
@@ -158,11 +209,22 @@ TEST_F(Windows, AreFoundByClassAndTitleAndCloseByDefault) {
 }
 
 TEST_F(Windows, PointerHidesByCountOrByShape) {
+    const HWND window = test::makeWindow();
+    const auto shape = [] {
+        return QGuiApplication::topLevelWindows().constLast()->cursor().shape();
+    };
     EXPECT_EQ(ShowCursor(FALSE), -1);
+    EXPECT_EQ(shape(), Qt::BlankCursor);
     EXPECT_EQ(ShowCursor(TRUE), 0);
+    EXPECT_EQ(shape(), Qt::ArrowCursor);
     const HCURSOR wait = LoadCursorA(nullptr, IDC_WAIT);
     const HCURSOR old = SetCursor(wait);
+    EXPECT_EQ(shape(), Qt::WaitCursor);
+    SetCursor(nullptr);
+    EXPECT_EQ(shape(), Qt::BlankCursor);
+    SetCursor(wait);
     EXPECT_EQ(SetCursor(old), wait);
+    DestroyWindow(window);
 }
 
 } // namespace
