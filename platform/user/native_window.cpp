@@ -99,7 +99,9 @@ void NativeWindow::resizePicture(QSize size) {
     shadow_ = QImage();
     store_.resize(size);
     const QImage* image = storeImage();
-    if (image != nullptr && image->format() != QImage::Format_RGB32) {
+    // The store of a window without alpha has either form, and clears neither.
+    if (image != nullptr && image->format() != QImage::Format_RGB32 &&
+        (image->format() != QImage::Format_ARGB32_Premultiplied || requestedFormat().hasAlpha())) {
         shadow_ = QImage(size, QImage::Format_RGB32);
         shadow_.fill(Qt::black);
     }
