@@ -213,8 +213,28 @@ void Ground::destroyWindow(xcb_window_t window) const {
     xcb_flush(connection_);
 }
 
-void Ground::press(const std::string& key) const {
-    Process({"xdotool", "key", key}, environment(), root_).exitCode();
+void Ground::resizeWindow(xcb_window_t window, int width, int height) const {
+    const std::uint32_t size[] = {static_cast<std::uint32_t>(width),
+                                  static_cast<std::uint32_t>(height)};
+    xcb_configure_window(connection_, window, XCB_CONFIG_WINDOW_WIDTH | XCB_CONFIG_WINDOW_HEIGHT,
+                         static_cast<const std::uint32_t*>(size));
+    xcb_flush(connection_);
+}
+
+xcb_window_t Ground::childOf(xcb_window_t window) const {
+    const std::unique_ptr<xcb_query_tree_reply_t, decltype(&std::free)> tree(
+        xcb_query_tree_reply(connection_, xcb_query_tree(connection_, window), nullptr),
+        &std::free);
+    return tree == nullptr || tree->children_len == 0 ? 0 : *xcb_query_tree_children(tree.get());
+}
+
+void Ground::press(const std::string& key, xcb_window_t window) const {
+    std::vector<std::string> command{"xdotool", "key"};
+    if (window != 0) {
+        command.insert(command.end(), {"--window", std::to_string(window)});
+    }
+    command.push_back(key);
+    Process(command, environment(), root_).exitCode();
 }
 
 std::string Ground::settings() const {

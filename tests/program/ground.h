@@ -69,8 +69,13 @@ class Ground {
     xcb_window_t makeWindow(int width, int height) const;
     void destroyWindow(xcb_window_t window) const;
 
-    /// Presses and releases a key, by its X name.
-    void press(const std::string& key) const;
+    void resizeWindow(xcb_window_t window, int width, int height) const;
+
+    /// The window that lies in a window of ours; 0 if none does.
+    xcb_window_t childOf(xcb_window_t window) const;
+
+    /// Presses and releases a key, by its X name; where the keyboard is, or in a window.
+    void press(const std::string& key, xcb_window_t window = 0) const;
 
     /// The settings file's text; empty while there is none.
     std::string settings() const;
