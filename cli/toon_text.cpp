@@ -1,10 +1,9 @@
 #include "cli/toon_text.h"
 
-#include "platform/gdi/encoding.h"
+#include "platform/codepage.h"
 #include "toon/toon_document.h"
 
-#include <QString>
-
+#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cstring>
@@ -58,74 +57,72 @@ ToonHeader NewHeader() {
 // ---- Texts and numbers
 // ---------------------------------------------------------------------------
 
+/// Whether a byte can't stand for itself in a text: control characters and the holes of the set.
+bool isUnprintable(char byte) {
+    constexpr std::string_view holes = "\x7F\x81\x8D\x8F\x90\x9D";
+    return static_cast<unsigned char>(byte) < 0x20 || holes.find(byte) != std::string_view::npos;
+}
+
 /// The bytes in quotes, as UTF-8, with \r, \", \\ and \xNN for what can't stand as it is.
 std::string Quoted(std::string_view bytes) {
     std::string result = "\"";
     for (const char byte : bytes) {
-        const QString character = seam::fromWindows1252(&byte, 1);
-        const char16_t code = character.at(0).unicode();
         if (byte == '\r') {
             result += "\\r";
         } else if (byte == '"' || byte == '\\') {
             result += {'\\', byte};
-        } else if (code < 0x20 || (code >= 0x7F && code < 0xA0)) {
+        } else if (isUnprintable(byte)) {
             constexpr std::string_view digits = "0123456789ABCDEF";
             const auto value = static_cast<unsigned char>(byte);
             result += {'\\', 'x', digits[value / 16U], digits[value % 16U]};
         } else {
-            result += character.toStdString();
+            result += byte;
         }
     }
-    return result + '"';
-}
-
-/// The byte of a character in Windows-1252, or none.
-std::optional<char> ByteOf(QChar character) {
-    for (int value = 0; value < 256; ++value) {
-        const char byte = static_cast<char>(value);
-        if (seam::fromWindows1252(&byte, 1).at(0) == character) {
-            return byte;
-        }
-    }
-    return std::nullopt;
+    return seam::utf8FromWindows1252(result + '"');
 }
 
 /// Takes the escape behind a backslash off the front of `rest`; none if there is no such escape.
-std::optional<char> TakeEscape(QStringView& rest) {
-    if (rest.startsWith(u'x')) {
-        bool valid = false;
-        const uint value = rest.mid(1, 2).toUInt(&valid, 16);
-        if (!valid || rest.size() < 3) {
+std::optional<char> TakeEscape(std::string_view& rest) {
+    constexpr std::size_t hexadecimal = 3; // x and two digits
+    if (rest.starts_with('x')) {
+        unsigned value = 0;
+        const char* digits = rest.data() + 1;
+        const char* end = rest.data() + std::min(rest.size(), hexadecimal);
+        if (rest.size() < hexadecimal || std::from_chars(digits, end, value, 16).ptr != end) {
             return std::nullopt;
         }
-        rest = rest.mid(3);
+        rest.remove_prefix(hexadecimal);
         return static_cast<char>(value);
     }
-    if (rest.isEmpty() || !QStringView(u"r\"\\").contains(rest.front())) {
+    if (rest.empty() || std::string_view("r\"\\").find(rest.front()) == std::string_view::npos) {
         return std::nullopt;
     }
-    const char byte = rest.front() == u'r' ? '\r' : static_cast<char>(rest.front().unicode());
-    rest = rest.mid(1);
+    const char byte = rest.front() == 'r' ? '\r' : rest.front();
+    rest.remove_prefix(1);
     return byte;
 }
 
 /// The bytes of a text in quotes; none, and what is wrong in `error`, if it isn't one.
 std::optional<std::string> Unquoted(std::string_view word, std::string& error) {
-    const QString text = QString::fromUtf8(word.data(), static_cast<qsizetype>(word.size()));
-    QStringView rest(text);
-    std::string result;
-    error = "a text stands in quotes";
-    if (!rest.startsWith(u'"')) {
+    const std::optional<std::string> text = seam::windows1252FromUtf8(word);
+    if (!text) {
+        error = "a character that Windows-1252 hasn't got";
         return std::nullopt;
     }
-    rest = rest.mid(1);
-    while (!rest.isEmpty() && rest.front() != u'"') {
-        const QChar character = rest.front();
-        rest = rest.mid(1);
-        const std::optional<char> byte = character == u'\\' ? TakeEscape(rest) : ByteOf(character);
+    error = "a text stands in quotes";
+    std::string_view rest = *text;
+    if (!rest.starts_with('"')) {
+        return std::nullopt;
+    }
+    rest.remove_prefix(1);
+    std::string result;
+    while (!rest.empty() && rest.front() != '"') {
+        const char character = rest.front();
+        rest.remove_prefix(1);
+        const std::optional<char> byte = character == '\\' ? TakeEscape(rest) : character;
         if (!byte) {
-            error = character == u'\\' ? "only \\r, \\\", \\\\ and \\xNN stand for something else"
-                                       : "a character that Windows-1252 hasn't got";
+            error = "only \\r, \\\", \\\\ and \\xNN stand for something else";
             return std::nullopt;
         }
         result += *byte;

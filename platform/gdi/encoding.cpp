@@ -1,5 +1,10 @@
 #include "platform/gdi/encoding.h"
 
+#include "platform/codepage.h"
+
+#include <QStringDecoder>
+
+#include <algorithm>
 #include <array>
 
 namespace seam {
@@ -12,6 +17,17 @@ constexpr std::array<char16_t, 32> upperControls{
     0x2039, 0x0152, 0x008D, 0x017D, 0x008F, 0x0090, 0x2018, 0x2019, 0x201C, 0x201D, 0x2022,
     0x2013, 0x2014, 0x02DC, 0x2122, 0x0161, 0x203A, 0x0153, 0x009D, 0x017E, 0x0178};
 
+/// The byte that stands for a character; nothing if none does.
+std::optional<char> byteOf(QChar character) {
+    const char16_t code = character.unicode();
+    const auto* upper = std::find(upperControls.begin(), upperControls.end(), code);
+    if (upper != upperControls.end()) {
+        return static_cast<char>(0x80 + (upper - upperControls.begin()));
+    }
+    const bool same = code < 0x80 || (code >= 0xA0 && code < 0x100);
+    return same ? std::optional(static_cast<char>(code)) : std::nullopt;
+}
+
 } // namespace
 
 QString fromWindows1252(const char* text, std::size_t length) {
@@ -21,6 +37,28 @@ QString fromWindows1252(const char* text, std::size_t length) {
         if (code >= 0x80 && code < 0xA0) {
             character = QChar(upperControls[code - 0x80U]);
         }
+    }
+    return result;
+}
+
+std::string utf8FromWindows1252(std::string_view text) {
+    return fromWindows1252(text.data(), text.size()).toStdString();
+}
+
+std::optional<std::string> windows1252FromUtf8(std::string_view text) {
+    QStringDecoder decode(QStringDecoder::Utf8, QStringConverter::Flag::Stateless);
+    const QString characters =
+        decode(QByteArrayView(text.data(), static_cast<qsizetype>(text.size())));
+    if (decode.hasError()) {
+        return std::nullopt;
+    }
+    std::string result;
+    for (const QChar character : characters) {
+        const std::optional<char> byte = byteOf(character);
+        if (!byte) {
+            return std::nullopt;
+        }
+        result += *byte;
     }
     return result;
 }
