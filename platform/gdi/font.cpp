@@ -52,11 +52,6 @@ int Font::weight() const {
     return weight_ >= boldFrom ? boldWeight : normalWeight;
 }
 
-const QFont* toolkitFont(HFONT font) {
-    const Font* const found = findObjectAs<Font>(font);
-    return found == nullptr ? nullptr : &found->face().font;
-}
-
 } // namespace seam
 
 using namespace seam;

@@ -32,7 +32,4 @@ class Font {
     mutable std::unique_ptr<FontFace> face_;
 };
 
-/// For the toolkit's own widgets; null if there is no such font. Good until it is deleted.
-const QFont* toolkitFont(HFONT font);
-
 } // namespace seam

@@ -4,6 +4,7 @@
 #include "platform/user/clock.h"
 #include "platform/user/keys.h"
 #include "platform/user/queue.h"
+#include "platform/user/toolkit.h"
 #include "platform/user/window.h"
 
 #include <QExposeEvent>
@@ -167,7 +168,7 @@ void NativeWindow::mouseReleaseEvent(QMouseEvent* event) {
 }
 
 void NativeWindow::wheelEvent(QWheelEvent* event) {
-    const QPoint at = event->globalPosition().toPoint();
+    const QPoint at = event->globalPosition().toPoint() - screenOrigin();
     queueInput({owner_, WM_MOUSEWHEEL, static_cast<WPARAM>(MAKELONG(0, event->angleDelta().y())),
                 static_cast<LPARAM>(MAKELONG(at.x(), at.y())), 0});
 }

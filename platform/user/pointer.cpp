@@ -72,7 +72,7 @@ BOOL GetCursorPos(POINT* point) {
     if (!toolkit()) {
         return FALSE;
     }
-    const QPoint at = QCursor::pos();
+    const QPoint at = QCursor::pos() - screenOrigin();
     *point = {at.x(), at.y()};
     return TRUE;
 }
@@ -81,7 +81,7 @@ BOOL SetCursorPos(int x, int y) {
     if (!toolkit()) {
         return FALSE;
     }
-    QCursor::setPos(x, y);
+    QCursor::setPos(QPoint(x, y) + screenOrigin());
     return TRUE;
 }
 

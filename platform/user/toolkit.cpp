@@ -2,6 +2,7 @@
 
 #include <QApplication>
 #include <QPalette>
+#include <QScreen>
 #include <QStyleFactory>
 
 #include <cstdio>
@@ -77,6 +78,10 @@ bool makeToolkit() {
 bool toolkit() {
     static const bool made = QCoreApplication::instance() != nullptr || makeToolkit();
     return made;
+}
+
+QPoint screenOrigin() {
+    return QGuiApplication::primaryScreen()->geometry().topLeft();
 }
 
 xcb_connection_t* xConnection() {

@@ -1,6 +1,8 @@
 // The toolkit's application object, made when the first window, screen or text needs it.
 #pragma once
 
+#include <QPoint>
+
 struct xcb_connection_t;
 
 namespace seam {
@@ -11,5 +13,8 @@ bool toolkit();
 
 /// The connection to the X server; null on any other platform of the toolkit.
 xcb_connection_t* xConnection();
+
+/// The primary monitor's corner on the desktop: positions on the screen count from it.
+QPoint screenOrigin();
 
 } // namespace seam

@@ -13,9 +13,6 @@
 #include "platform/user/timers.h"
 #include "platform/user/toolkit.h"
 
-#include <QGuiApplication>
-#include <QScreen>
-
 #include <algorithm>
 #include <map>
 #include <vector>
@@ -36,9 +33,8 @@ std::map<std::string, WindowClass>& classes() {
 
 HWND focus;
 
-/// Top-level windows are placed from the primary monitor's corner, which need not be the desktop's.
 QPoint originOf(const Window& window) {
-    return window.parent ? QPoint() : QGuiApplication::primaryScreen()->geometry().topLeft();
+    return window.parent ? QPoint() : screenOrigin();
 }
 
 std::unique_ptr<NativeWindow> makeNative(const Window& window, DWORD exStyle) {
