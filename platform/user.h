@@ -22,8 +22,9 @@ constexpr UINT WM_PAINT = 0x000F;
 constexpr UINT WM_CLOSE = 0x0010;
 constexpr UINT WM_QUIT = 0x0012;
 constexpr UINT WM_ERASEBKGND = 0x0014;
+constexpr UINT WM_ENDSESSION = 0x0016; // sent before the system ends the process
 constexpr UINT WM_SHOWWINDOW = 0x0018;
-constexpr UINT WM_ACTIVATEAPP = 0x001C;
+constexpr UINT WM_ACTIVATEAPP = 0x001C; // wParam 0: another program has the keyboard now
 constexpr UINT WM_SETCURSOR = 0x0020;
 constexpr UINT WM_HELP = 0x0053;
 constexpr UINT WM_CONTEXTMENU = 0x007B;
@@ -43,6 +44,12 @@ constexpr UINT WM_RBUTTONUP = 0x0205;
 constexpr UINT WM_MBUTTONDOWN = 0x0207;
 constexpr UINT WM_MBUTTONUP = 0x0208;
 constexpr UINT WM_MOUSEWHEEL = 0x020A;
+
+// What WM_SYSCOMMAND asks for.
+constexpr WPARAM SC_NEXTWINDOW = 0xF040;
+constexpr WPARAM SC_PREVWINDOW = 0xF050;
+constexpr WPARAM SC_CLOSE = 0xF060;
+constexpr WPARAM SC_SCREENSAVE = 0xF140;
 
 struct MSG {
     HWND hwnd;
@@ -75,8 +82,9 @@ LRESULT DispatchMessageA(const MSG* message);
 /// Runs the window's procedure on this stack and gives its result.
 LRESULT SendMessageA(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
 
-/// Queues a message behind those that wait. To the window of another program only WM_CLOSE,
-/// WM_HELP and WM_CONTEXTMENU are taken, and they do nothing there.
+/// Queues a message behind those that wait. A WM_CLOSE is not queued behind one that waits for the
+/// same window; while a box is up it waits for the answer. To the window of another program only
+/// WM_CLOSE, WM_HELP and WM_CONTEXTMENU are taken, and they do nothing there.
 BOOL PostMessageA(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
 
 /// Asks the innermost loop to end: GetMessageA gives 0 once the posted messages are through.
@@ -135,7 +143,9 @@ struct CREATESTRUCTA {
 
 /// Makes a window and runs its WM_CREATE, WM_SIZE and WM_MOVE before it returns, and shows it if
 /// WS_VISIBLE stands. With WS_CHILD it lies in `parent`, a window of this program or, by its id,
-/// of another. Null if the class is unknown, the parent is no window, WM_CREATE gave -1, or there
+/// of another. A WS_EX_TOPMOST window that fills the primary monitor goes on filling it when that
+/// changes, stays above windows that appear later, and turns the other monitors black; input there
+/// is input to it. Null if the class is unknown, the parent is no window, WM_CREATE gave -1, or there
 /// is no display.
 HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DWORD style, int x,
                      int y, int width, int height, HWND parent, HMENU menu, HINSTANCE instance,
@@ -145,8 +155,10 @@ HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DW
 /// for them.
 BOOL DestroyWindow(HWND window);
 
-/// The platform's own answer: WM_CLOSE destroys the window, WM_PAINT validates it, WM_ERASEBKGND
-/// fills with the class's brush, WM_SETCURSOR sets the class's cursor, WM_SETTEXT the title.
+/// The platform's own answer: WM_CLOSE destroys the window and so does WM_ENDSESSION, which the
+/// signals that ask a process to end bring; the SC_CLOSE of WM_SYSCOMMAND sends WM_CLOSE. WM_PAINT
+/// validates, WM_ERASEBKGND fills with the class's brush, WM_SETCURSOR sets the class's cursor,
+/// WM_SETTEXT the title.
 LRESULT DefWindowProcA(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
 
 BOOL IsWindow(HWND window); ///< also true of a window of another program on the same display
@@ -258,7 +270,7 @@ constexpr int IDYES = 6;
 constexpr int IDNO = 7;
 
 /// Shows a box over `owner` and waits for its answer; the owner takes no input meanwhile, timers
-/// and paints go on. A null caption is the platform's "Error". Bytes that are valid UTF-8, as in
+/// and paints go on, and the pointer shows. A null caption is the platform's "Error". Bytes that are valid UTF-8, as in
 /// names of files, are shown as that. 0 if it can't be shown.
 int MessageBoxA(HWND owner, const char* text, const char* caption, UINT type);
 

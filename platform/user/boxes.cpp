@@ -2,6 +2,8 @@
 #include "platform/harness.h"
 #include "platform/kernel.h"
 #include "platform/trace.h"
+#include "platform/user/cursors.h"
+#include "platform/user/grabs.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
 #include "platform/user/text.h"
@@ -56,6 +58,7 @@ class Box : public QMessageBox {
 
     void setVisible(bool visible) override {
         if (!visible && isVisible()) {
+            giveBack(*windowHandle());
             SetForegroundWindow(owner_);
         }
         QMessageBox::setVisible(visible);
@@ -73,6 +76,7 @@ class Box : public QMessageBox {
 
   private:
     HWND owner_;
+    BoxPointer pointer_;
 };
 
 /// Puts the box over its owner. A window that stays above all others, out of the window manager's
@@ -128,10 +132,14 @@ int MessageBoxA(HWND owner, const char* text, const char* caption, UINT type) {
     box->setWindowModality(Qt::ApplicationModal);
     const Window* over = findWindow(topLevelOf(owner));
     placeOver(*box, over == nullptr ? nullptr : over->native.get());
+    box->winId(); // makes its window
+    bringForward(*box->windowHandle());
     box->show();
     box->activateWindow();
     wakeToolkitLoop();
-    return answerOf(box->exec(), asks);
+    const int answer = answerOf(box->exec(), asks);
+    rethrowFromToolkitLoop();
+    return answer;
 }
 
 BOOL MessageBeep(UINT /*type*/) {

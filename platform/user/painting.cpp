@@ -92,8 +92,11 @@ LRESULT DefWindowProcA(HWND window, UINT message, WPARAM wParam, LPARAM lParam) 
     }
     switch (message) {
     case WM_CLOSE:
+    case WM_ENDSESSION:
         DestroyWindow(window);
         return 0;
+    case WM_SYSCOMMAND:
+        return wParam == SC_CLOSE ? SendMessageA(window, WM_CLOSE, 0, 0) : 0;
     case WM_PAINT: {
         PAINTSTRUCT paint{};
         BeginPaint(window, &paint);

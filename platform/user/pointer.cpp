@@ -2,6 +2,7 @@
 #include "platform/user.h"
 #include "platform/user/cursors.h"
 #include "platform/user/native_window.h"
+#include "platform/user/screens.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
 
@@ -15,8 +16,12 @@ namespace {
 
 HCURSOR current{IDC_ARROW.number};
 int displayCount = 0;
+int boxes = 0; // how many are up
 
 Qt::CursorShape shapeInForce() {
+    if (boxes > 0) {
+        return Qt::ArrowCursor;
+    }
     if (!current || displayCount < 0) {
         return Qt::BlankCursor;
     }
@@ -29,15 +34,28 @@ void applyToAll() {
             applyCursor(*window.native);
         }
     });
+    if (QWindow* cover = screenCover()) {
+        applyCursor(*cover);
+    }
 }
 
 } // namespace
 
-void applyCursor(NativeWindow& window) {
+void applyCursor(QWindow& window) {
     const Qt::CursorShape shape = shapeInForce();
     if (window.cursor().shape() != shape) {
         window.setCursor(shape);
     }
+}
+
+BoxPointer::BoxPointer() {
+    ++boxes;
+    applyToAll();
+}
+
+BoxPointer::~BoxPointer() {
+    --boxes;
+    applyToAll();
 }
 
 } // namespace seam

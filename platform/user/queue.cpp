@@ -2,18 +2,21 @@
 
 #include "platform/harness.h"
 #include "platform/user/clock.h"
+#include "platform/user/ending.h"
 #include "platform/user/native_window.h"
 #include "platform/user/timers.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/waker.h"
 #include "platform/user/window.h"
 
-#include <QCoreApplication>
+#include <QApplication>
 #include <QThread>
 
 #include <chrono>
 #include <deque>
+#include <exception>
 #include <thread>
+#include <utility>
 
 namespace seam {
 
@@ -27,6 +30,9 @@ int quitCode = 0;
 /// How many loops of the toolkit ran when one of the program's own last took a message.
 int ownLevel = 0;
 
+/// What a handler threw within a loop of the toolkit's.
+std::exception_ptr thrown;
+
 /// How many messages are handled at one go while a loop of the toolkit is innermost.
 constexpr int batch = 32;
 
@@ -35,13 +41,15 @@ struct Filter {
     HWND window;
     UINT lowest = 0;
     UINT highest = 0;
+    UINT except = 0; // a message that is left where it is
 
     bool takes(UINT message) const {
         return (lowest == 0 && highest == 0) || (message >= lowest && message <= highest);
     }
 
     bool takes(const MSG& message) const {
-        return (!window || message.hwnd == window) && takes(message.message);
+        return (!window || message.hwnd == window) && takes(message.message) &&
+               (except == 0 || message.message != except);
     }
 };
 
@@ -130,14 +138,37 @@ void waitForMore() {
 }
 
 /// What the toolkit's own loop can't do for us: posted messages, paints and timers. Input waits
-/// until the box has been answered.
+/// until the box has been answered, and so does a request to close what lies under it.
 bool takeWithinToolkitLoop(MSG& message) {
     const Filter all;
-    return takeFrom(posted, all, true, message) || takePaint(all, message) ||
+    Filter withoutClose;
+    withoutClose.except = QApplication::activeModalWidget() != nullptr ? WM_CLOSE : 0;
+    return takeFrom(posted, withoutClose, true, message) || takePaint(all, message) ||
            takeTimer(all, true, message);
 }
 
+/// Whether a message of this kind waits for the window.
+bool waits(HWND window, UINT message) {
+    MSG found{};
+    return takeFrom(posted, {window, message, message}, false, found);
+}
+
+/// The toolkit's loops can't pass an exception on: it is kept until the loop has ended.
+void dispatchWithinToolkitLoop(const MSG& message) {
+    try {
+        DispatchMessageA(&message);
+    } catch (...) {
+        thrown = std::current_exception();
+    }
+}
+
 } // namespace
+
+void rethrowFromToolkitLoop() {
+    if (thrown) {
+        std::rethrow_exception(std::exchange(thrown, nullptr));
+    }
+}
 
 bool toolkitLoopIsInnermost() {
     return QCoreApplication::instance() != nullptr && toolkitLevel() > ownLevel;
@@ -150,13 +181,13 @@ void drainWithinToolkitLoop() {
     const int level = ownLevel; // a handler may run a loop of the program's, which sets it
     MSG message{};
     int handled = 0;
-    while (handled < batch && takeWithinToolkitLoop(message)) {
-        DispatchMessageA(&message);
+    while (handled < batch && !thrown && takeWithinToolkitLoop(message)) {
+        dispatchWithinToolkitLoop(message);
         ownLevel = level;
         ++handled;
     }
     flushWindows();
-    if (quitAsked) {
+    if (quitAsked || thrown) {
         rejectToolkitModal();
     }
     auto deadline = nextDeadline();
@@ -167,6 +198,9 @@ void drainWithinToolkitLoop() {
 }
 
 void queuePosted(const MSG& message) {
+    if (message.message == WM_CLOSE && waits(message.hwnd, WM_CLOSE)) {
+        return; // a window closes once
+    }
     posted.push_back(message);
     posted.back().time = messageTime();
     wake();
@@ -230,6 +264,7 @@ BOOL GetMessageA(MSG* message, HWND window, UINT lowest, UINT highest) {
     if (message == nullptr || window || lowest != 0 || highest != 0 || !toolkit()) {
         return FALSE;
     }
+    endWindowsAtExit();
     for (;;) {
         pump();
         if (take({}, true, *message)) {

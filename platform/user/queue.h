@@ -6,7 +6,7 @@
 namespace seam {
 
 /// Queues a message behind the posted ones, or behind the input that waits. time is filled
-/// in. Wakes whichever loop is waiting.
+/// in. Wakes whichever loop is waiting. A posted WM_CLOSE isn't queued behind one that waits.
 void queuePosted(const MSG& message);
 void queueInput(const MSG& message);
 
@@ -18,6 +18,9 @@ void wake();
 
 /// Shows what has been drawn on any window.
 void flushWindows();
+
+/// Throws what a handler threw while the toolkit's loop, now ended, was innermost.
+void rethrowFromToolkitLoop();
 
 /// Whether the innermost running loop is one of the toolkit's: a message box's.
 bool toolkitLoopIsInnermost();

@@ -1,5 +1,9 @@
 #include "platform/user/toolkit.h"
 
+#include "platform/user/ending.h"
+#include "platform/user/queue.h"
+#include "platform/user/window.h"
+
 #include <QApplication>
 #include <QPalette>
 #include <QScreen>
@@ -53,6 +57,16 @@ QPalette classicPalette() {
     return palette;
 }
 
+/// Another program has got the keyboard, or this one has it again.
+void tellOfActivation(Qt::ApplicationState state) {
+    const WPARAM active = state == Qt::ApplicationActive ? TRUE : FALSE;
+    forEachWindow([&](const Window& window) {
+        if (!window.parent && window.visible) {
+            queueInput({window.handle, WM_ACTIVATEAPP, active, 0, 0});
+        }
+    });
+}
+
 bool makeToolkit() {
     const Probe probe = probeDisplay();
     if (probe != nullptr && xcb_connection_has_error(probe.get()) != 0) {
@@ -70,6 +84,8 @@ bool makeToolkit() {
     // It lives as long as the process: windows may be destroyed by handlers of static objects.
     new QApplication(argumentCount, static_cast<char**>(arguments));
     QApplication::setQuitOnLastWindowClosed(false);
+    QObject::connect(qGuiApp, &QGuiApplication::applicationStateChanged, tellOfActivation);
+    catchSignals();
     return true;
 }
 

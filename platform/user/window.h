@@ -26,6 +26,7 @@ struct Window {
     WindowClass* windowClass = nullptr;
     HWND parent; // of a child; may be another program's window
     DWORD style = 0;
+    bool topmost = false;
     std::string title;
     RECT place{0, 0, 0, 0}; // in the parent, or on the screen
     bool visible = false;

@@ -9,6 +9,7 @@
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
 #include "platform/user/roster.h"
+#include "platform/user/screens.h"
 #include "platform/user/text.h"
 #include "platform/user/timers.h"
 #include "platform/user/toolkit.h"
@@ -37,7 +38,7 @@ QPoint originOf(const Window& window) {
     return window.parent ? QPoint() : screenOrigin();
 }
 
-std::unique_ptr<NativeWindow> makeNative(const Window& window, DWORD exStyle) {
+std::unique_ptr<NativeWindow> makeNative(const Window& window) {
     const Window* parent = findWindow(window.parent);
     const QRect place(QPoint(window.place.left, window.place.top) + originOf(window),
                       QSize(window.width(), window.height()));
@@ -45,8 +46,7 @@ std::unique_ptr<NativeWindow> makeNative(const Window& window, DWORD exStyle) {
     if (parent == nullptr && window.parent) {
         host = QWindow::fromWinId(window.parent.number);
     }
-    auto native =
-        std::make_unique<NativeWindow>(window.handle, place, (exStyle & WS_EX_TOPMOST) != 0, host);
+    auto native = std::make_unique<NativeWindow>(window.handle, place, window.topmost, host);
     native->setTitle(shownText(window.title));
     return native;
 }
@@ -60,6 +60,9 @@ void show(HWND handle) {
     window->visible = true;
     invalidate(*window, {0, 0, window->width(), window->height()}, true);
     applyCursor(*window->native);
+    if (fillsScreen(*window)) {
+        takeScreens(*window);
+    }
     window->native->show();
 }
 
@@ -119,6 +122,7 @@ void removeWindow(HWND handle) {
     }
     leaveRoster(handle);
     leaveHost(handle);
+    leaveScreens(handle);
     table().take(handle.number);
 }
 
@@ -228,6 +232,7 @@ HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DW
     window.windowClass = &windowClass->second;
     window.parent = child ? parent : HWND{};
     window.style = style;
+    window.topmost = (exStyle & WS_EX_TOPMOST) != 0;
     window.title = title == nullptr ? "" : title;
     window.place = {x, y, x + std::max(width, 1), y + std::max(height, 1)};
     const HWND handle{table().add(std::move(made))};
@@ -235,7 +240,7 @@ HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DW
         return {};
     }
     window.handle = handle;
-    window.native = makeNative(window, exStyle);
+    window.native = makeNative(window);
     if (mayBeForeign(window.parent)) {
         followHost(window.parent, handle);
     } else if (!child) {

@@ -1,0 +1,26 @@
+// The windows in front of all others (a saver's, a box over it), and the keyboard and the pointer
+// that are kept for them while a password guards the screen.
+#pragma once
+
+#include <functional>
+
+class QWindow;
+
+namespace seam {
+
+/// From now on the window that stands in front of all others has keyboard and pointer to itself,
+/// or no longer. Another program may hold them for a moment, as an open menu does: it is tried
+/// again until it succeeds. On a platform of the toolkit other than X11 it can't be done.
+void holdInput(bool hold);
+
+bool inputIsHeld();
+
+/// The window stands in front from now on: it takes what is held from the one before, which gets
+/// it back when this one goes.
+void bringForward(QWindow& window);
+void giveBack(const QWindow& window);
+
+/// Calls visit for each of these windows, the one in front last.
+void forEachInFront(const std::function<void(QWindow&)>& visit);
+
+} // namespace seam

@@ -1,0 +1,24 @@
+// A window that has every monitor to itself: a screen saver's.
+#pragma once
+
+#include "platform/user/window.h"
+
+class QWindow;
+
+namespace seam {
+
+/// Whether the window is one that goes above all others and fills the primary monitor.
+bool fillsScreen(const Window& window);
+
+/// From now on the window follows the primary monitor's size, what lies on the other monitors is
+/// covered with black, and both stay above windows that appear later. Input on the black goes to
+/// the window. One window at a time can have the screens.
+void takeScreens(Window& window);
+
+/// Ends that; does nothing for any other window.
+void leaveScreens(HWND window);
+
+/// The black on the other monitors; null while there is none.
+QWindow* screenCover();
+
+} // namespace seam
