@@ -41,6 +41,9 @@ struct HandleCounts {
     std::size_t memoryBlocks = 0;
     std::size_t files = 0;
     std::size_t searches = 0;
+    std::size_t devices = 0;
+    std::size_t keys = 0;
+    std::size_t modules = 0; // loads that nobody has freed
     std::size_t timers = 0;
 
     friend bool operator==(const HandleCounts&, const HandleCounts&) = default;

@@ -1,4 +1,4 @@
-// Files, memory blocks, resources, profile and process services of the platform.
+// Files, devices, memory blocks, modules, resources, profile and process services of the platform.
 //
 // Paths have the platform's form: drive C: is the root of the file system, each mounted medium of
 // the user has a letter from D: on, a backslash parts the elements and a slash counts as one. An
@@ -61,7 +61,7 @@ struct WIN32_FIND_DATAA {
     char cFileName[MAX_PATH];
 };
 
-using HANDLE = Handle<struct SearchKind>;
+using HANDLE = Handle<struct SystemObjectKind>; // a search or a device
 constexpr HANDLE INVALID_HANDLE_VALUE{0xFFFFFFFF};
 
 /// Starts a scan for a pattern, with or without a directory in front: `*` stands for any run of
@@ -80,6 +80,28 @@ DWORD GetCurrentDirectoryA(DWORD size, char* buffer);
 
 /// TRUE if the directory was entered; else the current directory stays.
 BOOL SetCurrentDirectoryA(const char* path);
+
+// ---- Devices -------------------------------------------------------------------------------
+
+constexpr DWORD GENERIC_READ = 0x80000000;
+constexpr DWORD GENERIC_WRITE = 0x40000000;
+constexpr DWORD FILE_SHARE_READ = 1;
+constexpr DWORD FILE_SHARE_WRITE = 2;
+constexpr DWORD OPEN_EXISTING = 3;
+
+/// Opens a device of the seam by its whole name ("\\\\.\\" and a word), whatever its case; files
+/// are opened by OpenFile. `disposition` must be OPEN_EXISTING; the rest may be anything.
+/// INVALID_HANDLE_VALUE if there is no such device.
+HANDLE CreateFileA(const char* name, DWORD access, DWORD share, void* security, DWORD disposition,
+                   DWORD flags, HANDLE model);
+
+/// Hands a control code to the device. No device of the seam takes or gives bytes: the buffers are
+/// left alone and `returned`, if not null, gets 0. FALSE if the device doesn't know the code.
+BOOL DeviceIoControl(HANDLE device, DWORD code, void* input, DWORD inputBytes, void* output,
+                     DWORD outputBytes, DWORD* returned, void* overlapped);
+
+/// Closes a device; FALSE if the handle is none.
+BOOL CloseHandle(HANDLE device);
 
 // ---- Memory blocks -------------------------------------------------------------------------
 
@@ -107,7 +129,8 @@ constexpr ResourceName RT_BITMAP{2};
 constexpr ResourceName RT_DIALOG{5};
 constexpr ResourceName RT_STRING{6};
 
-/// The handle of the program file itself; name must be null.
+/// The handle of a module that is in the process, whatever its name's case: null stands for the
+/// program file itself. Null if it isn't there; nothing is loaded.
 HMODULE GetModuleHandleA(const char* name);
 
 /// The process's arguments, the program's name first and in quotes, with one blank between them.
@@ -133,10 +156,12 @@ int LoadStringA(HINSTANCE instance, UINT id, char* buffer, int size);
 /// Formats with %s, %d, %u and %%; the caller's buffer must hold the result. Gives its length.
 [[gnu::format(printf, 2, 3)]] int wsprintfA(char* buffer, const char* format, ...);
 
-/// Loads a module of the seam by name, whatever its case; null if the seam has none of that name.
+/// Loads a module of the seam by name, whatever its case, never one of a directory; null if the
+/// seam has none of that name. It is in the process until as many calls of FreeLibrary.
 HMODULE LoadLibraryA(const char* name);
-BOOL FreeLibrary(HMODULE module);
+BOOL FreeLibrary(HMODULE module); ///< FALSE if nobody has it loaded
 
+/// An entry of a module that is in the process, by its exact name; null if there is none.
 using FARPROC = void (*)();
 FARPROC GetProcAddress(HMODULE module, const char* name);
 

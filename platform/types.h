@@ -52,6 +52,7 @@ using HCURSOR = Handle<struct CursorKind>;
 using HICON = Handle<struct IconKind>;
 using HMENU = Handle<struct MenuKind>;
 using HPALETTE = Handle<struct PaletteKind>;
+using HIMC = Handle<struct InputContextKind>;
 
 /// What SelectObject and DeleteObject take: any of the four kinds below.
 using HGDIOBJ = Handle<struct GdiKind>;

@@ -8,6 +8,9 @@ void countKernelHandles(HandleCounts& counts) {
     counts.memoryBlocks = liveMemoryBlocks();
     counts.files = liveFiles();
     counts.searches = liveSearches();
+    counts.devices = liveDevices();
+    counts.keys = liveKeys();
+    counts.modules = loadedModules();
 }
 
 } // namespace seam

@@ -8,5 +8,8 @@ namespace seam {
 std::size_t liveMemoryBlocks();
 std::size_t liveFiles();
 std::size_t liveSearches();
+std::size_t liveDevices();
+std::size_t liveKeys();
+std::size_t loadedModules();
 
 } // namespace seam

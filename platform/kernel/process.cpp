@@ -1,4 +1,4 @@
-// The program file, its command line and the modules it loads.
+// The command line.
 
 #include "platform/kernel.h"
 
@@ -7,15 +7,9 @@
 
 namespace {
 
-constexpr HMODULE programFile{1};
-
 std::string commandLine; // written by SetCommandLineArguments alone
 
 } // namespace
-
-HMODULE GetModuleHandleA(const char* name) {
-    return name == nullptr ? programFile : HMODULE{};
-}
 
 const char* GetCommandLineA() {
     return commandLine.c_str();
@@ -29,18 +23,4 @@ void SetCommandLineArguments(int count, const char* const* arguments) {
     for (int at = 1; at < count; ++at) {
         commandLine.append(" ").append(arguments[at]);
     }
-}
-
-// The seam has no module of its own, and none is ever loaded from a directory.
-
-HMODULE LoadLibraryA(const char*) {
-    return nullptr;
-}
-
-BOOL FreeLibrary(HMODULE) {
-    return FALSE;
-}
-
-FARPROC GetProcAddress(HMODULE, const char*) {
-    return nullptr;
 }

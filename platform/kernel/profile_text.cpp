@@ -74,6 +74,10 @@ std::optional<std::string> profileValue(std::string_view text, std::string_view 
     return std::string(value.substr(0, value.find('\0')));
 }
 
+bool profileHasSection(std::string_view text, std::string_view section) {
+    return placeOf(text, section, "").inSection;
+}
+
 std::string profileWithValue(std::string_view text, std::string_view section, std::string_view key,
                              std::string_view value) {
     const Place place = placeOf(text, section, key);

@@ -12,6 +12,9 @@ namespace seam {
 std::optional<std::string> profileValue(std::string_view text, std::string_view section,
                                         std::string_view key);
 
+/// Whether there is a section of this name.
+bool profileHasSection(std::string_view text, std::string_view section);
+
 /// The text with the key's value set: in the place of its line, else as the last line of its
 /// section, else in a new section at the end. All other bytes stay. A value that would lose blanks
 /// or quotes at its ends when read gets quotes round it.

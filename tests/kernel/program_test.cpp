@@ -94,12 +94,6 @@ TEST(Program, PutsItsArgumentsTogether) {
     }
 }
 
-TEST(Program, HasNoModuleButItself) {
-    EXPECT_TRUE(GetModuleHandleA(nullptr));
-    EXPECT_FALSE(GetModuleHandleA("IMM32.DLL"));
-    EXPECT_FALSE(LoadLibraryA("libc.so.6"));
-}
-
 TEST(Format, WritesTextsAndNumbers) {
     char buffer[100];
     EXPECT_EQ(wsprintfA(buffer, "%s|%d|%u|%%", "text", -5, 4000000000U), 20);
