@@ -2,6 +2,7 @@
 
 #include "platform/harness.h"
 #include "platform/user/clock.h"
+#include "platform/user/input_contexts.h"
 #include "platform/user/keys.h"
 #include "platform/user/queue.h"
 #include "platform/user/toolkit.h"
@@ -9,6 +10,7 @@
 
 #include <QExposeEvent>
 #include <QImage>
+#include <QInputMethodQueryEvent>
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPaintEvent>
@@ -118,6 +120,10 @@ bool NativeWindow::event(QEvent* event) {
         // The window goes when its procedure says so.
         queuePosted({owner_, WM_CLOSE, 0, 0, 0});
         event->ignore();
+        return true;
+    }
+    if (event->type() == QEvent::InputMethodQuery) {
+        answerInputMethod(owner_, static_cast<QInputMethodQueryEvent&>(*event));
         return true;
     }
     return QWindow::event(event);

@@ -3,6 +3,7 @@
 
 #include "platform/handle_table.h"
 #include "platform/user.h"
+#include "platform/user/input_contexts.h"
 
 #include <functional>
 #include <memory>
@@ -33,6 +34,7 @@ struct Window {
     bool dying = false; // WM_DESTROY has been sent
     bool paintNeeded = false;
     bool eraseNeeded = false;
+    HIMC inputContext = defaultInputContext;
     RECT update{0, 0, 0, 0}; // bounds of what WM_PAINT has to paint
     std::unique_ptr<NativeWindow> native;
 
