@@ -98,7 +98,7 @@ class InputHolder : public QObject {
 
     bool held_ = false;
     const QWindow* owner_ = nullptr; // the one that has both
-    std::vector<QWindow*> windows_; // the one in front last
+    std::vector<QWindow*> windows_;  // the one in front last
     QTimer retry_;
 };
 

@@ -78,7 +78,8 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
   public:
     explicit Screens(Window& window) : owner_(window.handle), native_(*window.native) {
         const auto later = [this] {
-            QMetaObject::invokeMethod(this, [this] { arrange(); }, Qt::QueuedConnection);
+            QMetaObject::invokeMethod(
+                this, [this] { arrange(); }, Qt::QueuedConnection);
         };
         const auto follow = [this, later](QScreen* screen) {
             connect(screen, &QScreen::geometryChanged, this, later);
@@ -189,8 +190,8 @@ std::unique_ptr<Screens> screens;
 } // namespace
 
 bool fillsScreen(const Window& window) {
-    return window.topmost && !window.parent && window.place.left == 0 &&
-           window.place.top == 0 && window.width() == GetSystemMetrics(SM_CXSCREEN) &&
+    return window.topmost && !window.parent && window.place.left == 0 && window.place.top == 0 &&
+           window.width() == GetSystemMetrics(SM_CXSCREEN) &&
            window.height() == GetSystemMetrics(SM_CYSCREEN);
 }
 
