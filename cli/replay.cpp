@@ -18,7 +18,6 @@
 #include <cstdlib>
 #include <filesystem>
 #include <limits>
-#include <optional>
 #include <stdexcept>
 
 namespace {
@@ -31,51 +30,7 @@ std::function<void(const std::string&)> lineSink;
 int showsLeft = 0;
 int showsDone = 0;
 
-/// A directory with the Toons and a home for the settings, entered while it lives.
-class Ground {
-  public:
-    Ground() {
-        std::string pattern = fs::temp_directory_path() / "toon-trace-XXXXXX";
-        if (mkdtemp(pattern.data()) == nullptr) {
-            throw std::runtime_error("no directory for the replay can be made");
-        }
-        root_ = pattern;
-        if (const char* home = std::getenv(homeVariable)) {
-            homeBefore_ = home;
-        }
-    }
-
-    void enter(const std::vector<std::string>& toons) const {
-        fs::create_directories(root_ / "home");
-        fs::create_directories(root_ / "toons");
-        for (const std::string& toon : toons) {
-            fs::copy_file(toon, root_ / "toons" / fs::path(toon).filename());
-        }
-        setenv(homeVariable, (root_ / "home").c_str(), 1);
-        fs::current_path(root_ / "toons");
-    }
-
-    Ground(const Ground&) = delete;
-    Ground& operator=(const Ground&) = delete;
-
-    ~Ground() {
-        std::error_code ignored;
-        fs::current_path(before_, ignored);
-        fs::remove_all(root_, ignored);
-        if (homeBefore_) {
-            setenv(homeVariable, homeBefore_->c_str(), 1);
-        } else {
-            unsetenv(homeVariable);
-        }
-    }
-
-  private:
-    static constexpr const char* homeVariable = "XDG_CONFIG_HOME";
-
-    fs::path before_ = fs::current_path();
-    std::optional<std::string> homeBefore_;
-    fs::path root_;
-};
+constexpr const char* homeVariable = "XDG_CONFIG_HOME";
 
 /// The saver's procedure, but that the stage closes at the end of the last show. The first walk
 /// about tells of its end twice; it is over when the second message comes.
@@ -100,20 +55,6 @@ HWND createStage(const ReplayOptions& options) {
                            options.height, nullptr, nullptr, windowClass.hInstance, nullptr);
 }
 
-/// What outlives a stage, as it stands in a fresh process: a replay doesn't depend on the one
-/// before it.
-void forgetEarlierStages() {
-    ToonDocHeader = {};
-    PlayFrame = {};
-    WalkFrame = {};
-    CaptionText[0] = '\0';
-    ToonSpeed = 3;
-    LastMouthShape = 0;
-    PreviousStatement = 0;
-    LastBackground = 0;
-    StageRepaintFlag = 1;
-}
-
 void setStartSettings(const ReplayOptions& options) {
     WalkingStyle = options.toons.empty() ? 0 : 1;
     Statements = options.statements ? 1 : 0;
@@ -126,10 +67,56 @@ void setStartSettings(const ReplayOptions& options) {
 
 } // namespace
 
+ReplayGround::ReplayGround() : before_(fs::current_path()) {
+    std::string pattern = fs::canonical(fs::temp_directory_path()) / "dorbo-replay-XXXXXX";
+    if (mkdtemp(pattern.data()) == nullptr) {
+        throw std::runtime_error("no directory for the replay can be made");
+    }
+    root_ = pattern;
+    if (const char* home = std::getenv(homeVariable)) {
+        homeBefore_ = home;
+    }
+    fs::create_directories(root_ / "home");
+    fs::create_directories(root_ / "toons");
+    setenv(homeVariable, (root_ / "home").c_str(), 1);
+    fs::current_path(root_ / "toons");
+}
+
+ReplayGround::~ReplayGround() {
+    std::error_code ignored;
+    fs::current_path(before_, ignored);
+    fs::remove_all(root_, ignored);
+    if (homeBefore_) {
+        setenv(homeVariable, homeBefore_->c_str(), 1);
+    } else {
+        unsetenv(homeVariable);
+    }
+}
+
+void ForgetEarlierStages() {
+    ToonDocHeader = {};
+    ToonFileName[0] = '\0';
+    CaptionText[0] = '\0';
+    ToonSpeed = 3;
+    BackgroundIndex = 0;
+    PlayFrame = {};
+    WalkFrame = {};
+    LastMouthShape = 0;
+    PreviousStatement = 0;
+    NextToonFile[0] = '\0';
+    ToonFileCount = 0;
+    BackgroundCount = 0;
+    LastBackground = 0;
+    StageRepaintFlag = 1;
+    PreviewMode = 0;
+}
+
 void Replay(const ReplayOptions& options, const std::function<void(const std::string&)>& line) {
-    const Ground ground;
-    ground.enter(options.toons);
-    forgetEarlierStages();
+    const ReplayGround ground;
+    for (const std::string& toon : options.toons) {
+        fs::copy_file(toon, ground.toons() / fs::path(toon).filename());
+    }
+    ForgetEarlierStages();
     setStartSettings(options);
     lineSink = line;
     showsLeft = options.shows;

@@ -3,13 +3,43 @@
 #pragma once
 
 #include <cstdint>
+#include <filesystem>
 #include <functional>
+#include <optional>
 #include <string>
 #include <vector>
 
+/// An empty directory for Toons, which is the current one while this lives, and an empty home for
+/// the settings; both are gone at the end. Throws a std::exception if they can't be made.
+class ReplayGround {
+  public:
+    ReplayGround();
+    ReplayGround(const ReplayGround&) = delete;
+    ReplayGround& operator=(const ReplayGround&) = delete;
+    ~ReplayGround();
+
+    std::filesystem::path toons() const {
+        return root_ / "toons";
+    }
+
+    std::filesystem::path settingsFile() const {
+        return root_ / "home/dorbo/Dorbo95.ini";
+    }
+
+  private:
+    std::filesystem::path before_;
+    std::filesystem::path root_;
+    std::optional<std::string> homeBefore_;
+};
+
+/// Brings what outlives a stage to how it stands in a fresh process, so that the next stage doesn't
+/// depend on those before it. The settings and the random numbers stay: a stage reads the first at
+/// its start and seeds the second. For the time between two stages only.
+void ForgetEarlierStages();
+
 struct ReplayOptions {
     std::vector<std::string>
-        toons;        // files; copied into a directory of their own. None: walks about
+        toons;        // whole paths; copied into a directory of their own. None: walks about
     int width = 1024; // of the stage, in pixels
     int height = 768;
     std::uint32_t seed = 1;  // of the random numbers

@@ -9,18 +9,12 @@ TEST(CommandLine, DropsTheProgramsName) {
     } cases[] = {
         {"", ""},
         {"dorbo", ""},
-        {"dorbo /s", "/s"},
-        {"/opt/dorbo \t /p 12 ", "/p 12 "},
-        {"dorbo\t/s", "/s"},
-        {"dorbo\x01\x1F\r\n-s", "-s"},
+        {"/opt/dorbo \t\x01\x1F\r\n /p 12 ", "/p 12 "},
         {"d\xF6rbo\x80 /s", "/s"}, // a top bit isn't a sign
-        {"\"dorbo\" /s", "/s"},
         {"\"/opt/my dorbo/dorbo\"  /a 7", "/a 7"},
-        {"\"dorbo\"/s", "/s"},
-        {"\"dor\tbo\"\t-s", "-s"},
+        {"\"dor\tbo\"/s", "/s"},
         {"\"/opt/my dorbo /s", ""},
         {"\"\" /s", "/s"},
-        {"\"", ""},
         {"dor\"bo /s\"", "/s\""},
         {"  /s", "/s"}, // a name of no characters
     };
@@ -34,31 +28,13 @@ TEST(CommandLine, ReadsAWindowInDecimal) {
     const struct {
         const char* text;
         DWORD number;
-    } cases[] = {
-        {"", 0},
-        {"0", 0},
-        {"7", 7},
-        {"0042", 42},
-        {"123 456", 123},
-        {"12a", 12},
-        {"12:34", 12},
-        {"9/", 9},
-        {"12\xB2", 12},
-        {"\xB2"
-         "12",
-         0},
-        {"-5", 0},
-        {"+5", 0},
-        {" 5", 0},
-        {"\t5", 0},
-        {":5", 0},
-        {"0x1F", 0},
-        {"x1F", 0},
-        {"4294967295", 4294967295U},
-        {"4294967296", 0},
-        {"4294967299", 3},
-        {"99999999999", 1215752191},
-    };
+    } cases[] = {{"", 0},           {"0042", 42},
+                 {"123 456", 123},  {"12:34", 12},
+                 {"9/", 9},         {"12\xB2", 12},
+                 {"-5", 0},         {"+5", 0},
+                 {" 5", 0},         {":5", 0},
+                 {"0x1F", 0},       {"4294967295", 4294967295U},
+                 {"4294967299", 3}, {"99999999999", 1215752191}};
 
     for (const auto& one : cases) {
         EXPECT_EQ(ParseWindowHandle(one.text).number, one.number) << one.text;

@@ -1,19 +1,14 @@
-// A directory of Toons and a home of its own, both gone at the end; the clock moved by hand; a
-// stage window with the saver's procedure; and the record of what happens on it.
+// A directory of Toons and a home of its own, both gone at the end, and a stage window with the
+// saver's procedure.
 #pragma once
 
-#include "platform/harness.h"
-#include "platform/user.h"
+#include "cli/replay.h"
+#include "tests/recorded_stage.h"
 #include "toon/toon_document.h"
 
-#include <gmock/gmock.h>
+#include <memory>
 
-#include <filesystem>
-#include <optional>
-#include <string>
-#include <vector>
-
-class SaverTest : public testing::Test {
+class SaverTest : public RecordedStage {
   protected:
     void SetUp() override;
     void TearDown() override;
@@ -32,27 +27,12 @@ class SaverTest : public testing::Test {
     /// Ends it and takes the quit that its end posts.
     void closeStage();
 
-    /// Lets `milliseconds` pass.
-    static void pass(std::int64_t milliseconds);
-
-    /// Lets time pass until a line of the record says that this has happened anew; false if ten
-    /// minutes don't bring it. The record then tells of the last 10 ms.
-    static bool runUntilEvent(const std::string& event);
-
-    /// The lines of the record that begin with one of these words, without their times.
-    static std::vector<std::string> events(const std::vector<std::string>& names);
-
-    /// A line of the user's settings file, empty if there is none of the key.
+    /// The value of a key in the user's settings file, empty if there is none.
     std::string savedSetting(const std::string& key) const;
 
-    HWND stage;
+    /// The display count of the pointer.
+    static int cursorCount();
 
   private:
-    std::filesystem::path root_;
-    std::filesystem::path before_;
-    std::optional<std::string> homeBefore_;
-    seam::HandleCounts handles_;
+    std::unique_ptr<ReplayGround> ground_;
 };
-
-/// The display count of the pointer.
-int cursorCount();
