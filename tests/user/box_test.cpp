@@ -2,29 +2,18 @@
 #include "tests/user/test_window.h"
 
 #include <QApplication>
-#include <QKeyEvent>
 #include <QMessageBox>
 #include <QTimer>
-
-#include <gtest/gtest.h>
 
 namespace {
 
 using test::handlers;
 
-class Boxes : public testing::Test {
+class Boxes : public test::WindowTest {
   protected:
     void SetUp() override {
-        handlers.clear();
-        window = test::makeWindow();
-        test::handleWaiting();
-    }
-
-    void TearDown() override {
-        DestroyWindow(window);
-        MSG message{};
-        while (PeekMessageA(&message, nullptr, 0, 0, PM_REMOVE)) {
-        }
+        WindowTest::SetUp();
+        seam::useSystemClock(); // the toolkit's own loop runs behind a box
     }
 
     /// Does something with the box once it is up.
@@ -39,35 +28,32 @@ class Boxes : public testing::Test {
         });
     }
 
-    static void press(QWidget& widget, Qt::Key key) {
-        QKeyEvent event(QEvent::KeyPress, key, Qt::NoModifier);
-        QCoreApplication::sendEvent(&widget, &event);
+    static void answerWhenUp() {
+        whenUp([](QMessageBox& box) { test::press(&box, Qt::Key_Return); });
     }
-
-    HWND window;
 };
 
 TEST_F(Boxes, ShowTheirTextAndGiveTheAnswer) {
-    struct Case {
+    const struct {
         UINT type;
         Qt::Key key;
         int answer;
-    };
+    } cases[] = {{MB_OK | MB_ICONHAND, Qt::Key_Escape, IDOK},
+                 {MB_OK | MB_ICONEXCLAMATION, Qt::Key_Return, IDOK},
+                 {MB_YESNOCANCEL, Qt::Key_Escape, IDCANCEL},
+                 {MB_YESNOCANCEL, Qt::Key_Return, IDYES}};
 
-    const Case cases[] = {{MB_OK | MB_ICONHAND, Qt::Key_Escape, IDOK},
-                          {MB_OK | MB_ICONEXCLAMATION, Qt::Key_Return, IDOK},
-                          {MB_YESNOCANCEL, Qt::Key_Escape, IDCANCEL},
-                          {MB_YESNOCANCEL, Qt::Key_Return, IDYES}};
-    for (const Case& c : cases) {
+    for (const auto& one : cases) {
         QString text;
         QString title;
         whenUp([&](QMessageBox& box) {
             text = box.text();
             title = box.windowTitle();
-            press(box, c.key);
+            test::press(&box, one.key);
         });
         // Valid UTF-8 is shown as that, anything else as Windows-1252.
-        EXPECT_EQ(MessageBoxA(window, "Error reading \xC3\xA9.", "\x80 caf\xE9", c.type), c.answer);
+        EXPECT_EQ(MessageBoxA(window, "Error reading \xC3\xA9.", "\x80 caf\xE9", one.type),
+                  one.answer);
         EXPECT_EQ(text, QStringLiteral("Error reading \u00E9."));
         EXPECT_EQ(title, QStringLiteral("\u20AC caf\u00E9"));
     }
@@ -83,7 +69,7 @@ TEST_F(Boxes, TimersAndPaintsGoOnBehindThem) {
     handlers[WM_TIMER] = [&](HWND, WPARAM, LPARAM) {
         InvalidateRect(window, nullptr, FALSE);
         if (++ticks == 4) {
-            whenUp([](QMessageBox& box) { press(box, Qt::Key_Return); });
+            answerWhenUp();
         }
         return LRESULT{0};
     };
@@ -93,29 +79,20 @@ TEST_F(Boxes, TimersAndPaintsGoOnBehindThem) {
     EXPECT_GE(paints, 3);
 }
 
-TEST_F(Boxes, RunTheirOwnLoopWithinAHandlerAndGoOnAfterIt) {
-    // A loop of the program's within the box's own, ended by a timer; then the box goes on.
-    constexpr UINT innerMessage = 0x8001;
+TEST_F(Boxes, ALoopWithinTheirOwnEndsAndTheyGoOn) {
     int after = 0;
     handlers[WM_TIMER] = [&](HWND, WPARAM timer, LPARAM) {
-        KillTimer(window, 1);
-        if (timer == 1) {
-            PostMessageA(window, innerMessage, 0, 0);
-        } else if (timer == 3) {
-            KillTimer(window, 3);
+        if (timer == 1) { // the inner loop, which timer 2 ends
+            KillTimer(window, 1);
+            SetTimer(window, 2, 1, nullptr);
+            test::runLoop();
+            SetTimer(window, 3, 1, nullptr);
+        } else if (timer == 2) {
+            KillTimer(window, 2);
             PostQuitMessage(0);
         } else if (++after == 3) {
-            whenUp([](QMessageBox& box) { press(box, Qt::Key_Return); });
+            answerWhenUp();
         }
-        return LRESULT{0};
-    };
-    handlers[innerMessage] = [&](HWND, WPARAM, LPARAM) {
-        SetTimer(window, 3, 1, nullptr);
-        MSG inner{};
-        while (GetMessageA(&inner, nullptr, 0, 0)) {
-            DispatchMessageA(&inner);
-        }
-        SetTimer(window, 2, 1, nullptr);
         return LRESULT{0};
     };
     SetTimer(window, 1, 1, nullptr);
@@ -130,10 +107,7 @@ TEST_F(Boxes, AQuitEndsTheBoxAndReachesTheLoopBehindIt) {
     };
     SetTimer(window, 1, 1, nullptr);
     EXPECT_EQ(MessageBoxA(window, "Wait", nullptr, MB_YESNOCANCEL), IDCANCEL);
-    MSG message{};
-    while (GetMessageA(&message, nullptr, 0, 0)) {
-    }
-    EXPECT_EQ(message.wParam, 5U);
+    EXPECT_EQ(test::runLoop(), 5U);
 }
 
 } // namespace

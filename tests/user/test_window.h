@@ -1,10 +1,18 @@
-// A window whose procedure keeps a list of what reaches it.
+// A window whose procedure keeps a list of what reaches it, and the fixture round it.
 #pragma once
 
 #include "platform/harness.h"
 #include "platform/kernel.h"
 #include "platform/user.h"
 
+#include <QCoreApplication>
+#include <QGuiApplication>
+#include <QKeyEvent>
+#include <QWindow>
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
 #include <functional>
 #include <map>
 #include <string>
@@ -32,10 +40,8 @@ inline LRESULT recordingProc(HWND window, UINT message, WPARAM wParam, LPARAM lP
 inline std::vector<UINT> seenAmong(const std::vector<UINT>& wanted) {
     std::vector<UINT> found;
     for (const Seen& entry : seen) {
-        for (const UINT message : wanted) {
-            if (entry.message == message) {
-                found.push_back(message);
-            }
+        if (std::find(wanted.begin(), wanted.end(), entry.message) != wanted.end()) {
+            found.push_back(entry.message);
         }
     }
     return found;
@@ -60,5 +66,51 @@ inline void handleWaiting() {
         DispatchMessageA(&message);
     }
 }
+
+/// Dispatches until a quit message comes; gives its code.
+inline WPARAM runLoop() {
+    MSG message{};
+    while (GetMessageA(&message, nullptr, 0, 0)) {
+        DispatchMessageA(&message);
+    }
+    return message.wParam;
+}
+
+/// The toolkit's window that was made last.
+inline QWindow* lastNative() {
+    return QGuiApplication::topLevelWindows().constLast();
+}
+
+inline void press(QObject* target, Qt::Key key, Qt::KeyboardModifiers held = Qt::NoModifier) {
+    QKeyEvent event(QEvent::KeyPress, key, held);
+    QCoreApplication::sendEvent(target, &event);
+}
+
+/// One window that has been painted, and a clock moved by hand. At the end nothing may be left.
+class WindowTest : public testing::Test {
+  protected:
+    void SetUp() override {
+        seam::useManualClock(0);
+        handlers.clear();
+        before_ = seam::liveHandles();
+        window = makeWindow();
+        handleWaiting();
+        seen.clear();
+    }
+
+    void TearDown() override {
+        DestroyWindow(window);
+        EXPECT_EQ(seam::liveHandles(), before_) << "something was left behind";
+        MSG message{};
+        while (PeekMessageA(&message, nullptr, 0, 0, PM_REMOVE)) {
+        }
+        seam::useSystemClock();
+    }
+
+    HWND window;
+
+  private:
+    seam::HandleCounts before_;
+};
 
 } // namespace test
