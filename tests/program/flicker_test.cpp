@@ -1,57 +1,58 @@
 // A walk across the real screen, grabbed at every step: each grab must be one finished picture, the
 // figure over the backdrop and nothing else.
-#include "tests/program/bitmaps.h"
 #include "tests/program/ground.h"
 
 #include <algorithm>
 #include <map>
 #include <optional>
 
+#include <QPainter>
+
 #include <gtest/gtest.h>
 
 namespace {
 
-using ground::Grab;
 using ground::Ground;
-using ground::Picture;
 
-struct Box {
-    int left;
-    int top;
-    int right;
-    int bottom;
-};
-
-/// The bounds of the pixels of which `differs` is true; nothing if there are none.
-template <class Differs>
-std::optional<Box> boundsOf(int width, int height, Differs differs) {
-    std::optional<Box> box;
-    for (int y = 0; y < height; ++y) {
-        for (int x = 0; x < width; ++x) {
-            if (differs(x, y)) {
-                box = box ? Box{std::min(box->left, x), box->top, std::max(box->right, x), y}
-                          : Box{x, y, x, y};
+/// The bounds of the pixels in which two pictures of one size differ; empty if there are none.
+QRect changedBox(const QImage& one, const QImage& other) {
+    int left = one.width();
+    int top = one.height();
+    int right = -1;
+    int bottom = -1;
+    for (int y = 0; y < one.height(); ++y) {
+        for (int x = 0; x < one.width(); ++x) {
+            if (one.pixel(x, y) != other.pixel(x, y)) {
+                left = std::min(left, x);
+                top = std::min(top, y);
+                right = std::max(right, x);
+                bottom = y;
             }
         }
     }
-    return box;
+    return {QPoint(left, top), QPoint(right, bottom)};
 }
 
-/// Whether the grab is the background with the picture at (left, top), within the changed box.
-bool isComposed(const Grab& grab, const Grab& background, const Box& changed,
-                const Picture& picture, int left, int top) {
-    for (int y = changed.top; y <= changed.bottom; ++y) {
-        for (int x = changed.left; x <= changed.right; ++x) {
-            const int px = x - left;
-            const int py = y - top;
-            const bool inside = px >= 0 && py >= 0 && px < picture.width && py < picture.height;
-            const std::uint32_t own = inside ? picture.at(px, py) : 0;
-            if (grab.at(x, y) != (own == 0 ? background.at(x, y) : own)) {
-                return false;
-            }
-        }
-    }
-    return true;
+struct Figure {
+    QImage picture; // see-through where the file is black
+    QRect bounds;   // of the rest
+};
+
+Figure loadFigure(const std::string& name) {
+    QImage picture = ground::loadPicture(name);
+    QImage nothing(picture.size(), picture.format());
+    nothing.fill(Qt::black);
+    const QRect bounds = changedBox(picture, nothing);
+    picture.setAlphaChannel(picture.createMaskFromColor(qRgb(0, 0, 0), Qt::MaskOutColor));
+    return {picture, bounds};
+}
+
+/// Whether the grab is the background with the picture at `place`, within the changed box.
+bool isComposed(const QImage& grab, const QImage& background, const QRect& changed,
+                const QImage& picture, QPoint place) {
+    QImage composed = background.copy(changed);
+    QPainter(&composed).drawImage(place - changed.topLeft(), picture);
+    return composed == grab.copy(changed);
 }
 
 struct Found {
@@ -59,22 +60,36 @@ struct Found {
     int left;
 };
 
+/// All 28 of the character, by name.
+std::map<std::string, Figure> loadFigures() {
+    std::vector<std::string> names{"fdltn1", "fdltn2", "fdrtn1", "fdrtn2"};
+    for (int i = 1; i <= 8; ++i) {
+        for (const char* row : {"fdl2r", "fdr2l", "pose0"}) {
+            names.push_back(row + std::to_string(i));
+        }
+    }
+    std::map<std::string, Figure> figures;
+    for (const std::string& name : names) {
+        figures[name] = loadFigure(name);
+    }
+    return figures;
+}
+
 /// The picture and the place that explain all that the grab has beyond the background. A pixel of
 /// the figure may have the background's colour, so that places nearby are tried as well.
-std::optional<Found> explain(const Grab& grab, const Grab& background, const Box& changed,
-                             const std::vector<Picture>& pictures) {
+std::optional<Found> explain(const QImage& grab, const QImage& background, const QRect& changed,
+                             const std::map<std::string, Figure>& figures) {
     constexpr int slack = 3;
-    for (const Picture& picture : pictures) {
-        const Box figure = *boundsOf(picture.width, picture.height,
-                                     [&](int x, int y) { return picture.at(x, y) != 0; });
+    for (const auto& [name, figure] : figures) {
+        const auto& [picture, bounds] = figure;
         const int left =
-            changed.left > 0 ? changed.left - figure.left : changed.right - figure.right;
-        const int top = changed.bottom < grab.height - 1 ? changed.bottom - figure.bottom
-                                                         : changed.top - figure.top;
+            changed.left() > 0 ? changed.left() - bounds.left() : changed.right() - bounds.right();
+        const int top = changed.bottom() < grab.height() - 1 ? changed.bottom() - bounds.bottom()
+                                                             : changed.top() - bounds.top();
         for (int dy = -slack; dy <= slack; ++dy) {
             for (int dx = -slack; dx <= slack; ++dx) {
-                if (isComposed(grab, background, changed, picture, left + dx, top + dy)) {
-                    return Found{picture.name, left + dx};
+                if (isComposed(grab, background, changed, picture, {left + dx, top + dy})) {
+                    return Found{name, left + dx};
                 }
             }
         }
@@ -85,32 +100,29 @@ std::optional<Found> explain(const Grab& grab, const Grab& background, const Box
 TEST(Walk, ShowsFinishedPicturesOnly) {
     const Ground ground(1280, 1024); // on which the whole of him shows on his way in
     std::filesystem::copy_file(DORBO_SOURCE_DIR "/toons/intro.zkt", ground.toons() / "intro.zkt");
-    const Picture tile = ground::loadPicture("bg01");
+    const QImage tile = ground::loadPicture("bg01");
     auto saver = ground.start({"S"});
-    ASSERT_TRUE(ground::waitFor([&] { return ground.grab().at(0, 0) == tile.at(0, 0); }));
-    const Grab title = ground.grab();
-    Grab background;
+    ASSERT_TRUE(ground::waitFor([&] { return ground.grab().pixel(0, 0) == tile.pixel(0, 0); }));
+    const QImage title = ground.grab();
+    QImage background;
     ASSERT_TRUE(ground::waitFor([&] {
         background = ground.grab();
-        return background != title && background.at(0, 0) != 0; // not the blank stage in between
+        return background != title && background.pixel(0, 0) != qRgb(0, 0, 0); // nor blank
     }));
 
     // The show begins with him off the stage and comes to its first rest in a pose.
-    const std::vector<Picture> pictures = ground::characterPictures();
+    const auto figures = loadFigures();
     std::vector<Found> steps;
-    Grab shown = background;
+    QImage shown = background;
     while (steps.empty() || steps.back().name.rfind("pose", 0) != 0) {
-        Grab next;
+        QImage next;
         ASSERT_TRUE(ground::waitFor([&] { return (next = ground.grab()) != shown; }));
         shown = next;
-        const auto changed = boundsOf(shown.width, shown.height, [&](int x, int y) {
-            return shown.at(x, y) != background.at(x, y);
-        });
-        ASSERT_TRUE(changed);
-        const auto found = explain(shown, background, *changed, pictures);
+        const QRect changed = changedBox(shown, background);
+        const auto found = explain(shown, background, changed, figures);
         ASSERT_TRUE(found) << "no finished picture after " << steps.size() << " steps; changed at "
-                           << changed->left << "," << changed->top << " to " << changed->right
-                           << "," << changed->bottom;
+                           << changed.left() << "," << changed.top() << " to " << changed.right()
+                           << "," << changed.bottom();
         steps.push_back(*found);
     }
     ASSERT_GE(steps.size(), 8U);

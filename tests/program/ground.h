@@ -1,54 +1,45 @@
 // Where the real program is tried: an X server with a window manager, a home, and scripted input.
 #pragma once
 
-#include <cstdint>
 #include <filesystem>
 #include <functional>
-#include <map>
 #include <memory>
 #include <string>
 #include <vector>
 #include <xcb/xcb.h>
+
+#include <QImage>
+#include <QProcess>
+#include <QTemporaryDir>
 
 namespace ground {
 
 /// Asks until the condition holds, for at most `seconds`; whether it came to hold.
 bool waitFor(const std::function<bool()>& condition, double seconds = 20);
 
+/// One of the program's bitmaps.
+QImage loadPicture(const std::string& name);
+
 /// A process of ours; killed at the end if it still runs.
 class Process {
   public:
-    Process(const std::vector<std::string>& command, const std::map<std::string, std::string>& set,
+    Process(const std::vector<std::string>& command, const QProcessEnvironment& environment,
             const std::filesystem::path& directory);
-    Process(const Process&) = delete;
-    Process& operator=(const Process&) = delete;
     ~Process();
 
     bool running();
 
     /// Waits for the end and gives the exit code; -1 if it was killed, -2 if it hasn't ended in
     /// time.
-    int exitCode(double seconds = 20);
+    int exitCode();
 
     void terminate();
 
+    /// Waits for a line of its output; empty if it ends without one.
+    std::string readLine();
+
   private:
-    int pid_ = -1;
-    int status_ = 0;
-    bool ended_ = false;
-};
-
-struct Grab {
-    int width = 0;
-    int height = 0;
-    std::vector<std::uint32_t> pixels;
-
-    std::uint32_t at(int x, int y) const {
-        return pixels[static_cast<std::size_t>(y) * static_cast<std::size_t>(width) +
-                      static_cast<std::size_t>(x)];
-    }
-
-    friend bool operator==(const Grab&, const Grab&) = default;
+    QProcess process_;
 };
 
 /// An Xvfb of our own with openbox, a temporary home and a directory for Toons.
@@ -63,7 +54,7 @@ class Ground {
     Process start(const std::vector<std::string>& arguments) const;
 
     /// A picture of the whole screen, or of a window of ours.
-    Grab grab(xcb_window_t window = 0) const;
+    QImage grab(xcb_window_t window = 0) const;
 
     /// Shows a window of our own, as another program would.
     xcb_window_t makeWindow(int width, int height) const;
@@ -77,20 +68,23 @@ class Ground {
     /// Presses and releases a key, by its X name; where the keyboard is, or in a window.
     void press(const std::string& key, xcb_window_t window = 0) const;
 
-    /// The settings file's text; empty while there is none.
-    std::string settings() const;
-    void writeSettings(const std::string& text) const;
-
     std::filesystem::path toons() const {
-        return root_ / "toons";
+        return root() / "toons";
+    }
+
+    std::filesystem::path settings() const {
+        return root() / "config/dorbo/Dorbo95.ini";
     }
 
   private:
-    std::map<std::string, std::string> environment() const;
+    std::filesystem::path root() const {
+        return root_.path().toStdString();
+    }
 
-    std::filesystem::path root_;
-    std::string display_;
-    std::vector<std::unique_ptr<Process>> servers_;
+    QTemporaryDir root_;
+    QProcessEnvironment environment_;
+    std::unique_ptr<Process> server_;
+    std::unique_ptr<Process> manager_;
     xcb_connection_t* connection_ = nullptr;
     xcb_screen_t* screen_ = nullptr;
 };

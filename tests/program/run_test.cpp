@@ -1,15 +1,12 @@
 // Runs of the real program: exit codes, modes, what ends it and what it leaves behind.
-#include "tests/program/bitmaps.h"
 #include "tests/program/ground.h"
 
-#include <algorithm>
 #include <fstream>
 
 #include <gtest/gtest.h>
 
 namespace {
 
-using ground::Grab;
 using ground::Ground;
 
 constexpr int refused = 255;
@@ -23,49 +20,56 @@ class Run : public testing::Test {
 
     /// Waits until the saver's title stands on the screen.
     void waitForSaver() {
-        const ground::Picture tile = ground::loadPicture("bg01");
-        ASSERT_TRUE(ground::waitFor([&] { return ground.grab().at(0, 0) == tile.at(0, 0); }));
+        const QRgb corner = ground::loadPicture("bg01").pixel(0, 0);
+        ASSERT_TRUE(ground::waitFor([&] { return ground.grab().pixel(0, 0) == corner; }));
     }
 
-    /// The number behind a key of the settings file.
-    int setting(const std::string& key) const {
-        const std::string text = ground.settings();
-        const auto at = text.find(key + "=");
-        return at == std::string::npos ? -1 : std::stoi(text.substr(at + key.size() + 1));
+    /// The value of a key in the settings file, empty if there is none.
+    std::string setting(const std::string& key) const {
+        std::ifstream file(ground.settings());
+        std::string line;
+        while (std::getline(file, line) && line.rfind(key + "=", 0) != 0) {
+        }
+        return file ? line.substr(key.size() + 1, line.find('\r') - key.size() - 1) : "";
     }
 
     Ground ground;
-    Grab bare = ground.grab();
+    QImage bare = ground.grab();
 };
 
 TEST_F(Run, CommandLineChoosesModeAndExitCode) {
-    struct Case {
+    const struct {
         std::vector<std::string> arguments;
         int code;
+    } cases[] = {
+        {{"X"}, refused},
+        {{"-\tS"}, refused},
+        {{}, refused},
+        {{"-", "--", "/"}, refused},
+        {{"/c:123"}, refused},
+        {{"P"}, refused},
+        {{"P", "0"}, refused},
+        {{"P", "77"}, refused},
+        {{"/P:1"}, refused},
+        {{"l", "-5"}, refused},
+        {{"A"}, 0},
+        {{"--a:99"}, 0},
     };
 
-    const Case cases[] = {
-        {{"X"}, refused},       {{"9"}, refused},         {{"-\tS"}, refused},
-        {{}, refused},          {{"/"}, refused},         {{"-", "--", "/"}, refused},
-        {{"C"}, refused},       {{"/c:123"}, refused},    {{"P"}, refused},
-        {{"P", "0"}, refused},  {{"P", "77"}, refused},   {{"/P:1"}, refused},
-        {{"l", "-5"}, refused}, {{"P", "0x20"}, refused}, {{"A"}, 0},
-        {{"/a", "12345"}, 0},   {{"--a:99"}, 0},          {{"P", "99999999999"}, refused},
-    };
-    for (const Case& c : cases) {
-        EXPECT_EQ(ground.start(c.arguments).exitCode(), c.code)
-            << (c.arguments.empty() ? "nothing" : c.arguments.front());
+    for (const auto& one : cases) {
+        EXPECT_EQ(ground.start(one.arguments).exitCode(), one.code)
+            << testing::PrintToString(one.arguments);
     }
-    EXPECT_EQ(ground.grab(), bare);
+    EXPECT_TRUE(ground.grab() == bare);
 }
 
 TEST_F(Run, KeyEndsTheSaverAndTheOdometerIsKept) {
     addToon("intro.zkt");
     auto saver = ground.start({"-/ Sanything"});
     waitForSaver();
-    const Grab title = ground.grab();
+    const QImage title = ground.grab();
     const auto settled = [&, last = title]() mutable {
-        const Grab now = ground.grab();
+        const QImage now = ground.grab();
         const bool moved = now != last;
         last = now;
         return moved;
@@ -74,20 +78,10 @@ TEST_F(Run, KeyEndsTheSaverAndTheOdometerIsKept) {
     ASSERT_TRUE(ground::waitFor(settled)) << "he walks";
     ground.press("space");
     EXPECT_EQ(saver.exitCode(), 0);
-    EXPECT_GT(setting("Paces Walked"), 0);
-    EXPECT_EQ(setting("Walking Style"), 1);
-    EXPECT_NE(ground.settings().find("Directory=C:\\"), std::string::npos);
+    EXPECT_GT(std::stoi(setting("Paces Walked")), 0);
+    EXPECT_EQ(setting("Walking Style"), "1");
+    EXPECT_EQ(setting("Directory").substr(0, 3), "C:\\");
     EXPECT_TRUE(ground::waitFor([&] { return ground.grab() == bare; })) << "the screen is back";
-}
-
-TEST_F(Run, WithoutToonsTheSettingsSayThatHeWalksAbout) {
-    ground.writeSettings("[Fenky Dorbo Screen Saver]\r\nBackgrounds=0\r\n");
-    auto saver = ground.start({"S"});
-    waitForSaver();
-    ground.press("Escape");
-    EXPECT_EQ(saver.exitCode(), 0);
-    EXPECT_EQ(setting("Walking Style"), 0);
-    EXPECT_EQ(setting("Backgrounds"), 1);
 }
 
 TEST_F(Run, SecondSaverBringsTheFirstToTheFront) {
@@ -102,18 +96,25 @@ TEST_F(Run, SecondSaverBringsTheFirstToTheFront) {
 
 TEST_F(Run, PreviewLivesInAnotherProgramsWindow) {
     const xcb_window_t host = ground.makeWindow(200, 150);
-    const Grab empty = ground.grab(host);
+    const QImage empty = ground.grab(host);
     auto preview = ground.start({"/p", std::to_string(host)});
     ASSERT_TRUE(ground::waitFor([&] { return ground.grab(host) != empty; }));
     const auto covered = [&] {
-        const Grab shown = ground.grab(host);
-        return std::count(shown.pixels.begin(), shown.pixels.end(), empty.pixels.front()) == 0;
+        const QImage shown = ground.grab(host);
+        for (int y = 0; y < shown.height(); ++y) {
+            for (int x = 0; x < shown.width(); ++x) {
+                if (shown.pixel(x, y) == empty.pixel(0, 0)) {
+                    return false;
+                }
+            }
+        }
+        return true;
     };
     ASSERT_TRUE(ground::waitFor(covered));
     ground.press("space", ground.childOf(host));
     // The key has come and gone by the time the host's new size has been followed.
     ground.resizeWindow(host, 320, 240);
-    ASSERT_TRUE(ground::waitFor([&] { return ground.grab(host).width == 320 && covered(); }));
+    ASSERT_TRUE(ground::waitFor([&] { return ground.grab(host).width() == 320 && covered(); }));
     EXPECT_TRUE(preview.running());
     ground.destroyWindow(host);
     EXPECT_EQ(preview.exitCode(), 0);
@@ -123,10 +124,10 @@ TEST_F(Run, ToonThatDoesNotLoadShowsItsBoxAndAKeyEndsTheSaver) {
     std::ofstream(ground.toons() / "intro.zkt") << "too short";
     auto saver = ground.start({"S"});
     waitForSaver();
-    const Grab title = ground.grab();
-    Grab box;
+    const QImage title = ground.grab();
+    QImage box;
     ASSERT_TRUE(ground::waitFor([&] { return (box = ground.grab()) != title; }));
-    EXPECT_EQ(box.at(400, 10), title.at(400, 10)) << "the stage stands behind the box";
+    EXPECT_EQ(box.pixel(400, 10), title.pixel(400, 10)) << "the stage stands behind the box";
     // The box takes the keyboard; its answer leaves the stage as it stood.
     const auto answered = [&] {
         ground.press("Return"); // seen only once it has the keyboard
@@ -140,7 +141,8 @@ TEST_F(Run, ToonThatDoesNotLoadShowsItsBoxAndAKeyEndsTheSaver) {
 
 TEST(NoDisplay, IsSaidAndRefused) {
     const auto directory = std::filesystem::temp_directory_path();
-    const std::map<std::string, std::string> none{{"DISPLAY", ":4095"}};
+    QProcessEnvironment none;
+    none.insert(QStringLiteral("DISPLAY"), QStringLiteral(":4095"));
     EXPECT_EQ(ground::Process({DORBO_PROGRAM, "S"}, none, directory).exitCode(), refused);
     EXPECT_EQ(ground::Process({DORBO_PROGRAM, "A"}, none, directory).exitCode(), 0);
 }
