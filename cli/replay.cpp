@@ -109,6 +109,8 @@ void ForgetEarlierStages() {
     LastBackground = 0;
     StageRepaintFlag = 1;
     PreviewMode = 0;
+    SaverVerifying = 0;
+    SaverClosing = 0;
 }
 
 void Replay(const ReplayOptions& options, const std::function<void(const std::string&)>& line) {
