@@ -1,0 +1,142 @@
+#include "platform/user/password_dialog.h"
+
+#include "platform/harness.h"
+#include "platform/user/password_store.h"
+#include "platform/user/text.h"
+
+#include <QDialogButtonBox>
+#include <QFormLayout>
+#include <QKeyEvent>
+#include <QLabel>
+#include <QPushButton>
+#include <QVBoxLayout>
+
+#include <algorithm>
+
+namespace seam {
+
+namespace {
+
+using std::chrono::milliseconds;
+
+/// Wrong passwords since the last right one, and when the next may be tried, by the seam's clock.
+struct Attempts {
+    int wrong = 0;
+    std::int64_t next = 0;
+};
+
+Attempts attempts;
+
+milliseconds delayLeft() {
+    return milliseconds(std::max<std::int64_t>(attempts.next - clockNow(), 0));
+}
+
+void countWrong() {
+    constexpr int mostDoublings = 16;
+    const milliseconds delay =
+        passwordPatience().firstDelay * (1 << std::min(attempts.wrong, mostDoublings));
+    ++attempts.wrong;
+    attempts.next = clockNow() + std::min(delay, passwordPatience().longestDelay).count();
+}
+
+} // namespace
+
+PasswordPatience& passwordPatience() {
+    static PasswordPatience patience;
+    return patience;
+}
+
+void forgetWrongPasswords() {
+    attempts = {};
+}
+
+PasswordDialog::PasswordDialog(HWND owner, const QString& title)
+    : Overlay<QDialog>(owner), text_(new QLabel), form_(new QFormLayout), message_(new QLabel),
+      buttons_(new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel)),
+      ok_(buttons_->button(QDialogButtonBox::Ok)) {
+    constexpr int leastWidth = 340;
+    setWindowTitle(title);
+    setMinimumWidth(leastWidth);
+    auto* layout = new QVBoxLayout(this);
+    layout->setSizeConstraint(QLayout::SetFixedSize);
+    layout->addWidget(text_);
+    layout->addLayout(form_);
+    layout->addWidget(message_);
+    layout->addWidget(buttons_);
+    for (QLabel* label : {text_, message_}) {
+        label->setTextFormat(Qt::PlainText);
+        label->setWordWrap(true);
+        label->setMinimumHeight(fontMetrics().lineSpacing()); // room before there is a message
+    }
+    ok_->setDefault(true);
+    QObject::connect(ok_, &QPushButton::clicked, this, [this] {
+        if (delayLeft().count() == 0) {
+            submit();
+        }
+    });
+    QObject::connect(buttons_, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    delay_.setSingleShot(true);
+    delay_.setTimerType(Qt::PreciseTimer);
+    QObject::connect(&delay_, &QTimer::timeout, this, [this] { holdBack(); });
+    holdBack();
+}
+
+void PasswordDialog::explain(const QString& text) {
+    text_->setText(text);
+}
+
+PasswordField* PasswordDialog::addField(const QString& label) {
+    auto* field = new PasswordField(this);
+    form_->addRow(label, field);
+    setTabOrder(field, ok_);
+    setTabOrder(ok_, buttons_->button(QDialogButtonBox::Cancel));
+    return field;
+}
+
+void PasswordDialog::refuse(const std::string& what, const StoredPassword& broken) {
+    explain(shownText(what + ", because " + broken.reason + ".\n\nTo begin anew, remove " +
+                      passwordFile() + "."));
+    delay_.stop();
+    message_->hide();
+    ok_->hide();
+    buttons_->button(QDialogButtonBox::Cancel)->setDefault(true);
+}
+
+void PasswordDialog::say(const QString& message) {
+    message_->setText(message);
+}
+
+bool PasswordDialog::check(PasswordField& field) {
+    const StoredPassword stored = readPassword();
+    if (stored.state == PasswordState::none || isPassword(stored, field.secret().bytes())) {
+        forgetWrongPasswords();
+        return true;
+    }
+    countWrong();
+    field.clear();
+    field.setFocus();
+    holdBack();
+    return false;
+}
+
+/// OK comes back when the delay is over; till then the message counts the seconds.
+void PasswordDialog::holdBack() {
+    constexpr milliseconds second{1000};
+    const milliseconds left = delayLeft();
+    ok_->setEnabled(left.count() == 0);
+    if (left.count() > 0) {
+        const auto seconds = (left + second - milliseconds(1)) / second;
+        say(QStringLiteral("Wrong password. You may try again in %1 s.").arg(seconds));
+        delay_.start(left - (seconds - 1) * second);
+    } else if (attempts.wrong > 0) {
+        say(QStringLiteral("Wrong password. Please try again."));
+    }
+}
+
+void PasswordDialog::keyPressEvent(QKeyEvent* event) {
+    if (!event->isAutoRepeat()) { // else it is the key that brought the dialog up, still held
+        QDialog::keyPressEvent(event);
+    }
+}
+
+} // namespace seam
