@@ -8,7 +8,7 @@
 #include "platform/gdi/surface.h"
 #include "platform/harness.h"
 
-#include <functional>
+#include <ostream>
 #include <string>
 #include <vector>
 
@@ -16,56 +16,50 @@ namespace test {
 
 using Rows = std::vector<std::string>;
 
-COLORREF colourOf(char name);
+/// A picture of one colour.
+Rows plain(int width, int height, char colour);
 
-Rows textOf(const seam::Picture& picture, bool monochrome = false);
 Rows textOf(HBITMAP bitmap);
 
-/// A stage in memory that notes what it is told.
+/// A stage in memory with a context, that notes what it is told.
 class TestSurface : public seam::Surface {
   public:
-    explicit TestSurface(const Rows& rows);
+    explicit TestSurface(const Rows& rows, const RECT& clip = {0, 0, 999, 999});
+    TestSurface(const TestSurface&) = delete;
+    TestSurface& operator=(const TestSurface&) = delete;
+    ~TestSurface() override;
 
     seam::PixelView pixels() override;
     void touch(const RECT& area) override;
-
     Rows text() const;
 
-    /// What it has shown: the picture before each change, without repetitions, and that of now.
-    std::vector<Rows> shown() const;
-
     std::vector<RECT> touched;
+    std::vector<Rows> before; // the picture before each change
+    HDC dc;
 
   private:
     int width_;
     int height_;
     std::vector<DWORD> pixels_;
-    std::vector<Rows> shown_;
 };
 
-/// A context with a bitmap of its own. Both go at the end of the test.
+/// A context with a bitmap of its own.
 class Memory {
   public:
-    /// A colour bitmap with the picture.
     explicit Memory(const Rows& rows);
-
-    /// A black one of the size, colour or monochrome.
-    Memory(int width, int height, bool monochrome);
-
     Memory(const Memory&) = delete;
     Memory& operator=(const Memory&) = delete;
     ~Memory();
 
-    Rows text() const;
+    Rows text() const {
+        return textOf(bitmap);
+    }
 
     HDC dc;
     HBITMAP bitmap;
-
-  private:
-    HGDIOBJ before_;
 };
 
-/// A bitmap of the display's form with the picture.
+/// A bitmap with the picture, of the display's form or monochrome.
 HBITMAP makeBitmap(const Rows& rows);
 
 /// Bounds of the pixels of that colour, {0, 0, 0, 0} if there are none.
