@@ -2,18 +2,15 @@
 #include "platform/kernel/profile_text.h"
 #include "tests/kernel/scratch_directory.h"
 
-#include <sys/resource.h>
 #include <sys/stat.h>
-#include <unistd.h>
 
-#include <csignal>
 #include <cstdlib>
 
 namespace {
 
 constexpr const char* file = "Dorbo95.ini";
 constexpr const char* section = "Fenky Dorbo Screen Saver";
-constexpr const char* iniName = "dorbo/Dorbo95.ini";
+constexpr const char* ini = "dorbo/Dorbo95.ini";
 const std::string heading = "[Fenky Dorbo Screen Saver]\r\n";
 
 /// The settings lie in the test's own directory.
@@ -23,25 +20,9 @@ class Profile : public ScratchDirectory {
         setenv("XDG_CONFIG_HOME", root_.c_str(), 1);
     }
 
-    void makeIni(const std::string& text) const {
-        make(iniName, text);
-    }
-
-    std::string ini() const {
-        return textOf(iniName);
-    }
-
-    ino_t iniNumber() const {
-        struct stat status = {};
-        stat((root_ / iniName).c_str(), &status);
-        return status.st_ino;
-    }
-
-    static std::string value(const char* key, const char* otherwise = "none") {
+    static std::string value(const char* key) {
         char buffer[128] = "?";
-        const DWORD length =
-            GetPrivateProfileStringA(section, key, otherwise, buffer, sizeof buffer, file);
-        EXPECT_EQ(length, std::string(buffer).size());
+        GetPrivateProfileStringA(section, key, "none", buffer, sizeof buffer, file);
         return buffer;
     }
 
@@ -55,17 +36,12 @@ TEST(ProfileText, GivesTheValueOfAKey) {
         std::string text;
         const char* expected;
     } cases[] = {
-        {"", "none"},
         {"k=v", "none"},
-        {"[s]\r\nk=v\r\n", "v"},
         {"[S]\nK=v", "v"},
         {"\xEF\xBB\xBF[s]\nk=v", "v"},
         {" [ s ] \r\n\t k \t=  v w \t\r\n", "v w"},
         {"[s]\nk=", ""},
-        {"[s]\nk=\"  v \"", "  v "},
-        {"[s]\nk='v'", "v"},
         {"[s]\nk=\"v'", "\"v'"},
-        {"[s]\nk=\"", "\""},
         {"[s]\nk=a=b", "a=b"},
         {"[s]\nk=first\nk=second", "first"},
         {"[s]\n;k=no\n[other]\nk=no\n[s]\nk=no", "none"}, // the first section holds
@@ -99,11 +75,7 @@ TEST(ProfileText, TakesAValueInAndKeepsEverythingElse) {
     for (const auto& one : cases) {
         EXPECT_EQ(seam::profileWithValue(one.text, "s", "k", "v"), one.expected) << one.text;
     }
-}
-
-TEST(ProfileText, GivesBackEachValueAsItWasSet) {
-    for (const char* value : {"", " ", "a ", "\"a\"", "'a'", "\"", "\"\"", "[s]", "=", "c:\\a\\",
-                              "\xe9", " \"a\" ", "'"}) {
+    for (const char* value : {"", " ", "a ", "\"a\"", "'a'", "\"", "[s]", "=", " \"a\" ", "'"}) {
         const std::string text = seam::profileWithValue("", "s", "k", value);
         EXPECT_EQ(seam::profileValue(text, "s", "k"), value) << text;
     }
@@ -113,134 +85,100 @@ TEST_F(Profile, ReadsNumbersThatWrapAtThirtyTwoBits) {
     const struct {
         const char* text;
         UINT expected;
-    } cases[] = {
-        {"1", 1},      {"0", 0},          {"4294967295", 4294967295U},
-        {"007", 7},    {"4294967297", 1}, {"99999999999999999999", 1661992959U},
-        {"12abc", 12}, {"", 0},           {"abc", 0},
-        {"-5", 0},     {"\" 5\"", 0},     {"'5'", 5},
-    };
+    } cases[] = {{"4294967295", 4294967295U},
+                 {"4294967297", 1},
+                 {"12abc", 12},
+                 {"", 0},
+                 {"-5", 0},
+                 {"\" 5\"", 0},
+                 {"'5'", 5}};
 
     for (const auto& one : cases) {
-        makeIni(heading + "k=" + one.text);
+        make(ini, heading + "k=" + one.text);
         EXPECT_EQ(GetPrivateProfileIntA(section, "K", 77, file), one.expected) << one.text;
     }
     EXPECT_EQ(GetPrivateProfileIntA(section, "missing", -1, file), 4294967295U);
 }
 
 TEST_F(Profile, CutsAValueToTheBuffer) {
-    makeIni(heading + "Directory=c:\\toons\\\r\n");
+    make(ini, heading + "Directory=c:\\toons\\\r\n");
     char buffer[8] = "#######";
     EXPECT_EQ(GetPrivateProfileStringA(section, "directory", "", buffer, 4, file), 3U);
-    EXPECT_STREQ(buffer, "c:\\");
-    EXPECT_EQ(buffer[4], '#');
+    EXPECT_EQ(std::string(buffer, 5), std::string("c:\\\0#", 5));
     EXPECT_EQ(GetPrivateProfileStringA(section, "none", "longer than it", buffer, 8, file), 7U);
     EXPECT_EQ(GetPrivateProfileStringA(section, "Directory", "", nullptr, 0, file), 0U);
     EXPECT_EQ(GetPrivateProfileStringA(section, "none", nullptr, buffer, 8, file), 0U);
-    EXPECT_STREQ(buffer, "");
 }
 
-TEST_F(Profile, WritesItsFirstFileForTheUserAlone) {
-    setenv("XDG_CONFIG_HOME", (root_ / "home/.config").c_str(), 1);
-    EXPECT_EQ(value("Statements"), "none");
-    EXPECT_FALSE(std::filesystem::exists(root_ / "home"));
-    EXPECT_TRUE(write("Statements", "1"));
-    EXPECT_EQ(textOf("home/.config/dorbo/Dorbo95.ini"), heading + "Statements=1\r\n");
-    struct stat status = {};
-    stat((root_ / "home/.config/dorbo").c_str(), &status);
-    EXPECT_EQ(status.st_mode & 07777U, 0700U);
-    stat((root_ / "home/.config/dorbo/Dorbo95.ini").c_str(), &status);
-    EXPECT_EQ(status.st_mode & 07777U, 0600U);
-}
-
-TEST_F(Profile, LiesInTheHomeDirectoryWhereNoOtherIsSet) {
+TEST_F(Profile, LiesWithTheUsersSettingsForTheUserAlone) {
     const char* known = std::getenv("HOME");
     const std::string home = known != nullptr ? known : "";
-    setenv("HOME", root_.c_str(), 1);
-    make(".config/dorbo/Dorbo95.ini", heading + "k=home");
-    for (const char* notAbsolute : {"", "relative", "."}) {
-        setenv("XDG_CONFIG_HOME", notAbsolute, 1);
-        EXPECT_EQ(value("k"), "home") << notAbsolute;
-    }
+    setenv("HOME", (root_ / "home").c_str(), 1);
+    setenv("XDG_CONFIG_HOME", "relative", 1);
+    EXPECT_EQ(value("k"), "none");
+    EXPECT_FALSE(std::filesystem::exists("home"));
+    EXPECT_TRUE(write("k", "v"));
+    EXPECT_EQ(textOf("home/.config/dorbo/Dorbo95.ini"), heading + "k=v\r\n");
+    EXPECT_EQ(modeOf("home/.config/dorbo"), 0700U);
+    EXPECT_EQ(modeOf("home/.config/dorbo/Dorbo95.ini"), 0600U);
     unsetenv("XDG_CONFIG_HOME");
-    EXPECT_EQ(value("k"), "home");
+    EXPECT_EQ(value("k"), "v");
     setenv("HOME", home.c_str(), 1);
-}
-
-TEST_F(Profile, NamedWithADirectoryLiesThere) {
     EXPECT_TRUE(WritePrivateProfileStringA("s", "k", "v", whole("own.ini").c_str()));
     EXPECT_EQ(textOf("own.ini"), "[s]\r\nk=v\r\n");
     EXPECT_EQ(GetPrivateProfileIntA("s", "k", 9, whole("OWN.INI").c_str()), 0U);
     EXPECT_FALSE(WritePrivateProfileStringA("s", "k", "v", whole("none\\own.ini").c_str()));
 }
 
-TEST_F(Profile, IsNotWrittenForAValueThatStands) {
-    makeIni(heading + "Paces Walked = 12 \n");
-    const ino_t before = iniNumber();
+TEST_F(Profile, IsNotWrittenForAValueThatStandsAndElseReplacedWithItsMode) {
+    make(ini, heading + "Paces Walked = 12 \n");
+    setMode(ini, 0640);
+    const std::filesystem::path second = root_ / "second";
+    std::filesystem::create_hard_link(ini, second); // shows whether it was replaced
     EXPECT_TRUE(write("Paces Walked", "12"));
-    EXPECT_EQ(iniNumber(), before);
-    EXPECT_EQ(ini(), heading + "Paces Walked = 12 \n");
+    EXPECT_EQ(std::filesystem::hard_link_count(second), 2U);
     EXPECT_TRUE(write("Paces Walked", "13"));
-    EXPECT_EQ(ini(), heading + "Paces Walked=13\r\n");
-}
-
-TEST_F(Profile, KeepsItsModeWhenWritten) {
-    makeIni("[a]\n");
-    chmod((root_ / iniName).c_str(), 0640);
-    EXPECT_TRUE(write("k", "v"));
-    struct stat status = {};
-    stat((root_ / iniName).c_str(), &status);
-    EXPECT_EQ(status.st_mode & 07777U, 0640U);
+    EXPECT_EQ(std::filesystem::hard_link_count(second), 1U);
+    EXPECT_EQ(textOf(ini), heading + "Paces Walked=13\r\n");
+    EXPECT_EQ(modeOf(ini), 0640U);
 }
 
 TEST_F(Profile, KeepsTheLinksThatLeadToIt) {
     make("there.ini", "[a]\r\n");
-    for (const std::string target : {"there.ini", "missing.ini"}) {
-        std::filesystem::create_directories(root_ / "dorbo");
-        std::filesystem::remove(root_ / iniName);
-        std::filesystem::create_symlink("../second", root_ / iniName);
-        std::filesystem::remove(root_ / "second");
-        std::filesystem::create_symlink(target, root_ / "second");
+    make("dorbo/x");
+    std::filesystem::create_symlink("../second", ini);
+    for (const char* target : {"there.ini", "missing.ini"}) {
+        std::filesystem::remove("second");
+        std::filesystem::create_symlink(target, "second");
         EXPECT_TRUE(write("k", "v"));
-        EXPECT_TRUE(std::filesystem::is_symlink(root_ / iniName));
-        EXPECT_TRUE(std::filesystem::is_symlink(root_ / "second"));
+        EXPECT_TRUE(std::filesystem::is_symlink(ini));
+        EXPECT_TRUE(std::filesystem::is_symlink("second"));
         EXPECT_TRUE(textOf(target).ends_with(heading + "k=v\r\n")) << target;
     }
 }
 
-TEST_F(Profile, IsLeftAloneWhenReadOnlyOrNoRegularFile) {
-    makeIni(heading + "k=old\n");
-    chmod((root_ / iniName).c_str(), 0444);
-    EXPECT_EQ(value("k"), "old");
+TEST_F(Profile, IsLeftAloneWhereItCannotBeWritten) {
+    make("dorbo", "a file");
+    EXPECT_FALSE(write("k", "new"));
+    EXPECT_EQ(textOf("dorbo"), "a file");
+    std::filesystem::remove("dorbo");
+    const std::string old = heading + "k=old\r\n" + std::string(5000, '.');
+    make(ini, old);
+    {
+        const FullDisk disk(1000);
+        EXPECT_FALSE(write("k", "new"));
+    }
+    setMode(ini, 0444);
     EXPECT_FALSE(write("k", "new"));
     EXPECT_EQ(value("k"), "old");
+    EXPECT_EQ(textOf(ini), old);
+    EXPECT_EQ(std::distance(std::filesystem::directory_iterator("dorbo"), {}), 1);
     for (const bool pipe : {false, true}) {
-        std::filesystem::remove(root_ / iniName);
-        pipe ? mkfifo((root_ / iniName).c_str(), 0600) : mkdir((root_ / iniName).c_str(), 0700);
+        std::filesystem::remove(ini);
+        pipe ? mkfifo(ini, 0600) : mkdir(ini, 0700);
         EXPECT_EQ(value("k"), "none");
         EXPECT_FALSE(write("k", "new"));
     }
-}
-
-TEST_F(Profile, CannotBeWrittenWhereItsDirectoryIsAFile) {
-    make("dorbo", "a file");
-    EXPECT_FALSE(write("k", "v"));
-    EXPECT_EQ(textOf("dorbo"), "a file");
-}
-
-TEST_F(Profile, StaysAsItWasOnAFullDisk) {
-    const std::string old = heading + "k=old\r\n" + std::string(5000, '.');
-    makeIni(old);
-    rlimit before{};
-    getrlimit(RLIMIT_FSIZE, &before);
-    const rlimit small{1000, before.rlim_max};
-    auto* const handler = std::signal(SIGXFSZ, SIG_IGN);
-    setrlimit(RLIMIT_FSIZE, &small);
-    const bool written = write("k", "new");
-    setrlimit(RLIMIT_FSIZE, &before);
-    std::signal(SIGXFSZ, handler);
-    EXPECT_FALSE(written);
-    EXPECT_EQ(ini(), old);
-    EXPECT_EQ(std::distance(std::filesystem::directory_iterator(root_ / "dorbo"), {}), 1);
 }
 
 TEST_F(Profile, RefusesWhatItCouldNotFindAgain) {
@@ -248,28 +186,26 @@ TEST_F(Profile, RefusesWhatItCouldNotFindAgain) {
         const char* section;
         const char* key;
         const char* value;
-    } cases[] = {
-        {"s", "k", "a\nb"},  {"s", "k", "a\rb"},  {"s", "a=b", "v"}, {"s", "", "v"},
-        {"s", " k", "v"},    {"s]", "k", "v"},    {"s", "[k]", "v"}, {nullptr, "k", "v"},
-        {"s", nullptr, "v"}, {"s", "k", nullptr},
-    };
+    } cases[] = {{"s", "k", "a\nb"},  {"s", "a=b", "v"},   {"s", "", "v"},
+                 {"s", " k", "v"},    {"s]", "k", "v"},    {"s", "[k]", "v"},
+                 {nullptr, "k", "v"}, {"s", nullptr, "v"}, {"s", "k", nullptr}};
 
     for (const auto& one : cases) {
         EXPECT_FALSE(WritePrivateProfileStringA(one.section, one.key, one.value, file));
     }
-    EXPECT_FALSE(std::filesystem::exists(root_ / "dorbo"));
+    EXPECT_FALSE(std::filesystem::exists("dorbo"));
 }
 
 TEST_F(Profile, OfSixteenMegabytesIsReadAndALargerOneCountsAsEmpty) {
     constexpr std::uintmax_t limit = 16 << 20;
-    makeIni(heading + "k=v\n");
-    std::filesystem::resize_file(root_ / iniName, limit); // the rest is NULs
+    make(ini, heading + "k=v\n");
+    std::filesystem::resize_file(ini, limit); // the rest is NULs
     EXPECT_EQ(value("k"), "v");
     for (const std::uintmax_t size : {limit + 1, std::uintmax_t{1} << 40}) {
-        std::filesystem::resize_file(root_ / iniName, size);
+        std::filesystem::resize_file(ini, size);
         EXPECT_EQ(value("k"), "none");
         EXPECT_FALSE(write("k", "w"));
-        EXPECT_EQ(std::filesystem::file_size(root_ / iniName), size);
+        EXPECT_EQ(std::filesystem::file_size(ini), size);
     }
 }
 

@@ -6,6 +6,9 @@
 
 #include <gtest/gtest.h>
 
+#include <sys/resource.h>
+
+#include <csignal>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
@@ -43,6 +46,15 @@ class ScratchDirectory : public testing::Test {
         return {std::istreambuf_iterator<char>(file), {}};
     }
 
+    /// Sets what the owner and others may do with a file.
+    void setMode(const std::string& name, unsigned mode) const {
+        std::filesystem::permissions(root_ / name, std::filesystem::perms{mode});
+    }
+
+    unsigned modeOf(const std::string& name) const {
+        return static_cast<unsigned>(std::filesystem::status(root_ / name).permissions());
+    }
+
     /// A name in the directory as a whole path of the platform.
     std::string whole(const std::string& name = "") const {
         const std::string path = seam::platformPath(root_.string(), {{'C', ""}});
@@ -54,4 +66,26 @@ class ScratchDirectory : public testing::Test {
   private:
     std::filesystem::path before_;
     seam::HandleCounts handles_;
+};
+
+/// While it lives no file grows beyond a size, as on a full disk.
+class FullDisk {
+  public:
+    explicit FullDisk(rlim_t bytes) : handler_(std::signal(SIGXFSZ, SIG_IGN)) {
+        getrlimit(RLIMIT_FSIZE, &before_);
+        const rlimit limit{bytes, before_.rlim_max};
+        setrlimit(RLIMIT_FSIZE, &limit);
+    }
+
+    FullDisk(const FullDisk&) = delete;
+    FullDisk& operator=(const FullDisk&) = delete;
+
+    ~FullDisk() {
+        setrlimit(RLIMIT_FSIZE, &before_);
+        std::signal(SIGXFSZ, handler_);
+    }
+
+  private:
+    rlimit before_{};
+    void (*handler_)(int);
 };
