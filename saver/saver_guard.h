@@ -23,9 +23,10 @@ extern DWORD SaverClosing;
 /// window is made and when a password was refused.
 extern POINT MouseStartPos;
 
+using VerifyEntry = BOOL (*)(HWND window);
+
 /// Asks the user for the password over a window; non-zero if the user may pass. Null while no
 /// password applies. Written by LoadPasswordModule and UnloadPasswordModule.
-using VerifyEntry = BOOL (*)(HWND window);
 extern VerifyEntry VerifyPassword;
 
 /// The window procedure of the saver window's class.
