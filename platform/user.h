@@ -145,8 +145,8 @@ struct CREATESTRUCTA {
 /// WS_VISIBLE stands. With WS_CHILD it lies in `parent`, a window of this program or, by its id,
 /// of another. A WS_EX_TOPMOST window that fills the primary monitor goes on filling it when that
 /// changes, stays above windows that appear later, and turns the other monitors black; input there
-/// is input to it. Null if the class is unknown, the parent is no window, WM_CREATE gave -1, or there
-/// is no display.
+/// is input to it. Null if the class is unknown, the parent is no window, WM_CREATE gave -1, or
+/// there is no display.
 HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DWORD style, int x,
                      int y, int width, int height, HWND parent, HMENU menu, HINSTANCE instance,
                      void* parameter);
@@ -270,8 +270,8 @@ constexpr int IDYES = 6;
 constexpr int IDNO = 7;
 
 /// Shows a box over `owner` and waits for its answer; the owner takes no input meanwhile, timers
-/// and paints go on, and the pointer shows. A null caption is the platform's "Error". Bytes that are valid UTF-8, as in
-/// names of files, are shown as that. 0 if it can't be shown.
+/// and paints go on, and the pointer shows. A null caption is the platform's "Error". Bytes that
+/// are valid UTF-8, as in names of files, are shown as that. 0 if it can't be shown.
 int MessageBoxA(HWND owner, const char* text, const char* caption, UINT type);
 
 using DLGPROC = LRESULT (*)(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam);

@@ -34,7 +34,7 @@ HandleTable<Descriptor>& remotes() {
 std::string displayName() {
     const QByteArray platform = qgetenv("QT_QPA_PLATFORM");
     if (!platform.isEmpty() && !platform.startsWith("xcb")) {
-        return platform.left(platform.indexOf(':')).toStdString();
+        return platform.split(':').constFirst().toStdString();
     }
     const std::string display = qgetenv("DISPLAY").toStdString();
     return display.substr(0, display.find('.', display.rfind(':')));

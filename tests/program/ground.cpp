@@ -1,6 +1,7 @@
 #include "tests/program/ground.h"
 
 #include <chrono>
+#include <csignal>
 #include <cstdlib>
 #include <stdexcept>
 #include <thread>
@@ -85,8 +86,10 @@ int Process::exitCode() {
     return process_.exitStatus() == QProcess::NormalExit ? process_.exitCode() : -1;
 }
 
-void Process::terminate() {
-    process_.terminate();
+void Process::signal(int number) {
+    if (running()) {
+        kill(static_cast<pid_t>(process_.processId()), number);
+    }
 }
 
 std::string Process::readLine() {
@@ -126,15 +129,19 @@ Ground::Ground(int width, int height) {
 Ground::~Ground() {
     xcb_disconnect(connection_);
     for (Process* process : {manager_.get(), server_.get()}) {
-        process->terminate();
+        process->signal(SIGTERM);
         process->exitCode();
     }
 }
 
-Process Ground::start(const std::vector<std::string>& arguments) const {
+Process Ground::start(const std::vector<std::string>& arguments, bool offscreen) const {
     std::vector<std::string> command{DORBO_PROGRAM};
     command.insert(command.end(), arguments.begin(), arguments.end());
-    return {command, environment_, toons()};
+    QProcessEnvironment environment = environment_;
+    if (offscreen) {
+        environment.insert(text("QT_QPA_PLATFORM"), text("offscreen"));
+    }
+    return {command, environment, toons()};
 }
 
 QImage Ground::grab(xcb_window_t window) const {
@@ -193,7 +200,41 @@ void Ground::press(const std::string& key, xcb_window_t window) const {
         command.insert(command.end(), {"--window", std::to_string(window)});
     }
     command.push_back(key);
-    Process(command, environment_, root()).exitCode();
+    this->command(command);
+}
+
+int Ground::command(const std::vector<std::string>& words) const {
+    return Process(words, environment_, root()).exitCode();
+}
+
+void Ground::typeInto(const std::string& title, const std::string& text) const {
+    command(
+        {"xdotool", "search", "--sync", "--onlyvisible", "--name", title, "windowfocus", "--sync"});
+    command({"xdotool", "type", text});
+    press("Return");
+}
+
+bool Ground::inputIsFree() const {
+    const auto keyboard = owned(
+        xcb_grab_keyboard_reply(connection_,
+                                xcb_grab_keyboard(connection_, 0, screen_->root, XCB_CURRENT_TIME,
+                                                  XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC),
+                                nullptr));
+    const auto pointer = owned(xcb_grab_pointer_reply(
+        connection_,
+        xcb_grab_pointer(connection_, 0, screen_->root, 0, XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC,
+                         XCB_NONE, XCB_NONE, XCB_CURRENT_TIME),
+        nullptr));
+    xcb_ungrab_keyboard(connection_, XCB_CURRENT_TIME);
+    xcb_ungrab_pointer(connection_, XCB_CURRENT_TIME);
+    xcb_flush(connection_);
+    return keyboard != nullptr && keyboard->status == XCB_GRAB_STATUS_SUCCESS &&
+           pointer != nullptr && pointer->status == XCB_GRAB_STATUS_SUCCESS;
+}
+
+void Ground::loseDisplay() {
+    server_->signal(SIGKILL);
+    server_->exitCode();
 }
 
 } // namespace ground

@@ -33,7 +33,7 @@ class Process {
     /// time.
     int exitCode();
 
-    void terminate();
+    void signal(int number);
 
     /// Waits for a line of its output; empty if it ends without one.
     std::string readLine();
@@ -51,7 +51,7 @@ class Ground {
     ~Ground();
 
     /// Starts dorbo with these arguments in the directory of the Toons.
-    Process start(const std::vector<std::string>& arguments) const;
+    Process start(const std::vector<std::string>& arguments, bool offscreen = false) const;
 
     /// A picture of the whole screen, or of a window of ours.
     QImage grab(xcb_window_t window = 0) const;
@@ -65,8 +65,20 @@ class Ground {
     /// The window that lies in a window of ours; 0 if none does.
     xcb_window_t childOf(xcb_window_t window) const;
 
+    /// Runs another program on the display to its end and gives its exit code.
+    int command(const std::vector<std::string>& words) const;
+
     /// Presses and releases a key, by its X name; where the keyboard is, or in a window.
     void press(const std::string& key, xcb_window_t window = 0) const;
+
+    /// Types a text and Return into the window with this title as soon as it is there.
+    void typeInto(const std::string& title, const std::string& text) const;
+
+    /// Whether keyboard and pointer can be had, as nobody else holds them.
+    bool inputIsFree() const;
+
+    /// The X server dies.
+    void loseDisplay();
 
     std::filesystem::path toons() const {
         return root() / "toons";
