@@ -153,11 +153,7 @@ TEST(Art, FilesHaveTheFormThatTheProgramReadsAndAreStillDrawnSo) {
     const std::vector<std::uint32_t> sixteen = {
         0x000000, 0x800000, 0x008000, 0x808000, 0x000080, 0x800080, 0x008080, 0x808080,
         0xC0C0C0, 0xFF0000, 0x00FF00, 0xFFFF00, 0x0000FF, 0xFF00FF, 0x00FFFF, 0xFFFFFF};
-
-    const struct {
-        std::vector<Bitmap> bitmaps;
-        int width, height;
-    } kinds[] = {
+    const std::tuple<std::vector<Bitmap>, int, int> kinds[] = {
         {figures(), 130, 130},
         {series("bg0", 1), 135, 135},
         {{load("bg02"), load("bg04"), load("bg06"), load("bg08")}, 96, 96},
@@ -167,8 +163,8 @@ TEST(Art, FilesHaveTheFormThatTheProgramReadsAndAreStillDrawnSo) {
     };
 
     std::size_t count = 0;
-    for (const auto& kind : kinds) {
-        for (const Bitmap& bitmap : kind.bitmaps) {
+    for (const auto& [bitmaps, width, height] : kinds) {
+        for (const Bitmap& bitmap : bitmaps) {
             SCOPED_TRACE(bitmap.name);
             const bool tile = bitmap.name.starts_with("bg") && bitmap.name != "bg01";
             const Bytes bytes = readFile(bitmap.name);
@@ -177,8 +173,8 @@ TEST(Art, FilesHaveTheFormThatTheProgramReadsAndAreStillDrawnSo) {
             EXPECT_EQ(number(bytes, 14), 40U);
             EXPECT_EQ(number(bytes, 26), 1U + bitmap.bits * 65536U);
             EXPECT_EQ(number(bytes, 30), 0U);
-            EXPECT_EQ(bitmap.width, kind.width);
-            EXPECT_EQ(bitmap.height, kind.height);
+            EXPECT_EQ(bitmap.width, width);
+            EXPECT_EQ(bitmap.height, height);
             EXPECT_EQ(bitmap.bits, tile ? 8U : 4U);
             EXPECT_EQ(bitmap.colours.size(), tile ? 256U : 16U);
             EXPECT_EQ(number(bytes, 46), bitmap.name > "bg06" && tile ? 256U : 0U);

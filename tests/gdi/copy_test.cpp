@@ -7,21 +7,16 @@
 using namespace test;
 
 TEST(Copy, CombinesTargetAndSource) {
-    const struct {
-        const char* name;
-        DWORD operation;
-        Rows expected;
-    } cases[] = {
+    const std::tuple<const char*, DWORD, Rows> cases[] = {
         {"copy", SRCCOPY, {".WRYB", ".WRYB", ".WRYB"}},
         {"and", SRCAND, {".....", ".WRYB", ".RRR."}},
         {"or", SRCPAINT, {".WRYB", "WWWWW", "RWRYM"}},
     };
-
-    for (const auto& c : cases) {
+    for (const auto& [name, operation, expected] : cases) {
         const Memory from({".WRYB", ".WRYB", ".WRYB"});
         const Memory to({".....", "WWWWW", "RRRRR"});
-        EXPECT_TRUE(BitBlt(to.dc, 0, 0, 5, 3, from.dc, 0, 0, c.operation));
-        EXPECT_EQ(to.text(), c.expected) << c.name;
+        EXPECT_TRUE(BitBlt(to.dc, 0, 0, 5, 3, from.dc, 0, 0, operation));
+        EXPECT_EQ(to.text(), expected) << name;
         constexpr DWORD another = 0x00550009;
         EXPECT_FALSE(BitBlt(to.dc, 0, 0, 5, 3, from.dc, 0, 0, another));
         EXPECT_FALSE(StretchBlt(to.dc, 0, 0, 5, 3, from.dc, 0, 0, 5, 2, another));
@@ -108,19 +103,15 @@ TEST(Copy, KeepsToTheClipOfAWindowAndTellsItFirst) {
 }
 
 TEST(Copy, WithinOneBitmapGivesWhatStoodBefore) {
-    const struct {
-        int x, y;
-        Rows expected;
-    } cases[] = {
+    const std::tuple<int, int, Rows> cases[] = {
         {1, 0, {"RRGB", "WWMx", "ccRG"}},  {-1, 0, {"GBYY", "MxYY", "RGBB"}},
         {0, 1, {"RGBY", "RGBY", "WMxY"}},  {0, -1, {"WMxY", "cRGB", "cRGB"}},
         {1, -1, {"RWMx", "WcRG", "cRGB"}}, {-1, 1, {"RGBY", "GBYY", "MxYB"}},
     };
-
-    for (const auto& c : cases) {
+    for (const auto& [x, y, expected] : cases) {
         const Memory memory({"RGBY", "WMxY", "cRGB"});
-        BitBlt(memory.dc, c.x, c.y, 4, 3, memory.dc, 0, 0, SRCCOPY);
-        EXPECT_EQ(memory.text(), c.expected) << c.x << "," << c.y;
+        BitBlt(memory.dc, x, y, 4, 3, memory.dc, 0, 0, SRCCOPY);
+        EXPECT_EQ(memory.text(), expected) << x << "," << y;
     }
     const Memory memory({"RG.."});
     BitBlt(memory.dc, 1, 0, 3, 1, memory.dc, 0, 0, SRCPAINT);

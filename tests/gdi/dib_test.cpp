@@ -34,11 +34,8 @@ HBITMAP make(const Info& info, const Bytes& rows) {
 } // namespace
 
 TEST(Dib, ReadsEachDepthFromTheBottomUp) {
-    const struct {
-        Info info;
-        Bytes rows; // each filled up to four bytes, here with 9
-        Rows expected;
-    } cases[] = {
+    // Each row is filled up to four bytes, here with 9.
+    const std::tuple<Info, Bytes, Rows> cases[] = {
         {{3, 2, 1}, {0x40, 9, 9, 9, 0xA0, 9, 9, 9}, {"GRG", "RGR"}},
         {{3, 2, 4}, {0x01, 0x2F, 9, 9, 0x21, 0x0F, 9, 9}, {"BGR", "RGB"}},
         {{5, 2, 8}, {0, 1, 2, 1, 0, 9, 9, 9, 2, 2, 1, 0, 0, 9, 9, 9}, {"BBGRR", "RGBGR"}},
@@ -46,10 +43,9 @@ TEST(Dib, ReadsEachDepthFromTheBottomUp) {
         {{1, -2, 8}, {0, 9, 9, 9, 1, 9, 9, 9}, {"R", "G"}}, // from the top down
         {{4, 1, 8}, {2, 3, 255, 0}, {"B..R"}},              // black beyond the colours
     };
-
-    for (const auto& c : cases) {
-        HBITMAP bitmap = make(c.info, c.rows);
-        EXPECT_EQ(textOf(bitmap), c.expected) << c.info.head.biBitCount;
+    for (const auto& [info, rows, expected] : cases) {
+        HBITMAP bitmap = make(info, rows);
+        EXPECT_EQ(textOf(bitmap), expected) << info.head.biBitCount;
         DeleteObject(bitmap);
     }
 }

@@ -7,21 +7,17 @@
 using namespace test;
 
 TEST(Bevel, DrawsRingsInwards) {
-    const struct {
-        int width;
-        Rows expected;
-    } cases[] = {
+    const std::pair<int, Rows> cases[] = {
         {0, plain(7, 6, 'G')},
         {1, {"GGGGGGG", "GxxxxWG", "GxGGGWG", "GxGGGWG", "GxGWWWG", "GGGGGGG"}},
         {-1, {"GGGGGGG", "GWWWWxG", "GWGGGxG", "GWGGGxG", "GWGxxxG", "GGGGGGG"}},
         {2, {"GGGGGGG", "GxxxxWG", "GxxxWWG", "GxxGWWG", "GxGWWWG", "GGGGGGG"}},
     };
-
-    for (const auto& c : cases) {
+    for (const auto& [width, expected] : cases) {
         const Memory memory(plain(7, 6, 'G'));
         const auto before = liveObjects();
-        DrawBevel(memory.dc, 1, 1, 6, 5, c.width);
-        EXPECT_EQ(memory.text(), c.expected) << c.width;
+        DrawBevel(memory.dc, 1, 1, 6, 5, width);
+        EXPECT_EQ(memory.text(), expected) << width;
         EXPECT_EQ(liveObjects(), before);
     }
 }

@@ -17,10 +17,7 @@ void drawLine(HDC dc, POINT from, POINT to) {
 } // namespace
 
 TEST(Line, LeavesOutItsEndPoint) {
-    const struct {
-        POINT from, to;
-        Rows expected;
-    } cases[] = {
+    const std::tuple<POINT, POINT, Rows> cases[] = {
         {{0, 1}, {3, 1}, {".....", "WWW..", ".....", "....."}},
         {{3, 1}, {0, 1}, {".....", ".WWW.", ".....", "....."}},
         {{2, 3}, {2, 0}, {".....", "..W..", "..W..", "..W.."}},
@@ -34,12 +31,11 @@ TEST(Line, LeavesOutItsEndPoint) {
         {{INT_MIN, 0}, {INT_MAX, 0}, {"WWWWW", ".....", ".....", "....."}},
         {{INT_MAX, INT_MAX}, {INT_MIN, INT_MIN}, {"W....", ".W...", "..W..", "...W."}},
     };
-
-    for (const auto& c : cases) {
+    for (const auto& [from, to, expected] : cases) {
         const Memory memory(plain(5, 4, '.'));
-        drawLine(memory.dc, c.from, c.to);
-        EXPECT_EQ(memory.text(), c.expected)
-            << c.from.x << "," << c.from.y << " to " << c.to.x << "," << c.to.y;
+        drawLine(memory.dc, from, to);
+        EXPECT_EQ(memory.text(), expected)
+            << from.x << "," << from.y << " to " << to.x << "," << to.y;
     }
 }
 

@@ -130,32 +130,25 @@ TEST_F(Sprites, MoveWritesTheNewPlaceThenTheOldAndShowsNothingUnfinished) {
 }
 
 TEST_F(Sprites, MoveInFromAnySideWithNothingSaved) {
-    const struct {
-        POINT from, to;
-    } cases[] = {{{-3, 2}, {-1, 2}}, {{8, 2}, {6, 2}}, {{3, -3}, {3, -1}}, {{3, 6}, {3, 4}}};
-
-    for (const auto& c : cases) {
+    const std::pair<POINT, POINT> cases[] = {
+        {{-3, 2}, {-1, 2}}, {{8, 2}, {6, 2}}, {{3, -3}, {3, -1}}, {{3, 6}, {3, 4}}};
+    for (const auto& [from, to] : cases) {
         SpriteFree(&sprite_);
         stage = std::make_unique<TestSurface>(backdrop);
-        sprite_.x = c.from.x;
-        sprite_.y = c.from.y;
+        sprite_.x = from.x;
+        sprite_.y = from.y;
         stamp(cross_);
-        SpriteMove(nullptr, &sprite_, c.to.x, c.to.y);
-        EXPECT_EQ(stage->text(), with(cross, c.to.x, c.to.y)) << c.from.x;
+        SpriteMove(nullptr, &sprite_, to.x, to.y);
+        EXPECT_EQ(stage->text(), with(cross, to.x, to.y)) << from.x;
         EXPECT_EQ(restored(), backdrop);
     }
 }
 
 TEST_F(Sprites, HitTestCountsLeftAndTopEdges) {
     put(ring_, 2, 1);
-
-    const struct {
-        POINT point;
-        BOOL hit;
-    } cases[] = {{{2, 1}, TRUE},  {{4, 3}, TRUE},  {{5, 1}, FALSE},
-                 {{2, 4}, FALSE}, {{1, 1}, FALSE}, {{2, 0}, FALSE}};
-
-    for (const auto& c : cases) {
-        EXPECT_EQ(SpriteHitTest(&sprite_, c.point), c.hit) << c.point.x << "," << c.point.y;
+    const std::pair<POINT, BOOL> cases[] = {{{2, 1}, TRUE},  {{4, 3}, TRUE},  {{5, 1}, FALSE},
+                                            {{2, 4}, FALSE}, {{1, 1}, FALSE}, {{2, 0}, FALSE}};
+    for (const auto& [point, hit] : cases) {
+        EXPECT_EQ(SpriteHitTest(&sprite_, point), hit) << point.x << "," << point.y;
     }
 }

@@ -30,26 +30,18 @@ Lines wrapped(const QString& text, const QString& widest) {
 } // namespace
 
 TEST(Lines, BreakAtReturnFeedAndPair) {
-    const struct {
-        const char* text;
-        Lines expected;
-    } cases[] = {
+    const std::pair<const char*, Lines> cases[] = {
         {"a\rb\nc", {"a", "b", "c"}}, {"a\r\nb", {"a", "b"}}, {"a\n\rb", {"a", "", "b"}},
         {"a\r\rb", {"a", "", "b"}},   {"a\r", {"a"}},         {"\ra", {"", "a"}},
     };
-
-    for (const auto& c : cases) {
-        const QString text = QString::fromLatin1(c.text);
-        EXPECT_EQ(pieces(text, splitLines(text)), c.expected) << c.text;
+    for (const auto& [bytes, expected] : cases) {
+        const QString text = QString::fromLatin1(bytes);
+        EXPECT_EQ(pieces(text, splitLines(text)), expected) << bytes;
     }
 }
 
 TEST(Lines, WrapAtBlanksWhichBelongToNoLineElseWithinAWord) {
-    const struct {
-        const char* text;
-        const char* widest;
-        Lines expected;
-    } cases[] = {
+    const std::tuple<const char*, const char*, Lines> cases[] = {
         {"one two", "one tw", {"one", "two"}},
         {"one   two", "one t", {"one", "two"}},
         {"one two ", "one two", {"one two"}},
@@ -61,10 +53,9 @@ TEST(Lines, WrapAtBlanksWhichBelongToNoLineElseWithinAWord) {
         {"mmm mm", "mm", {"mm", "m", "mm"}},
         {"mm", "", {"m", "m"}}, // a character at least
     };
-
-    for (const auto& c : cases) {
-        EXPECT_EQ(wrapped(QString::fromLatin1(c.text), QString::fromLatin1(c.widest)), c.expected)
-            << c.text << " within " << c.widest;
+    for (const auto& [text, widest, expected] : cases) {
+        EXPECT_EQ(wrapped(QString::fromLatin1(text), QString::fromLatin1(widest)), expected)
+            << text << " within " << widest;
     }
 }
 
@@ -76,18 +67,14 @@ TEST(Encoding, IsWindows1252WithItsHolesAsControls) {
 }
 
 TEST(PlainText, ReadsAmpersands) {
-    const struct {
-        const char* bytes;
-        const char* text;
-        std::vector<qsizetype> underlined;
-    } cases[] = {{"a && b", "a & b", {}}, {"end&", "end", {}}, {"&a&b", "ab", {0, 1}}};
-
-    for (const auto& c : cases) {
-        const std::size_t length = std::string(c.bytes).size();
-        const PlainText plain = readText(c.bytes, length, true);
-        EXPECT_EQ(plain.text.toStdString(), c.text);
-        EXPECT_EQ(plain.underlined, c.underlined) << c.bytes;
-        EXPECT_EQ(readText(c.bytes, length, false).text.toStdString(), c.bytes);
+    const std::tuple<const char*, const char*, std::vector<qsizetype>> cases[] = {
+        {"a && b", "a & b", {}}, {"end&", "end", {}}, {"&a&b", "ab", {0, 1}}};
+    for (const auto& [bytes, text, underlined] : cases) {
+        const std::size_t length = std::string(bytes).size();
+        const PlainText plain = readText(bytes, length, true);
+        EXPECT_EQ(plain.text.toStdString(), text);
+        EXPECT_EQ(plain.underlined, underlined) << bytes;
+        EXPECT_EQ(readText(bytes, length, false).text.toStdString(), bytes);
     }
 }
 

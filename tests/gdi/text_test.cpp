@@ -120,19 +120,16 @@ TEST(Text, TakesAsManyCharactersAsAskedFor) {
 }
 
 TEST(Text, FontsDifferInSizeAndWeight) {
-    const struct {
-        HFONT font;
-        int width, height; // of "Dorbo"
-    } cases[] = {
+    // The width and height of "Dorbo" in each font.
+    const std::tuple<HFONT, int, int> cases[] = {
         {makeFont(-28), 2 * widthOf("Dorbo"), 2 * lineHeight()},
         {makeFont(14), widthOf("Dorbo") - 4, 14}, // the height of the cells
         {makeFont(-14, 700), widthOf("Dorbo") + 4, lineHeight()},
     };
-
-    for (const auto& c : cases) {
-        EXPECT_NEAR(sizeOf("Dorbo", c.font).cx, c.width, 3) << c.width;
-        EXPECT_NEAR(sizeOf("Dorbo", c.font).cy, c.height, 1) << c.width;
-        EXPECT_TRUE(DeleteObject(c.font));
+    for (const auto& [font, width, height] : cases) {
+        EXPECT_NEAR(sizeOf("Dorbo", font).cx, width, 3) << width;
+        EXPECT_NEAR(sizeOf("Dorbo", font).cy, height, 1) << width;
+        EXPECT_TRUE(DeleteObject(font));
     }
     EXPECT_FALSE(makeFont(-14, 400, 1));
 }

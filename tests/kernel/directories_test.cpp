@@ -24,19 +24,14 @@ class Directories : public ScratchDirectory {
 };
 
 TEST(Pattern, FitsNames) {
-    const struct {
-        const char* pattern;
-        const char* fits;
-        const char* doesNot;
-    } cases[] = {
+    const std::tuple<const char*, const char*, const char*> cases[] = {
         {"*.zkt", "a.ZKT", "a.zkt1"}, {"*.ZKT", ".zkt", "zkt"}, {"*.zkt", "a.zkt.zkt", "a.zk"},
         {"a?c", "abc", "ac"},         {"ab??", "AB", "a"},      {"a*b*c", "a-b-b-c", "acb"},
         {"plain", "Plain", "plain1"},
     };
-
-    for (const auto& one : cases) {
-        EXPECT_TRUE(seam::matchesPattern(one.fits, one.pattern)) << one.pattern;
-        EXPECT_FALSE(seam::matchesPattern(one.doesNot, one.pattern)) << one.pattern;
+    for (const auto& [pattern, fits, doesNot] : cases) {
+        EXPECT_TRUE(seam::matchesPattern(fits, pattern)) << pattern;
+        EXPECT_FALSE(seam::matchesPattern(doesNot, pattern)) << pattern;
     }
     EXPECT_TRUE(seam::matchesPattern("noextension", "*.*"));
     std::string stars = "b"; // takes no time
@@ -72,12 +67,7 @@ TEST_F(Directories, TellTheKindAndSizeOfEachEntry) {
     std::filesystem::create_symlink("folder", "link");
     std::filesystem::create_symlink("nowhere", "broken");
     setMode("locked", 0444);
-
-    const struct {
-        const char* name;
-        DWORD attributes;
-        DWORD size;
-    } cases[] = {
+    const std::tuple<const char*, DWORD, DWORD> cases[] = {
         {"plain", FILE_ATTRIBUTE_ARCHIVE, 5},
         {"locked", FILE_ATTRIBUTE_ARCHIVE | FILE_ATTRIBUTE_READONLY, 0},
         {".dot", FILE_ATTRIBUTE_ARCHIVE | FILE_ATTRIBUTE_HIDDEN, 0},
@@ -85,12 +75,11 @@ TEST_F(Directories, TellTheKindAndSizeOfEachEntry) {
         {"link", FILE_ATTRIBUTE_DIRECTORY, 0},
         {"broken", FILE_ATTRIBUTE_ARCHIVE, 0},
     };
-
-    for (const auto& one : cases) {
+    for (const auto& [name, attributes, size] : cases) {
         WIN32_FIND_DATAA found{};
-        FindClose(FindFirstFileA(one.name, &found));
-        EXPECT_EQ(found.dwFileAttributes, one.attributes) << one.name;
-        EXPECT_EQ(found.nFileSizeLow, one.size) << one.name;
+        FindClose(FindFirstFileA(name, &found));
+        EXPECT_EQ(found.dwFileAttributes, attributes) << name;
+        EXPECT_EQ(found.nFileSizeLow, size) << name;
     }
 }
 

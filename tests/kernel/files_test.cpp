@@ -26,11 +26,7 @@ TEST_F(Files, OnlyRegularFilesOpenAndNoneWaits) {
     mkdir("folder", 0755);
     mkfifo("pipe", 0666);
     std::filesystem::create_symlink("circle", "circle");
-
-    const struct {
-        const char* name;
-        int read, readWrite, create;
-    } cases[] = {
+    const std::tuple<const char*, int, int, int> cases[] = {
         {"PLAIN.ZKT", 0, 0, 0},
         {"locked.zkt", 0, EACCES, EACCES},
         {"folder", EISDIR, EISDIR, EISDIR},
@@ -43,11 +39,10 @@ TEST_F(Files, OnlyRegularFilesOpenAndNoneWaits) {
         {"missing", ENOENT, ENOENT, 0},
         {"", ENOENT, ENOENT, ENOENT},
     };
-
-    for (const auto& one : cases) {
-        EXPECT_EQ(errorOf(one.name, OF_READ), one.read) << one.name;
-        EXPECT_EQ(errorOf(one.name, OF_READWRITE), one.readWrite) << one.name;
-        EXPECT_EQ(errorOf(one.name, OF_CREATE | OF_PROMPT | OF_CANCEL), one.create) << one.name;
+    for (const auto& [name, read, readWrite, create] : cases) {
+        EXPECT_EQ(errorOf(name, OF_READ), read) << name;
+        EXPECT_EQ(errorOf(name, OF_READWRITE), readWrite) << name;
+        EXPECT_EQ(errorOf(name, OF_CREATE | OF_PROMPT | OF_CANCEL), create) << name;
     }
     EXPECT_EQ(textOf("locked.zkt"), "x");
     EXPECT_EQ(textOf("Plain.zkt"), "");

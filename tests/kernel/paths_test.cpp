@@ -18,11 +18,7 @@ TEST(Drives, AreTheMountedMediaOfTheUserInTheOrderOfTheirBytes) {
         many += mounted(root);
         letters += i < 23 ? static_cast<char>('D' + i) + ("=" + root + " ") : "";
     }
-
-    const struct {
-        std::string mountInfo;
-        std::string expected;
-    } cases[] = {
+    const std::pair<std::string, std::string> cases[] = {
         {"", "C= "},
         {mounted("/home") + mounted("/media/ann/b") + mounted("/run/media/ann/a") +
              mounted("/media/ann/B") + mounted("/media/ann/b"),
@@ -32,23 +28,18 @@ TEST(Drives, AreTheMountedMediaOfTheUserInTheOrderOfTheirBytes) {
         {"short line\n\n" + mounted("/media/ann/x"), "C= D=/media/ann/x "},
         {many, letters}, // up to Z
     };
-
-    for (const auto& one : cases) {
+    for (const auto& [mountInfo, expected] : cases) {
         std::string told;
-        for (const seam::Drive& drive : seam::drivesFrom(one.mountInfo, "ann")) {
+        for (const seam::Drive& drive : seam::drivesFrom(mountInfo, "ann")) {
             told += drive.letter + ("=" + drive.root + " ");
         }
-        EXPECT_EQ(told, one.expected);
+        EXPECT_EQ(told, expected);
     }
 }
 
 TEST(PlatformPath, TellsEachPathByTheLetterOfItsMedium) {
     const std::vector<seam::Drive> drives{{'C', ""}, {'D', "/media/ann/usb"}};
-
-    const struct {
-        std::string path;
-        std::string expected;
-    } cases[] = {
+    const std::pair<std::string, std::string> cases[] = {
         {"/", "C:\\"},
         {"/media/ann/usb", "D:\\"},
         {"/media/ann/usb/Toons/a", "D:\\Toons\\a"},
@@ -56,9 +47,8 @@ TEST(PlatformPath, TellsEachPathByTheLetterOfItsMedium) {
         {"/home/na\\me/x", ""},
         {"", ""},
     };
-
-    for (const auto& one : cases) {
-        EXPECT_EQ(seam::platformPath(one.path, drives), one.expected) << one.path;
+    for (const auto& [path, expected] : cases) {
+        EXPECT_EQ(seam::platformPath(path, drives), expected) << path;
     }
 }
 
@@ -71,12 +61,10 @@ TEST_F(Paths, AreFoundByTheExactNameFirstThenWhateverTheCase) {
     std::filesystem::create_symlink("UP/Mid", "link");
     const std::string here = root_.string();
     const std::vector<seam::Drive> drives{{'C', ""}, {'D', here + "/usb"}};
+    // The current directory behind the root, a path, and what it finds behind the root: "!" stands
+    // for an error, "+" in front of what is missing.
 
-    const struct {
-        std::string directory; // the current one, behind the root
-        std::string path;
-        std::string expected; // behind the root; "!" for an error, "+" in front of what is missing
-    } cases[] = {
+    const std::tuple<std::string, std::string, std::string> cases[] = {
         {"", "Toons\\intro.ZKT", "/Toons/Intro.zkt"},
         {"", "TOONS\\intro.zkt", "/Toons/Intro.zkt"}, // the first in the order of bytes
         {"", "toons\\intro.zkt", "+/toons/intro.zkt"},
@@ -100,15 +88,13 @@ TEST_F(Paths, AreFoundByTheExactNameFirstThenWhateverTheCase) {
         {"/usb/deep", "\\deep", "/usb/deep"},
         {"/usb/deep", "..\\..\\..", "/usb"},
     };
-
-    for (const auto& one : cases) {
-        const seam::PathLookup found = seam::lookUpPath(one.path, drives, here + one.directory);
+    for (const auto& [directory, path, expected] : cases) {
+        const seam::PathLookup found = seam::lookUpPath(path, drives, here + directory);
         std::string told = found.path;
         if (told.starts_with(here)) {
             told.erase(0, here.size());
         }
-        EXPECT_EQ(found.error != 0 ? "!" : (found.exists ? "" : "+") + told, one.expected)
-            << one.path;
+        EXPECT_EQ(found.error != 0 ? "!" : (found.exists ? "" : "+") + told, expected) << path;
     }
     EXPECT_EQ(seam::lookUpPath("x", drives, std::nullopt).error, ENOENT);
     EXPECT_EQ(seam::lookUpPath("C:\\", drives, std::nullopt).path, "/");

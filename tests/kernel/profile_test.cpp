@@ -32,10 +32,7 @@ class Profile : public ScratchDirectory {
 };
 
 TEST(ProfileText, GivesTheValueOfAKey) {
-    const struct {
-        std::string text;
-        const char* expected;
-    } cases[] = {
+    const std::pair<std::string, const char*> cases[] = {
         {"k=v", "none"},
         {"[S]\nK=v", "v"},
         {"\xEF\xBB\xBF[s]\nk=v", "v"},
@@ -50,18 +47,14 @@ TEST(ProfileText, GivesTheValueOfAKey) {
         {std::string("\0\0[s]\n\0\n[s]\nk=v", 15), "v"},
         {"[s]\n" + std::string(1 << 20, 'x') + "\nk=v", "v"},
     };
-
-    for (const auto& one : cases) {
-        EXPECT_EQ(seam::profileValue(one.text, "s", "k").value_or("none"), one.expected)
-            << one.text.substr(0, 40);
+    for (const auto& [text, expected] : cases) {
+        EXPECT_EQ(seam::profileValue(text, "s", "k").value_or("none"), expected)
+            << text.substr(0, 40);
     }
 }
 
 TEST(ProfileText, TakesAValueInAndKeepsEverythingElse) {
-    const struct {
-        std::string text;
-        std::string expected;
-    } cases[] = {
+    const std::pair<std::string, std::string> cases[] = {
         {"", "[s]\r\nk=v\r\n"},
         {"[a]\r\nx=1", "[a]\r\nx=1\r\n[s]\r\nk=v\r\n"},
         {"[s]\r\nk=old\r\nm=1\r\n", "[s]\r\nk=v\r\nm=1\r\n"},
@@ -71,9 +64,8 @@ TEST(ProfileText, TakesAValueInAndKeepsEverythingElse) {
         {"[s]\nm=1\n[s]\nk=2\n", "[s]\nm=1\nk=v\r\n[s]\nk=2\n"},
         {std::string("\0\xff junk", 7), std::string("\0\xff junk\r\n[s]\r\nk=v\r\n", 19)},
     };
-
-    for (const auto& one : cases) {
-        EXPECT_EQ(seam::profileWithValue(one.text, "s", "k", "v"), one.expected) << one.text;
+    for (const auto& [text, expected] : cases) {
+        EXPECT_EQ(seam::profileWithValue(text, "s", "k", "v"), expected) << text;
     }
     for (const char* value : {"", " ", "a ", "\"a\"", "'a'", "\"", "[s]", "=", " \"a\" ", "'"}) {
         const std::string text = seam::profileWithValue("", "s", "k", value);
@@ -82,20 +74,16 @@ TEST(ProfileText, TakesAValueInAndKeepsEverythingElse) {
 }
 
 TEST_F(Profile, ReadsNumbersThatWrapAtThirtyTwoBits) {
-    const struct {
-        const char* text;
-        UINT expected;
-    } cases[] = {{"4294967295", 4294967295U},
-                 {"4294967297", 1},
-                 {"12abc", 12},
-                 {"", 0},
-                 {"-5", 0},
-                 {"\" 5\"", 0},
-                 {"'5'", 5}};
-
-    for (const auto& one : cases) {
-        make(ini, heading + "k=" + one.text);
-        EXPECT_EQ(GetPrivateProfileIntA(section, "K", 77, file), one.expected) << one.text;
+    const std::pair<const char*, UINT> cases[] = {{"4294967295", 4294967295U},
+                                                  {"4294967297", 1},
+                                                  {"12abc", 12},
+                                                  {"", 0},
+                                                  {"-5", 0},
+                                                  {"\" 5\"", 0},
+                                                  {"'5'", 5}};
+    for (const auto& [text, expected] : cases) {
+        make(ini, heading + "k=" + text);
+        EXPECT_EQ(GetPrivateProfileIntA(section, "K", 77, file), expected) << text;
     }
     EXPECT_EQ(GetPrivateProfileIntA(section, "missing", -1, file), 4294967295U);
 }
@@ -182,17 +170,12 @@ TEST_F(Profile, IsLeftAloneWhereItCannotBeWritten) {
 }
 
 TEST_F(Profile, RefusesWhatItCouldNotFindAgain) {
-    const struct {
-        const char* section;
-        const char* key;
-        const char* value;
-    } cases[] = {{"s", "k", "a\nb"},  {"s", "a=b", "v"},   {"s", "", "v"},
-                 {"s", " k", "v"},    {"s]", "k", "v"},    {"s", "[k]", "v"},
-                 {nullptr, "k", "v"}, {"s", nullptr, "v"}, {"s", "k", nullptr}};
-
-    for (const auto& one : cases) {
-        EXPECT_FALSE(WritePrivateProfileStringA(one.section, one.key, one.value, file));
+    for (const char* key : {"a=b", "", " k", "[k]", "k\r"}) {
+        EXPECT_FALSE(write(key, "v")) << key;
     }
+    EXPECT_FALSE(write("k", "a\nb"));
+    EXPECT_FALSE(write("k", nullptr));
+    EXPECT_FALSE(WritePrivateProfileStringA("s]", "k", "v", file));
     EXPECT_FALSE(std::filesystem::exists("dorbo"));
 }
 

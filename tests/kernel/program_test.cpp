@@ -19,21 +19,16 @@ std::string bytesOf(HRSRC resource) {
 }
 
 TEST(Resource, IsFoundByNameOrNumberWhateverTheCase) {
-    const struct {
-        ResourceName name;
-        ResourceName type;
-        const char* expected;
-    } cases[] = {
+    const std::tuple<ResourceName, ResourceName, const char*> cases[] = {
         {"TINY", RT_BITMAP, "INFOHEADER"}, // without the header of its file
         {2003, RT_DIALOG, "a dialog"},     {"aBOUT", RT_DIALOG, "a dialog"},
         {"tiny", RT_DIALOG, "none"},       {"tin", RT_BITMAP, "none"},
         {"", RT_BITMAP, "none"},           {"../dialog/2003", RT_BITMAP, "none"},
         {"headless", RT_BITMAP, "none"},
     };
-
-    for (const auto& one : cases) {
-        const std::string told = one.name.text != nullptr ? one.name.text : "a number";
-        EXPECT_EQ(bytesOf(FindResourceA(nullptr, one.name, one.type)), one.expected) << told;
+    for (const auto& [name, type, expected] : cases) {
+        const std::string told = name.text != nullptr ? name.text : "a number";
+        EXPECT_EQ(bytesOf(FindResourceA(nullptr, name, type)), expected) << told;
     }
     seam::HandleCounts after;
     seam::countKernelHandles(after);
@@ -42,18 +37,13 @@ TEST(Resource, IsFoundByNameOrNumberWhateverTheCase) {
 }
 
 TEST(StringTable, GivesTextsCutToTheBuffer) {
-    const struct {
-        UINT id;
-        int size;
-        std::string expected;
-    } cases[] = {{1, 11, "First text"},       {1, 10, "First tex"},   {1, 1, ""},
-                 {2, 30, "one\rtwo \\r \\x"}, {65535, 30, "caf\xe9"}, {4, 30, ""}};
-
-    for (const auto& one : cases) {
+    const std::tuple<UINT, int, std::string> cases[] = {
+        {1, 11, "First text"},       {1, 10, "First tex"},   {1, 1, ""},
+        {2, 30, "one\rtwo \\r \\x"}, {65535, 30, "caf\xe9"}, {4, 30, ""}};
+    for (const auto& [id, size, expected] : cases) {
         char buffer[30] = "untouched";
-        EXPECT_EQ(LoadStringA(nullptr, one.id, buffer, one.size),
-                  static_cast<int>(one.expected.size()));
-        EXPECT_EQ(buffer, one.expected);
+        EXPECT_EQ(LoadStringA(nullptr, id, buffer, size), static_cast<int>(expected.size()));
+        EXPECT_EQ(buffer, expected);
     }
     EXPECT_EQ(LoadStringA(nullptr, 1, nullptr, 0), 0);
     const seam::StringTable table =
@@ -62,16 +52,13 @@ TEST(StringTable, GivesTextsCutToTheBuffer) {
 }
 
 TEST(Program, PutsItsArgumentsTogether) {
-    const struct {
-        std::vector<const char*> arguments;
-        const char* expected;
-    } cases[] = {{{}, "\"\""},
-                 {{"dorbo", "", "a b"}, "\"dorbo\"  a b"},
-                 {{"/a\" /s \"/dorbo", "-c"}, "\"/a /s /dorbo\" -c"}};
-
-    for (const auto& one : cases) {
-        SetCommandLineArguments(static_cast<int>(one.arguments.size()), one.arguments.data());
-        EXPECT_STREQ(GetCommandLineA(), one.expected);
+    const std::pair<std::vector<const char*>, const char*> cases[] = {
+        {{}, "\"\""},
+        {{"dorbo", "", "a b"}, "\"dorbo\"  a b"},
+        {{"/a\" /s \"/dorbo", "-c"}, "\"/a /s /dorbo\" -c"}};
+    for (const auto& [arguments, expected] : cases) {
+        SetCommandLineArguments(static_cast<int>(arguments.size()), arguments.data());
+        EXPECT_STREQ(GetCommandLineA(), expected);
     }
 }
 

@@ -12,19 +12,16 @@ using Positions = std::vector<LONG>;
 class FrameStoreTest : public test::ToonTest {};
 
 TEST_F(FrameStoreTest, IndicesAreHeldToTheStore) {
-    const struct {
-        LONG frames, index;
-        int get, put;
-    } cases[] = {{3, -1, 0, 0}, {3, 0, 1, 1},         {3, 1, 1, 1},         {3, 2, 0, 1},
-                 {3, 3, 0, 0},  {3, INT32_MAX, 0, 0}, {3, INT32_MIN, 0, 0}, {0, 0, 0, 0}};
-
-    for (const auto& c : cases) {
-        makeToon(c.frames);
+    const std::tuple<LONG, LONG, int, int> cases[] = {
+        {3, -1, 0, 0}, {3, 0, 1, 1},         {3, 1, 1, 1},         {3, 2, 0, 1},
+        {3, 3, 0, 0},  {3, INT32_MAX, 0, 0}, {3, INT32_MIN, 0, 0}, {0, 0, 0, 0}};
+    for (const auto& [frames, index, get, put] : cases) {
+        makeToon(frames);
         FrameCount = 2; // fewer than the store has
         ToonFrame frame{7, 7, 7, 7, 7, "as it was", 7};
-        EXPECT_EQ(FrameGet(c.index, &frame), c.get) << c.index;
-        EXPECT_EQ(frame.x == 7, c.get == 0) << c.index;
-        EXPECT_EQ(FramePut(c.index, &frame), c.put) << c.index;
+        EXPECT_EQ(FrameGet(index, &frame), get) << index;
+        EXPECT_EQ(frame.x == 7, get == 0) << index;
+        EXPECT_EQ(FramePut(index, &frame), put) << index;
     }
     FrameStoreFree();
     EXPECT_EQ(FrameStoreGrow() + FrameStoreDelete(0) + FrameStoreInsert(0), 0);

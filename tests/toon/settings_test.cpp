@@ -77,11 +77,7 @@ TEST_F(Settings, MissingSwitchesKeepWhatMemoryHoldsAndAMissingOdometerIsZero) {
 
 TEST_F(Settings, ADirectoryGetsItsBackslashOnceOrBecomesOne) {
     const std::string fits(126, 'd');
-
-    const struct {
-        std::string stored;
-        std::string loaded;
-    } cases[] = {
+    const std::pair<std::string, std::string> cases[] = {
         {"C:\\Toons", "C:\\Toons\\"},
         {"C:\\Toons\\", "C:\\Toons\\"},
         {"", "\\"},
@@ -94,11 +90,10 @@ TEST_F(Settings, ADirectoryGetsItsBackslashOnceOrBecomesOne) {
         {fits + "\\and more\\", "\\"}, // would be cut to another directory
         {std::string(100000, 'd'), "\\"},
     };
-
-    for (const auto& c : cases) {
-        write("Directory=" + c.stored + "\r\n");
+    for (const auto& [stored, loaded] : cases) {
+        write("Directory=" + stored + "\r\n");
         SettingsLoad();
-        EXPECT_EQ(Directory, c.loaded);
+        EXPECT_EQ(Directory, loaded);
     }
     std::filesystem::remove(file);
     for (const std::size_t length : {126U, 127U, 128U, 200U}) { // of a current directory

@@ -103,11 +103,7 @@ TEST_F(ToonText, MistakesAreToldWithTheirLine) {
     const std::string quotes = "line 1: a text stands in quotes";
     const std::string escapes = "line 1: only \\r, \\\", \\\\ and \\xNN stand for something else";
     const std::string foreign = "line 1: a character that Windows-1252 hasn't got";
-
-    const struct {
-        std::string text;
-        std::string error;
-    } cases[] = {
+    const std::pair<std::string, std::string> cases[] = {
         {"speed 3x", "line 1: speed takes 1 number"},
         {"speed 3 4", "line 1: too much behind speed"},
         {"speed 2147483648", "line 1: speed takes 1 number"},
@@ -125,32 +121,26 @@ TEST_F(ToonText, MistakesAreToldWithTheirLine) {
         {"frame\ntext \"" + std::string(71, 'x') + "\"",
          "line 2: text is longer than its 70 bytes"},
     };
-
-    for (const auto& c : cases) {
-        EXPECT_EQ(TextToToon(c.text).error, c.error) << c.text;
-        EXPECT_EQ(TextToToon(c.text).bytes, "") << c.text;
+    for (const auto& [text, error] : cases) {
+        EXPECT_EQ(TextToToon(text).error, error) << text;
+        EXPECT_EQ(TextToToon(text).bytes, "") << text;
     }
 }
 
 TEST_F(ToonText, WhatTheEditorWouldNotMakeIsToldButMade) {
-    const std::string text(70, 'x');
-
-    const struct {
-        std::string text;
-        const char* warning;
-    } cases[] = {
+    const std::string words(70, 'x');
+    const std::pair<std::string, const char*> cases[] = {
         {"frame\npose 8", "line 2: pose is outside 0 to 7"},
-        {"frame\ntext \"" + text + "\"", "line 2: text is longer than 69 characters"},
-        {"caption \"" + text.substr(21) + "\"\nframe",
+        {"frame\ntext \"" + words + "\"", "line 2: text is longer than 69 characters"},
+        {"caption \"" + words.substr(21) + "\"\nframe",
          "line 1: caption is longer than 48 characters"},
         {"speed 6\nframe", "line 1: speed is outside 1 to 5"},
         {"speed 3", "line 1: a Toon without a frame doesn't load"},
     };
-
-    for (const auto& c : cases) {
-        const ToonFromText made = TextToToon(c.text);
+    for (const auto& [text, warning] : cases) {
+        const ToonFromText made = TextToToon(text);
         EXPECT_EQ(made.error, "");
-        EXPECT_THAT(made.warnings, ElementsAre(c.warning)) << c.text;
+        EXPECT_THAT(made.warnings, ElementsAre(warning)) << text;
         expectRoundTrip(made.bytes);
     }
 }
@@ -161,12 +151,7 @@ TEST_F(ToonProgram, PrintsAndMakesTheSameFileOrFailsWithAReason) {
     make("intro.zkt", test::readFile(toonDirectory / "intro.zkt"));
     make("bad.txt", "frame\npose many\n");
     make("good.txt", "frame\npause 1\n");
-
-    const struct {
-        const char* arguments;
-        int code;
-        const char* reason;
-    } cases[] = {
+    const std::tuple<const char*, int, const char*> cases[] = {
         {"", 2, "usage: toon make TEXT FILE.zkt"},
         {"make good.txt", 2, "usage"},
         {"make missing.txt x.zkt", 1, "toon: can't read missing.txt"},
@@ -177,13 +162,12 @@ TEST_F(ToonProgram, PrintsAndMakesTheSameFileOrFailsWithAReason) {
         {"print intro.zkt >intro.txt", 0, ""},
         {"make intro.txt again.zkt", 0, ""},
     };
-
-    for (const auto& c : cases) {
-        const std::string command = DORBO_TOON " " + std::string(c.arguments) + " 2>err";
+    for (const auto& [arguments, code, reason] : cases) {
+        const std::string command = DORBO_TOON " " + std::string(arguments) + " 2>err";
         const int status = std::system(command.c_str());
-        EXPECT_EQ(WIFEXITED(status) ? WEXITSTATUS(status) : -1, c.code) << c.arguments;
-        EXPECT_THAT(textOf("err"), testing::HasSubstr(c.reason)) << c.arguments;
-        EXPECT_FALSE(std::filesystem::exists("x.zkt")) << c.arguments;
+        EXPECT_EQ(WIFEXITED(status) ? WEXITSTATUS(status) : -1, code) << arguments;
+        EXPECT_THAT(textOf("err"), testing::HasSubstr(reason)) << arguments;
+        EXPECT_FALSE(std::filesystem::exists("x.zkt")) << arguments;
     }
     EXPECT_TRUE(textOf("again.zkt") == textOf("intro.zkt"));
 }
