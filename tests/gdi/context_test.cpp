@@ -72,7 +72,7 @@ TEST(Context, SavedStatesComeBack) {
 TEST(Context, StaleAndForeignHandlesGiveNothing) {
     HDC stale = CreateCompatibleDC(nullptr);
     DeleteDC(stale);
-    HDC next = CreateCompatibleDC(nullptr); // takes the same place in the table
+    HDC next = CreateCompatibleDC(nullptr);
     RECT area{0, 0, 5, 5};
     SIZE size{};
     for (const HDC dc : {HDC{}, stale, HDC{GetStockObject(BLACK_PEN).number}}) {

@@ -128,14 +128,17 @@ TEST(Text, FontsDifferInSizeAndWeight) {
 }
 
 TEST(Text, KeepsToTheClipOfAWindowAndTellsIt) {
-    TestSurface window(plain(60, 30, 'G'), {12, 0, 60, 30});
-    SelectObject(window.dc, bubbleFont());
-    RECT place{10, 5, 60, 30};
-    DrawTextA(window.dc, "HHH", -1, &place, DT_LEFT);
-    const RECT drawn = boundsOf(window.text(), 'W');
-    EXPECT_EQ(drawn.left, 12);
-    EXPECT_EQ(drawn.top, 5);
-    EXPECT_EQ(window.before.front(), plain(60, 30, 'G'));
-    EXPECT_EQ(window.touched.front().left, 12);
-    EXPECT_GE(window.touched.front().right, drawn.right);
+    for (const int mode : {OPAQUE, TRANSPARENT}) {
+        TestSurface window(plain(60, 30, 'G'), {12, 0, 60, 30});
+        SelectObject(window.dc, bubbleFont());
+        SetBkMode(window.dc, mode);
+        RECT place{11, 5, 60, 30};
+        DrawTextA(window.dc, "HHH", -1, &place, DT_LEFT);
+        const RECT drawn = boundsOf(window.text(), mode == OPAQUE ? 'W' : '.');
+        EXPECT_NEAR(drawn.left, 12, mode == OPAQUE ? 0 : 1);
+        ASSERT_FALSE(window.touched.empty());
+        EXPECT_EQ(window.touched.front().left, 12);
+        EXPECT_GE(window.touched.front().right, drawn.right);
+        EXPECT_EQ(window.before.front(), plain(60, 30, 'G'));
+    }
 }

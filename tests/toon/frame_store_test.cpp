@@ -121,7 +121,7 @@ TEST_F(FrameStoreTest, ScalingGoesTowardZeroAndWraps) {
         {"no recorded width", 640, 480, MAKELONG(0, 768), {33, 16}, {33, 10}},
         {"no recorded height", 640, 480, MAKELONG(1024, 0), {16, 33}, {10, 33}},
         {"halves are unsigned", 640, 480, 0xFFFFFFFF, {65535, -65535}, {640, -480}},
-        {"past 31 bits", 1024, 1024, 0x10001, {2097152, 4194303}, {INT32_MIN, -1024}},
+        {"past 31 bits", 1024, 1024, 0x20002, {2097152, 4194303}, {INT32_MIN / 2, -512}},
         {"lowest, highest", 3, 3, 0x10001, {INT32_MIN, INT32_MAX}, {INT32_MIN, INT32_MAX - 2}},
     };
 
