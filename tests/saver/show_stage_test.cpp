@@ -137,7 +137,7 @@ TEST_F(ShowStage, AStageOfAnotherSizeShowsNoTraceOfTheOldOne) {
 
 TEST_F(ShowStage, TheBubbleComesOffAStageOfAnotherSize) {
     putToon("a.zkt", "A caption that stands in the middle, and so elsewhere on another stage",
-            {{512, 110, 0, 3, 0, "Up here!", 0}, {200, 400, 0, 3, 0, "", 0}});
+            {{512, 80, 0, 3, 0, "Up here!", 0}, {200, 400, 0, 3, 0, "", 0}});
     openStage(1024, 768);
     ASSERT_TRUE(runUntilEvent("bubble_show"));
     MoveWindow(stage, 0, 0, 1200, 900, FALSE);
