@@ -3,10 +3,9 @@
 #include "tests/program/ground.h"
 
 #include <algorithm>
+#include <iterator>
 #include <map>
 #include <optional>
-
-#include <QPainter>
 
 #include <gtest/gtest.h>
 
@@ -14,45 +13,53 @@ namespace {
 
 using ground::Ground;
 
+const QRgb* rowOf(const QImage& image, int y) {
+    return reinterpret_cast<const QRgb*>(image.constScanLine(y));
+}
+
 /// The bounds of the pixels in which two pictures of one size differ; empty if there are none.
 QRect changedBox(const QImage& one, const QImage& other) {
-    int left = one.width();
-    int top = one.height();
-    int right = -1;
-    int bottom = -1;
+    QRect box;
     for (int y = 0; y < one.height(); ++y) {
-        for (int x = 0; x < one.width(); ++x) {
-            if (one.pixel(x, y) != other.pixel(x, y)) {
-                left = std::min(left, x);
-                top = std::min(top, y);
-                right = std::max(right, x);
-                bottom = y;
-            }
+        const QRgb* row = rowOf(one, y);
+        const QRgb* end = row + one.width();
+        const auto first = std::mismatch(row, end, rowOf(other, y)).first;
+        if (first != end) {
+            const auto last = std::mismatch(std::reverse_iterator(end), std::reverse_iterator(row),
+                                            std::reverse_iterator(rowOf(other, y) + one.width()));
+            const auto left = static_cast<int>(first - row);
+            const auto right = static_cast<int>(last.first.base() - row) - 1;
+            box |= QRect(QPoint(left, y), QPoint(right, y));
         }
     }
-    return {QPoint(left, top), QPoint(right, bottom)};
+    return box;
 }
 
 struct Figure {
-    QImage picture; // see-through where the file is black
+    QImage picture; // black where it is see-through
     QRect bounds;   // of the rest
 };
 
 Figure loadFigure(const std::string& name) {
-    QImage picture = ground::loadPicture(name);
+    const QImage picture = ground::loadPicture(name);
     QImage nothing(picture.size(), picture.format());
     nothing.fill(Qt::black);
-    const QRect bounds = changedBox(picture, nothing);
-    picture.setAlphaChannel(picture.createMaskFromColor(qRgb(0, 0, 0), Qt::MaskOutColor));
-    return {picture, bounds};
+    return {picture, changedBox(picture, nothing)};
 }
 
 /// Whether the grab is the background with the picture at `place`, within the changed box.
 bool isComposed(const QImage& grab, const QImage& background, const QRect& changed,
                 const QImage& picture, QPoint place) {
-    QImage composed = background.copy(changed);
-    QPainter(&composed).drawImage(place - changed.topLeft(), picture);
-    return composed == grab.copy(changed);
+    for (int y = changed.top(); y <= changed.bottom(); ++y) {
+        for (int x = changed.left(); x <= changed.right(); ++x) {
+            const QPoint at = QPoint(x, y) - place;
+            const bool covered = picture.valid(at) && picture.pixel(at) != qRgb(0, 0, 0);
+            if (grab.pixel(x, y) != (covered ? picture.pixel(at) : background.pixel(x, y))) {
+                return false;
+            }
+        }
+    }
+    return true;
 }
 
 struct Found {
@@ -126,11 +133,11 @@ TEST(Walk, ShowsFinishedPicturesOnly) {
         steps.push_back(*found);
     }
     ASSERT_GE(steps.size(), 8U);
-    const int stride = steps[1].left - steps[0].left;
-    EXPECT_NE(stride, 0);
+    constexpr int stride = 16; // of this walk; a grab that comes late misses some
     for (std::size_t i = 1; i < steps.size(); ++i) {
         const int moved = steps[i].left - steps[i - 1].left;
-        EXPECT_TRUE(moved == stride || (moved == 0 && steps[i].name.rfind("pose", 0) == 0))
+        const bool posed = steps[i].name.rfind("pose", 0) == 0;
+        EXPECT_TRUE(moved % stride == 0 && moved >= (posed ? 0 : stride))
             << "from " << steps[i - 1].name << " to " << steps[i].name << " by " << moved;
     }
     ground.press("space");

@@ -44,6 +44,14 @@ bool waitFor(const std::function<bool()>& condition, double seconds) {
     return true;
 }
 
+QProcessEnvironment environmentFor(const std::string& display) {
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    environment.remove(text("QT_QPA_PLATFORM"));
+    environment.remove(text("WAYLAND_DISPLAY"));
+    environment.insert(text("DISPLAY"), text(display));
+    return environment;
+}
+
 QImage loadPicture(const std::string& name) {
     const QImage picture(text(DORBO_SOURCE_DIR "/resources/bitmaps/" + name + ".bmp"));
     if (picture.isNull()) {
@@ -100,9 +108,7 @@ std::string Process::readLine() {
 Ground::Ground(int width, int height) {
     fs::create_directories(settings().parent_path());
     fs::create_directories(toons());
-    environment_ = QProcessEnvironment::systemEnvironment();
-    environment_.remove(text("QT_QPA_PLATFORM"));
-    environment_.remove(text("WAYLAND_DISPLAY"));
+    environment_ = environmentFor("");
     environment_.insert(text("HOME"), text(root()));
     environment_.insert(text("XDG_CONFIG_HOME"), text(root() / "config"));
     environment_.insert(text("XDG_RUNTIME_DIR"), text(root()));

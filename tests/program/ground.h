@@ -20,6 +20,9 @@ bool waitFor(const std::function<bool()>& condition, double seconds = 20);
 /// One of the program's bitmaps.
 QImage loadPicture(const std::string& name);
 
+/// The environment of this process, but that the display is this one and the only one.
+QProcessEnvironment environmentFor(const std::string& display);
+
 /// A process of ours; killed at the end if it still runs.
 class Process {
   public:

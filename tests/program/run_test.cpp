@@ -104,8 +104,7 @@ TEST_F(Run, ToonThatDoesNotLoadShowsItsBoxAndAKeyEndsTheSaver) {
 
 TEST(NoDisplay, IsSaidAndRefused) {
     const auto directory = std::filesystem::temp_directory_path();
-    QProcessEnvironment none;
-    none.insert(QStringLiteral("DISPLAY"), QStringLiteral(":4095"));
+    const auto none = ground::environmentFor(":4095");
     EXPECT_EQ(ground::Process({DORBO_PROGRAM, "S"}, none, directory).exitCode(), refused);
     EXPECT_EQ(ground::Process({DORBO_PROGRAM, "A"}, none, directory).exitCode(), 0);
 }
