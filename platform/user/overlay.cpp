@@ -27,8 +27,9 @@ QPoint middleOf(const QWindow& owner) {
 /// manager's hands, would hide a dialog that isn't the same.
 void placeOver(QDialog& dialog, QWindow& owner) {
     if ((owner.flags() & Qt::X11BypassWindowManagerHint) != 0) {
-        dialog.setWindowFlags(dialog.windowFlags() | Qt::FramelessWindowHint |
-                              Qt::WindowStaysOnTopHint | Qt::X11BypassWindowManagerHint);
+        // Nothing of the flags that it has: with any button of a title it wouldn't be frameless.
+        dialog.setWindowFlags(Qt::Dialog | Qt::FramelessWindowHint | Qt::WindowStaysOnTopHint |
+                              Qt::X11BypassWindowManagerHint);
     }
     dialog.winId(); // makes its window, for the owner to be told
     if (owner.isVisible()) {

@@ -29,10 +29,10 @@ class ChangeDialog : public PasswordDialog {
             return;
         }
         if (stored.state == PasswordState::set) {
-            explain(QStringLiteral("To have no password any more, leave the new one empty."));
+            explain(QStringLiteral("An empty new password removes the old one."));
             old_ = addField(QStringLiteral("&Old password:"));
         } else {
-            explain(QStringLiteral("The screen saver will ask for this password before it ends."));
+            explain(QStringLiteral("The screen saver will ask for this password."));
         }
         new_ = addField(QStringLiteral("&New password:"));
         again_ = addField(QStringLiteral("&Confirm new password:"));
@@ -42,7 +42,7 @@ class ChangeDialog : public PasswordDialog {
   protected:
     void submit() override {
         if (new_->secret().bytes() != again_->secret().bytes()) {
-            say(QStringLiteral("The new password was typed in two different ways."));
+            say(QStringLiteral("The two new passwords differ."));
             new_->clear();
             again_->clear();
             new_->setFocus();

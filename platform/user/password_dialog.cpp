@@ -4,6 +4,7 @@
 #include "platform/user/password_store.h"
 #include "platform/user/text.h"
 
+#include <QApplication>
 #include <QDialogButtonBox>
 #include <QFormLayout>
 #include <QKeyEvent>
@@ -54,9 +55,10 @@ PasswordDialog::PasswordDialog(HWND owner, const QString& title)
     : Overlay<QDialog>(owner), text_(new QLabel), form_(new QFormLayout), message_(new QLabel),
       buttons_(new QDialogButtonBox(QDialogButtonBox::Ok | QDialogButtonBox::Cancel)),
       ok_(buttons_->button(QDialogButtonBox::Ok)) {
-    constexpr int leastWidth = 340;
+    constexpr int leastWidth = 320; // for what it says to stand on one line
     setWindowTitle(title);
-    setMinimumWidth(leastWidth);
+    setWindowFlags(Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint |
+                   Qt::WindowCloseButtonHint);
     auto* layout = new QVBoxLayout(this);
     layout->setSizeConstraint(QLayout::SetFixedSize);
     layout->addWidget(text_);
@@ -66,6 +68,7 @@ PasswordDialog::PasswordDialog(HWND owner, const QString& title)
     for (QLabel* label : {text_, message_}) {
         label->setTextFormat(Qt::PlainText);
         label->setWordWrap(true);
+        label->setMinimumWidth(leastWidth);
         label->setMinimumHeight(fontMetrics().lineSpacing()); // room before there is a message
     }
     ok_->setDefault(true);
@@ -79,6 +82,7 @@ PasswordDialog::PasswordDialog(HWND owner, const QString& title)
     delay_.setTimerType(Qt::PreciseTimer);
     QObject::connect(&delay_, &QTimer::timeout, this, [this] { holdBack(); });
     holdBack();
+    qApp->installEventFilter(this);
 }
 
 void PasswordDialog::explain(const QString& text) {
@@ -94,8 +98,8 @@ PasswordField* PasswordDialog::addField(const QString& label) {
 }
 
 void PasswordDialog::refuse(const std::string& what, const StoredPassword& broken) {
-    explain(shownText(what + ", because " + broken.reason + ".\n\nTo begin anew, remove " +
-                      passwordFile() + "."));
+    explain(shownText(what + ", because " + broken.reason +
+                      ".\n\nTo begin anew, remove this file:\n" + passwordFile()));
     delay_.stop();
     message_->hide();
     ok_->hide();
@@ -133,10 +137,21 @@ void PasswordDialog::holdBack() {
     }
 }
 
-void PasswordDialog::keyPressEvent(QKeyEvent* event) {
-    if (!event->isAutoRepeat()) { // else it is the key that brought the dialog up, still held
-        QDialog::keyPressEvent(event);
+/// The key that brought the dialog up may still be held: what it repeats is for nobody, lest it be
+/// a password, or the OK to none. The toolkit doesn't always know a repetition: its release and
+/// press come at the same time.
+bool PasswordDialog::eventFilter(QObject* watched, QEvent* event) {
+    if (event->type() != QEvent::KeyPress && event->type() != QEvent::KeyRelease) {
+        return Overlay<QDialog>::eventFilter(watched, event);
     }
+    const auto& key = static_cast<const QKeyEvent&>(*event);
+    const bool released = event->type() == QEvent::KeyRelease;
+    const std::pair keyAndTime(key.nativeScanCode(), key.timestamp());
+    if (released) {
+        released_ = keyAndTime;
+    }
+    const bool repeated = key.isAutoRepeat() || (key.timestamp() != 0 && released_ == keyAndTime);
+    return !released && repeated && key.key() != Qt::Key_Backspace;
 }
 
 } // namespace seam

@@ -9,6 +9,7 @@
 
 #include <chrono>
 #include <string>
+#include <utility>
 
 class QDialogButtonBox;
 class QFormLayout;
@@ -52,7 +53,7 @@ class PasswordDialog : public Overlay<QDialog> {
     /// empties the field and holds OK back.
     bool check(PasswordField& field);
 
-    void keyPressEvent(QKeyEvent* event) override;
+    bool eventFilter(QObject* watched, QEvent* event) override;
 
   private:
     void holdBack();
@@ -64,6 +65,7 @@ class PasswordDialog : public Overlay<QDialog> {
     QDialogButtonBox* buttons_;
     QPushButton* ok_;
     QTimer delay_;
+    std::pair<quint32, quint64> released_{}; // which key went up last, and when
 };
 
 } // namespace seam

@@ -117,11 +117,10 @@ void PasswordField::keyPressEvent(QKeyEvent* event) {
     } else if (event->key() == Qt::Key_Backspace) {
         secret_.removeLast();
         update();
-    } else if (!isText(*event)) {
-        QWidget::keyPressEvent(event);
-    } else if (!event
-                    ->isAutoRepeat()) { // else it is the key that brought the dialog up, still held
+    } else if (isText(*event)) {
         type(event->text());
+    } else {
+        QWidget::keyPressEvent(event);
     }
 }
 

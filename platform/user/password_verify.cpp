@@ -4,7 +4,7 @@
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
 
-#include <QApplication>
+#include <QEvent>
 
 #include <memory>
 
@@ -27,7 +27,6 @@ class VerifyDialog : public PasswordDialog {
         untilGone_.setTimerType(Qt::PreciseTimer);
         QObject::connect(&untilGone_, &QTimer::timeout, this, &QDialog::reject);
         untilGone_.start(passwordPatience().untilGone);
-        qApp->installEventFilter(this);
     }
 
   protected:
@@ -38,11 +37,11 @@ class VerifyDialog : public PasswordDialog {
         }
     }
 
-    bool eventFilter(QObject* object, QEvent* event) override {
+    bool eventFilter(QObject* watched, QEvent* event) override {
         if (event->type() == QEvent::KeyPress) {
             untilGone_.start();
         }
-        return PasswordDialog::eventFilter(object, event);
+        return PasswordDialog::eventFilter(watched, event);
     }
 
   private:

@@ -190,6 +190,12 @@ TEST_F(PasswordDialogs, TakeNoKeysThatAreHeldDownAndNoCommands) {
     const auto held = [] {
         for (const int key : {Qt::Key_Escape, Qt::Key_Return, Qt::Key_A}) {
             press(dialogUp()->focusWidget(), key, QStringLiteral("a"), Qt::NoModifier, true);
+            // The same as a display may tell it: up and down again in one millisecond.
+            for (const QEvent::Type type : {QEvent::KeyRelease, QEvent::KeyPress}) {
+                QKeyEvent event(type, key, Qt::NoModifier, 38, 0, 0, QStringLiteral("a"));
+                event.setTimestamp(5000);
+                QCoreApplication::sendEvent(dialogUp()->focusWidget(), &event);
+            }
         }
         press(dialogUp()->focusWidget(), Qt::Key_V, QStringLiteral("v"), Qt::ControlModifier);
         press(dialogUp()->focusWidget(), Qt::Key_A, QStringLiteral("a"), Qt::AltModifier);
@@ -335,7 +341,7 @@ TEST_F(PasswordDialogs, SayWhatKeepsThePasswordFromBeingChanged) {
     std::filesystem::create_directories(path("registry.ini"));
     const Step differ{[] {
         type(QStringLiteral("old\tnew\tno\n"));
-        EXPECT_TRUE(wordsOf(*dialogUp()).contains(QLatin1String("different")));
+        EXPECT_TRUE(wordsOf(*dialogUp()).contains(QLatin1String("differ")));
     }};
     const Step wrong{[] {
         fields().front()->setFocus();
