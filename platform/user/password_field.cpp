@@ -124,11 +124,6 @@ void PasswordField::keyPressEvent(QKeyEvent* event) {
     }
 }
 
-/// Where a character is composed of several keys, it comes this way.
-void PasswordField::inputMethodEvent(QInputMethodEvent* event) {
-    type(event->commitString());
-}
-
 void PasswordField::paintEvent(QPaintEvent* /*event*/) {
     QStyleOptionFrame option;
     option.initFrom(this);

@@ -1,5 +1,6 @@
 // A field for a password. It keeps what is typed in memory that is wiped, where a text field of the
-// toolkit would leave copies, and gives it to no clipboard and no input method.
+// toolkit would leave copies, and gives it to no clipboard and no input method: what those compose
+// of several keys doesn't come here.
 #pragma once
 
 #include "platform/user/secret.h"
@@ -23,7 +24,6 @@ class PasswordField : public QWidget {
 
   protected:
     void keyPressEvent(QKeyEvent* event) override;
-    void inputMethodEvent(QInputMethodEvent* event) override;
     void paintEvent(QPaintEvent* event) override;
 
   private:
