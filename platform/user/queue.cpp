@@ -211,6 +211,12 @@ void queueInput(const MSG& message) {
         input.back().hwnd == message.hwnd) {
         input.pop_back(); // only where the pointer is now matters
     }
+    if (message.message == WM_ACTIVATEAPP) {
+        // A loss that was over before it could be told of is none.
+        std::erase_if(input, [&](const MSG& waiting) {
+            return waiting.message == WM_ACTIVATEAPP && waiting.hwnd == message.hwnd;
+        });
+    }
     input.push_back(message);
     input.back().time = messageTime();
     wake();
