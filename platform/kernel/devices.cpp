@@ -58,17 +58,17 @@ HANDLE CreateFileA(const char* name, DWORD /*access*/, DWORD /*share*/, void* /*
     return handle != 0 ? HANDLE{handle} : INVALID_HANDLE_VALUE;
 }
 
-BOOL DeviceIoControl(HANDLE handle, DWORD code, void* /*input*/, DWORD /*inputBytes*/,
+BOOL DeviceIoControl(HANDLE device, DWORD code, void* /*input*/, DWORD /*inputBytes*/,
                      void* /*output*/, DWORD /*outputBytes*/, DWORD* returned,
                      void* /*overlapped*/) {
     if (returned != nullptr) {
         *returned = 0;
     }
-    const OpenDevice* open = openDevices.find(handle.number);
-    const seam::DeviceRegistration* device = open != nullptr ? deviceNamed(open->name) : nullptr;
-    return device != nullptr && device->control(code) ? TRUE : FALSE;
+    const OpenDevice* open = openDevices.find(device.number);
+    const seam::DeviceRegistration* found = open != nullptr ? deviceNamed(open->name) : nullptr;
+    return found != nullptr && found->control(code) ? TRUE : FALSE;
 }
 
-BOOL CloseHandle(HANDLE handle) {
-    return openDevices.take(handle.number) ? TRUE : FALSE;
+BOOL CloseHandle(HANDLE device) {
+    return openDevices.take(device.number) ? TRUE : FALSE;
 }

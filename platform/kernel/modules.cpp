@@ -85,18 +85,18 @@ HMODULE LoadLibraryA(const char* name) {
     return module->handle;
 }
 
-BOOL FreeLibrary(HMODULE handle) {
-    seam::ModuleRegistration* module = moduleOf(handle);
-    if (module == nullptr || module->uses == 0) {
+BOOL FreeLibrary(HMODULE module) {
+    seam::ModuleRegistration* found = moduleOf(module);
+    if (found == nullptr || found->uses == 0) {
         return FALSE;
     }
-    --module->uses;
+    --found->uses;
     return TRUE;
 }
 
-FARPROC GetProcAddress(HMODULE handle, const char* name) {
-    const seam::ModuleRegistration* module = moduleOf(handle);
-    const bool found = module != nullptr && inProcess(*module) && name != nullptr &&
-                       std::string_view(module->entry.name) == name;
-    return found ? module->entry.address : nullptr;
+FARPROC GetProcAddress(HMODULE module, const char* name) {
+    const seam::ModuleRegistration* found = moduleOf(module);
+    const bool has = found != nullptr && inProcess(*found) && name != nullptr &&
+                     std::string_view(found->entry.name) == name;
+    return has ? found->entry.address : nullptr;
 }
