@@ -220,7 +220,7 @@ void Ground::typeInto(const std::string& title, const std::string& text) const {
     press("Return");
 }
 
-bool Ground::inputIsFree() const {
+bool Ground::takeInput() const {
     const auto keyboard = owned(
         xcb_grab_keyboard_reply(connection_,
                                 xcb_grab_keyboard(connection_, 0, screen_->root, XCB_CURRENT_TIME,
@@ -231,11 +231,14 @@ bool Ground::inputIsFree() const {
         xcb_grab_pointer(connection_, 0, screen_->root, 0, XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC,
                          XCB_NONE, XCB_NONE, XCB_CURRENT_TIME),
         nullptr));
+    return keyboard != nullptr && keyboard->status == XCB_GRAB_STATUS_SUCCESS &&
+           pointer != nullptr && pointer->status == XCB_GRAB_STATUS_SUCCESS;
+}
+
+void Ground::giveInputBack() const {
     xcb_ungrab_keyboard(connection_, XCB_CURRENT_TIME);
     xcb_ungrab_pointer(connection_, XCB_CURRENT_TIME);
     xcb_flush(connection_);
-    return keyboard != nullptr && keyboard->status == XCB_GRAB_STATUS_SUCCESS &&
-           pointer != nullptr && pointer->status == XCB_GRAB_STATUS_SUCCESS;
 }
 
 void Ground::loseDisplay() {

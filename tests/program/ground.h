@@ -77,8 +77,15 @@ class Ground {
     /// Types a text and Return into the window with this title as soon as it is there.
     void typeInto(const std::string& title, const std::string& text) const;
 
-    /// Whether keyboard and pointer can be had, as nobody else holds them.
-    bool inputIsFree() const;
+    /// Takes keyboard and pointer, as an open menu does; false if somebody else holds them.
+    bool takeInput() const;
+    void giveInputBack() const;
+
+    bool inputIsFree() const {
+        const bool taken = takeInput();
+        giveInputBack();
+        return taken;
+    }
 
     /// The X server dies.
     void loseDisplay();

@@ -122,8 +122,10 @@ TEST_F(Screen, ThePasswordKeepsItUp) {
         return ground.command({"xdotool", "search", "--onlyvisible", "--name", title}) == 0;
     };
     setPassword("sesame");
+    ASSERT_TRUE(ground.takeInput()); // and the saver tries until it has it
     auto saver = ground.start({"S"});
     waitForSaver();
+    ground.giveInputBack();
     EXPECT_TRUE(waitFor([&] { return !ground.inputIsFree(); }));
 
     ground.press("a");

@@ -10,6 +10,9 @@
 #include "tests/saver/saver_fixture.h"
 #include "toon/settings.h"
 
+#include <malloc.h>
+#include <utility>
+
 using testing::ElementsAre;
 
 namespace {
@@ -131,6 +134,28 @@ TEST_F(ShowStage, AStageOfAnotherSizeShowsNoTraceOfTheOldOne) {
             EXPECT_TRUE(isClean()) << "step " << i;
         }
         EXPECT_EQ(WalkStepIndex, step + 10) << "the walk goes on";
+        closeStage();
+    }
+}
+
+TEST_F(ShowStage, AnHourOfShowsLeavesNothingBehind) {
+    constexpr std::int64_t hour = 3600000;
+    constexpr std::size_t slack = 16384; // bytes, for lists that find their size
+    putToon("a.zkt", "", {{300, 200, 0, 5, 2, "Hello you there, all of you", 3}});
+    putToon("b.zkt", "Another", {{90, 20, 0, 2, 0, "", 0}, {400, 300, 0, 7, 2, "Well!", 2}});
+    for (const LONG style : {0, 1}) {
+        WalkingStyle = style;
+        openStage();
+        ASSERT_TRUE(runUntilEvent("choice"));
+        ASSERT_TRUE(runUntilEvent("choice"));
+        const std::size_t heap = mallinfo2().uordblks;
+        const seam::HandleCounts handles = seam::liveHandles();
+        const auto sink = std::exchange(TraceSink, nullptr); // the record itself grows
+        pass(hour);
+        TraceSink = sink;
+        ASSERT_TRUE(runUntilEvent("choice"));
+        EXPECT_LE(mallinfo2().uordblks, heap + slack) << style;
+        EXPECT_EQ(seam::liveHandles(), handles) << style;
         closeStage();
     }
 }
