@@ -10,7 +10,7 @@
 
 namespace seam {
 
-/// Bits of a handle's number: 31 always set, 28 to 30 the kind, 14 to 27 the generation, 0 to 13
+/// Bits of a handle's number: 31 always set, 27 to 30 the kind, 14 to 26 the generation, 0 to 13
 /// the slot. Every table has a kind of its own, so that a handle of one is refused by another.
 enum class HandleKind : DWORD {
     window,
@@ -20,7 +20,10 @@ enum class HandleKind : DWORD {
     memory,
     file,
     search,
-    other
+    resource,
+    device,
+    key,
+    remoteWindow
 };
 
 template <class Object>
@@ -88,10 +91,10 @@ class HandleTable {
     };
 
     static constexpr DWORD slotMask = 0x3FFF;
-    static constexpr DWORD generationMask = 0x3FFF;
+    static constexpr DWORD generationMask = 0x1FFF;
 
     DWORD number(std::size_t slot) const {
-        return 0x80000000U | (static_cast<DWORD>(kind_) << 28) | (slots_[slot].generation << 14) |
+        return 0x80000000U | (static_cast<DWORD>(kind_) << 27) | (slots_[slot].generation << 14) |
                static_cast<DWORD>(slot);
     }
 

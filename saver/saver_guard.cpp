@@ -78,8 +78,26 @@ static bool LeavesTheSaver(WPARAM command) {
     return command == SC_NEXTWINDOW || command == SC_PREVWINDOW || command == SC_SCREENSAVE;
 }
 
+/// Once the saver may go its window is no longer painted, and input is nothing to it.
+static bool IsOver(UINT message) {
+    switch (message) {
+    case WM_PAINT:
+    case WM_KEYDOWN:
+    case WM_SYSKEYDOWN:
+    case WM_MOUSEMOVE:
+    case WM_LBUTTONDOWN:
+    case WM_RBUTTONDOWN:
+    case WM_MBUTTONDOWN:
+        return StateOfGuard() == GuardState::CLOSING;
+    default:
+        return false;
+    }
+}
+
 LRESULT SaverGuardProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
-    const GuardState state = StateOfGuard();
+    if (IsOver(message)) {
+        return DefWindowProcA(window, message, wParam, lParam);
+    }
     switch (message) {
     case WM_CREATE:
         OnCreate(window);
@@ -90,37 +108,24 @@ LRESULT SaverGuardProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) 
     case WM_SETTEXT:
         return 0; // the title stays: another saver finds this one by it
     case WM_PAINT:
-        if (state == GuardState::CLOSING) {
-            return DefWindowProcA(window, message, wParam, lParam);
-        }
-        if (state != GuardState::PREVIEW) {
+        if (PreviewMode == 0) {
             SetCursor(nullptr);
         }
         break;
     case WM_HELP:
     case WM_CONTEXTMENU:
-        if (state == GuardState::PREVIEW) {
+        if (PreviewMode != 0) {
             PassToParent(window, message, lParam);
             return 1;
         }
         break;
-    case WM_KEYDOWN:
-    case WM_SYSKEYDOWN:
-    case WM_MOUSEMOVE:
-    case WM_LBUTTONDOWN:
-    case WM_RBUTTONDOWN:
-    case WM_MBUTTONDOWN:
-        if (state == GuardState::CLOSING) {
-            return DefWindowProcA(window, message, wParam, lParam);
-        }
-        break;
     case WM_SYSCOMMAND:
-        if (state != GuardState::PREVIEW && LeavesTheSaver(wParam)) {
+        if (PreviewMode == 0 && LeavesTheSaver(wParam)) {
             return 0;
         }
         break;
     case WM_TIMER:
-        if (state == GuardState::CLOSING) {
+        if (StateOfGuard() == GuardState::CLOSING) {
             return 0; // nothing on the stage moves any more
         }
         Sleep(0);
@@ -230,7 +235,7 @@ DWORD VerifyBeforeClose(HWND window) {
     DropWaitingTimers(window);
     SaverClosing = static_cast<DWORD>(SendMessageA(window, TM_VERIFYPASSWORD, 0, 0));
     DrainMessages(window);
-    SaverVerifying = 0;
+    SaverVerifying = 0; // not before the drain: it is what keeps that without effect
     if (SaverClosing == 0) {
         SetCursor(nullptr);
     }

@@ -15,7 +15,7 @@ struct OpenDevice {
     std::string name;
 };
 
-seam::HandleTable<OpenDevice> openDevices(seam::HandleKind::other);
+seam::HandleTable<OpenDevice> openDevices(seam::HandleKind::device);
 
 const seam::DeviceRegistration* deviceNamed(const std::string& name) {
     for (const auto* device = firstDevice; device != nullptr; device = device->next) {

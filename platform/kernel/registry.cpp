@@ -22,7 +22,7 @@ struct OpenKey {
     std::string path;
 };
 
-seam::HandleTable<OpenKey> openKeys(seam::HandleKind::other);
+seam::HandleTable<OpenKey> openKeys(seam::HandleKind::key);
 
 std::string registryText() {
     constexpr std::size_t largestRegistry = 1 << 20;

@@ -26,7 +26,7 @@ struct FoundResource {
 };
 
 /// What has been found so far, each resource once; it stays, for nothing ever gives it back.
-seam::HandleTable<FoundResource> resources(seam::HandleKind::other);
+seam::HandleTable<FoundResource> resources(seam::HandleKind::resource);
 
 /// The folder of a type's resources and what stands in front of the bytes proper.
 struct ResourceFolder {

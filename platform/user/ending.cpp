@@ -7,6 +7,7 @@
 #include <QSocketNotifier>
 
 #include <array>
+#include <cerrno>
 #include <csignal>
 #include <cstdlib>
 #include <fcntl.h>
@@ -61,9 +62,12 @@ void catchSignal(int number) {
 
 /// The toolkit has closed its connection: what is sent to the windows only saves and frees.
 void onExit() {
-    for (const HWND window : topLevelWindows()) {
-        findWindow(window)->dying = true;
-        SendMessageA(window, WM_DESTROY, 0, 0);
+    for (const HWND handle : topLevelWindows()) {
+        Window* window = findWindow(handle); // the end of one before may have been its own
+        if (window != nullptr && !window->dying) {
+            window->dying = true;
+            SendMessageA(handle, WM_DESTROY, 0, 0);
+        }
     }
 }
 
@@ -83,6 +87,7 @@ void catchSignals() {
     for (const int number : {SIGTERM, SIGINT, SIGHUP}) {
         catchSignal(number);
     }
+    std::signal(SIGPIPE, SIG_IGN); // a warning that nobody reads any more ends nothing
 }
 
 void endWindowsAtExit() {

@@ -7,7 +7,6 @@
 #include <QWindow>
 
 #include <algorithm>
-#include <vector>
 
 namespace seam {
 
@@ -38,9 +37,11 @@ class InputHolder : public QObject {
         remove(window);
         windows_.push_back(&window);
         window.installEventFilter(this);
+        connect(&window, &QObject::destroyed, this, [this, gone = &window] { remove(*gone); });
         take();
     }
 
+    /// Only by its address: it may be about to go.
     void remove(const QWindow& window) {
         const bool inFront = isInFront(window);
         std::erase(windows_, &window);
@@ -128,10 +129,8 @@ void giveBack(const QWindow& window) {
     holder().remove(window);
 }
 
-void forEachInFront(const std::function<void(QWindow&)>& visit) {
-    for (QWindow* window : holder().windows()) {
-        visit(*window);
-    }
+const std::vector<QWindow*>& windowsInFront() {
+    return holder().windows();
 }
 
 } // namespace seam

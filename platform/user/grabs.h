@@ -2,7 +2,7 @@
 // that are kept for them while a password guards the screen.
 #pragma once
 
-#include <functional>
+#include <vector>
 
 class QWindow;
 
@@ -16,11 +16,12 @@ void holdInput(bool hold);
 bool inputIsHeld();
 
 /// The window stands in front from now on: it takes what is held from the one before, which gets
-/// it back when this one goes.
+/// it back with giveBack, or when this one is destroyed. Before the window is hidden, so that
+/// nobody else gets it in between.
 void bringForward(QWindow& window);
 void giveBack(const QWindow& window);
 
-/// Calls visit for each of these windows, the one in front last.
-void forEachInFront(const std::function<void(QWindow&)>& visit);
+/// These windows, the one in front last.
+const std::vector<QWindow*>& windowsInFront();
 
 } // namespace seam

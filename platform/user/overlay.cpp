@@ -39,9 +39,29 @@ void placeOver(QDialog& dialog, QWindow& owner) {
     dialog.move(middleOf(owner) - dialog.rect().center());
 }
 
+int boxes = 0; // calls of runOver on the stack
+
+struct BoxCount {
+    BoxCount() {
+        ++boxes;
+    }
+
+    BoxCount(const BoxCount&) = delete;
+    BoxCount& operator=(const BoxCount&) = delete;
+
+    ~BoxCount() {
+        --boxes;
+    }
+};
+
 } // namespace
 
+bool boxIsUp() {
+    return boxes > 0;
+}
+
 int runOver(QDialog& dialog, HWND owner) {
+    const BoxCount count;
     flushWindows();
     dialog.setWindowModality(Qt::ApplicationModal);
     const Window* over = findWindow(topLevelOf(owner));
@@ -49,8 +69,8 @@ int runOver(QDialog& dialog, HWND owner) {
         placeOver(dialog, *over->native);
         QObject::connect(over->native.get(), &QObject::destroyed, &dialog, &QDialog::reject);
     }
-    dialog.winId(); // makes its window
-    bringForward(*dialog.windowHandle());
+    dialog.winId();                       // makes its window
+    bringForward(*dialog.windowHandle()); // before it is seen, to hear of that
     dialog.show();
     dialog.activateWindow();
     wakeToolkitLoop();

@@ -13,6 +13,9 @@ namespace seam {
 /// if the owner goes.
 int runOver(QDialog& dialog, HWND owner);
 
+/// Whether runOver is at work, also when its dialog has just been hidden.
+bool boxIsUp();
+
 /// Draws a frame on a dialog that no window manager draws one round.
 void paintOwnFrame(QDialog& dialog);
 
@@ -26,7 +29,7 @@ class Overlay : public Dialog {
     void setVisible(bool visible) override {
         if (!visible && this->isVisible()) {
             giveBack(*this->windowHandle());
-            SetForegroundWindow(owner_);
+            SetForegroundWindow(owner_); // or what stands in front of it
         }
         Dialog::setVisible(visible);
     }

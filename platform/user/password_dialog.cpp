@@ -11,6 +11,7 @@
 #include <QLabel>
 #include <QPushButton>
 #include <QVBoxLayout>
+#include <QWindow>
 
 #include <algorithm>
 
@@ -132,26 +133,47 @@ void PasswordDialog::holdBack() {
         const auto seconds = (left + second - milliseconds(1)) / second;
         say(QStringLiteral("Wrong password. You may try again in %1 s.").arg(seconds));
         delay_.start(left - (seconds - 1) * second);
-    } else if (attempts.wrong > 0) {
+    } else if (!message_->text().isEmpty()) {
         say(QStringLiteral("Wrong password. Please try again."));
     }
 }
 
 /// The key that brought the dialog up may still be held: what it repeats is for nobody, lest it be
 /// a password, or the OK to none. The toolkit doesn't always know a repetition: its release and
-/// press come at the same time.
+/// press come at the same time. Those of a key that has gone down here may come as fast as that.
+bool PasswordDialog::isRepetition(const QKeyEvent& key) {
+    if (key.key() == Qt::Key_Backspace) {
+        return false;
+    }
+    const bool known = pressedHere_.count(key.nativeScanCode()) != 0;
+    const std::pair keyAndTime(key.nativeScanCode(), key.timestamp());
+    if (key.isAutoRepeat() || (!known && key.timestamp() != 0 && released_ == keyAndTime)) {
+        return true;
+    }
+    pressedHere_.insert(key.nativeScanCode());
+    return false;
+}
+
+/// Sees the keys before anybody else, and hands those of the dialog's window to the field itself:
+/// what has not come from the window system is of no interest to the bridge that tells assistive
+/// programs of keys.
 bool PasswordDialog::eventFilter(QObject* watched, QEvent* event) {
     if (event->type() != QEvent::KeyPress && event->type() != QEvent::KeyRelease) {
         return Overlay<QDialog>::eventFilter(watched, event);
     }
     const auto& key = static_cast<const QKeyEvent&>(*event);
-    const bool released = event->type() == QEvent::KeyRelease;
-    const std::pair keyAndTime(key.nativeScanCode(), key.timestamp());
-    if (released) {
-        released_ = keyAndTime;
+    if (event->type() == QEvent::KeyRelease) {
+        released_ = {key.nativeScanCode(), key.timestamp()};
+    } else if (isRepetition(key)) {
+        return true;
+    } else {
+        keyPressed();
     }
-    const bool repeated = key.isAutoRepeat() || (key.timestamp() != 0 && released_ == keyAndTime);
-    return !released && repeated && key.key() != Qt::Key_Backspace;
+    if (watched == windowHandle() && focusWidget() != nullptr) {
+        QCoreApplication::sendEvent(focusWidget(), event);
+        return true;
+    }
+    return false;
 }
 
 } // namespace seam

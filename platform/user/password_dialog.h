@@ -8,6 +8,7 @@
 #include <QTimer>
 
 #include <chrono>
+#include <set>
 #include <string>
 #include <utility>
 
@@ -20,9 +21,9 @@ namespace seam {
 
 /// How long the dialogs wait. Tests are in more of a hurry.
 struct PasswordPatience {
-    std::chrono::milliseconds untilGone{30000}; // without a key, where a dialog doesn't stay
-    std::chrono::milliseconds firstDelay{1000}; // after the first wrong password; then doubled
-    std::chrono::milliseconds longestDelay{30000};
+    std::chrono::milliseconds untilGone{30000};    // without a key, where a dialog doesn't stay
+    std::chrono::milliseconds firstDelay{1000};    // after the first wrong password; then doubled
+    std::chrono::milliseconds longestDelay{16000}; // comes to its end before a dialog goes
 };
 
 PasswordPatience& passwordPatience();
@@ -53,9 +54,12 @@ class PasswordDialog : public Overlay<QDialog> {
     /// empties the field and holds OK back.
     bool check(PasswordField& field);
 
+    virtual void keyPressed() {} ///< a key has gone down, and isn't one that is still held
+
     bool eventFilter(QObject* watched, QEvent* event) override;
 
   private:
+    bool isRepetition(const QKeyEvent& key);
     void holdBack();
 
     NoDumps noDumps_;
@@ -66,6 +70,7 @@ class PasswordDialog : public Overlay<QDialog> {
     QPushButton* ok_;
     QTimer delay_;
     std::pair<quint32, quint64> released_{}; // which key went up last, and when
+    std::set<quint32> pressedHere_;          // keys that have gone down in this dialog
 };
 
 } // namespace seam

@@ -103,7 +103,9 @@ StoredPassword readPassword() {
         return {PasswordState::broken,
                 {},
                 "the file that holds the password can't be read (" +
-                    std::generic_category().message(file.error) + ")"};
+                    (file.error == EINVAL ? "it is no regular file"
+                                          : std::generic_category().message(file.error)) +
+                    ")"};
     }
     const std::string hash(trimmed(file.text));
     if (sodium_init() < 0 || !isHash(hash)) {

@@ -37,11 +37,8 @@ class VerifyDialog : public PasswordDialog {
         }
     }
 
-    bool eventFilter(QObject* watched, QEvent* event) override {
-        if (event->type() == QEvent::KeyPress) {
-            untilGone_.start();
-        }
-        return PasswordDialog::eventFilter(watched, event);
+    void keyPressed() override {
+        untilGone_.start();
     }
 
   private:

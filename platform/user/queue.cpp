@@ -4,12 +4,13 @@
 #include "platform/user/clock.h"
 #include "platform/user/ending.h"
 #include "platform/user/native_window.h"
+#include "platform/user/overlay.h"
 #include "platform/user/timers.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/waker.h"
 #include "platform/user/window.h"
 
-#include <QApplication>
+#include <QCoreApplication>
 #include <QThread>
 
 #include <chrono>
@@ -142,7 +143,7 @@ void waitForMore() {
 bool takeWithinToolkitLoop(MSG& message) {
     const Filter all;
     Filter withoutClose;
-    withoutClose.except = QApplication::activeModalWidget() != nullptr ? WM_CLOSE : 0;
+    withoutClose.except = boxIsUp() ? WM_CLOSE : 0;
     return takeFrom(posted, withoutClose, true, message) || takePaint(all, message) ||
            takeTimer(all, true, message);
 }

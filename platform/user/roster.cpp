@@ -26,7 +26,7 @@ struct Listener {
 std::map<DWORD, Listener> listeners; // by window
 
 HandleTable<Descriptor>& remotes() {
-    static HandleTable<Descriptor> connections(HandleKind::other);
+    static HandleTable<Descriptor> connections(HandleKind::remoteWindow);
     return connections;
 }
 

@@ -25,6 +25,31 @@ namespace {
 /// Two programs that both want to be on top must not keep the machine busy.
 constexpr int raiseMilliseconds = 100;
 
+/// Puts a window right below another one; both are out of the window manager's hands.
+void putBelow(QWindow& window, QWindow& upper) {
+    xcb_connection_t* connection = xConnection();
+    if (connection != nullptr) {
+        const std::uint32_t values[] = {static_cast<std::uint32_t>(upper.winId()),
+                                        XCB_STACK_MODE_BELOW};
+        xcb_configure_window(connection, static_cast<xcb_window_t>(window.winId()),
+                             XCB_CONFIG_WINDOW_SIBLING | XCB_CONFIG_WINDOW_STACK_MODE,
+                             static_cast<const std::uint32_t*>(values));
+    }
+}
+
+/// Raises the windows in front, the foremost first and the others to right below the one before:
+/// what is covered on the way would have to be shown anew.
+void raiseAll() {
+    const std::vector<QWindow*>& windows = windowsInFront();
+    if (windows.empty()) {
+        return;
+    }
+    windows.back()->raise();
+    for (std::size_t i = windows.size() - 1; i > 0; --i) {
+        putBelow(*windows[i - 1], *windows[i]);
+    }
+}
+
 /// One black window behind the saver's, as large as all monitors together. The X server paints it:
 /// it has no picture of its own.
 class Cover : public QWindow {
@@ -38,12 +63,8 @@ class Cover : public QWindow {
             const auto id = static_cast<xcb_window_t>(winId());
             const std::uint32_t black = 0;
             xcb_change_window_attributes(connection, id, XCB_CW_BACK_PIXEL, &black);
-            const std::uint32_t below[] = {static_cast<std::uint32_t>(front.winId()),
-                                           XCB_STACK_MODE_BELOW};
-            xcb_configure_window(connection, id,
-                                 XCB_CONFIG_WINDOW_SIBLING | XCB_CONFIG_WINDOW_STACK_MODE,
-                                 static_cast<const std::uint32_t*>(below));
         }
+        putBelow(*this, front);
         applyCursor(*this);
         show();
     }
@@ -105,6 +126,17 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
         return cover_.get();
     }
 
+    void raise() {
+        sinceRaise_.start();
+        raiseAll();
+        if (cover_) {
+            putBelow(*cover_, native_);
+        }
+        if (xcb_connection_t* connection = xConnection()) {
+            xcb_flush(connection); // nothing else may wake us for a while
+        }
+    }
+
     bool nativeEventFilter(const QByteArray& type, void* message, qintptr* /*result*/) override {
         if (type == "xcb_generic_event_t") {
             const auto* event = static_cast<const xcb_generic_event_t*>(message);
@@ -150,6 +182,7 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
         const QScreen* primary = QGuiApplication::primaryScreen();
         if (native_.geometry() != primary->geometry()) {
             native_.setGeometry(primary->geometry());
+            centreBoxes(primary->geometry());
         }
         const QRect all = primary->virtualGeometry();
         if (all == primary->geometry()) {
@@ -161,20 +194,20 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
         }
     }
 
+    void centreBoxes(const QRect& area) {
+        for (QWindow* window : windowsInFront()) {
+            if (window != &native_) {
+                window->setPosition(area.center() - QRect(QPoint(), window->size()).center());
+            }
+        }
+    }
+
     void raiseSoon() {
         if (!sinceRaise_.isValid() || sinceRaise_.hasExpired(raiseMilliseconds)) {
             raise();
         } else if (!raiseLater_.isActive()) {
             raiseLater_.start(raiseMilliseconds);
         }
-    }
-
-    void raise() {
-        sinceRaise_.start();
-        if (cover_) {
-            cover_->raise();
-        }
-        forEachInFront([](QWindow& window) { window.raise(); });
     }
 
     HWND owner_;
@@ -204,6 +237,17 @@ void leaveScreens(HWND window) {
     if (screens && screens->owner() == window) {
         giveBack(*findWindow(window)->native);
         screens.reset();
+    }
+}
+
+void raiseInFront(QWindow& window) {
+    const std::vector<QWindow*>& windows = windowsInFront();
+    if (screens && std::find(windows.begin(), windows.end(), &window) != windows.end()) {
+        screens->raise();
+        windows.back()->requestActivate();
+    } else {
+        window.raise();
+        window.requestActivate();
     }
 }
 

@@ -12,11 +12,15 @@ bool fillsScreen(const Window& window);
 
 /// From now on the window follows the primary monitor's size, what lies on the other monitors is
 /// covered with black, and both stay above windows that appear later. Input on the black goes to
-/// the window. One window at a time can have the screens.
+/// the window. One window at a time can have the screens; hiding it doesn't end that.
 void takeScreens(Window& window);
 
-/// Ends that; does nothing for any other window.
+/// Ends that, before the window goes; does nothing for any other window.
 void leaveScreens(HWND window);
+
+/// Raises a window and gives it the keyboard; where boxes stand in front of it, they are raised
+/// above it and the foremost gets the keyboard.
+void raiseInFront(QWindow& window);
 
 /// The black on the other monitors; null while there is none.
 QWindow* screenCover();

@@ -97,7 +97,8 @@ bool toolkit() {
 }
 
 QPoint screenOrigin() {
-    return QGuiApplication::primaryScreen()->geometry().topLeft();
+    static const QPoint origin = QGuiApplication::primaryScreen()->geometry().topLeft();
+    return origin;
 }
 
 xcb_connection_t* xConnection() {

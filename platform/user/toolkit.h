@@ -14,7 +14,8 @@ bool toolkit();
 /// The connection to the X server; null on any other platform of the toolkit.
 xcb_connection_t* xConnection();
 
-/// The primary monitor's corner on the desktop: positions on the screen count from it.
+/// Where positions on the screen count from: the primary monitor's corner as it was when first
+/// asked for. It stays, so that a monitor that comes or goes isn't taken for a move of the mouse.
 QPoint screenOrigin();
 
 } // namespace seam

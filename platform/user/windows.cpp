@@ -122,7 +122,7 @@ void removeWindow(HWND handle) {
     }
     leaveRoster(handle);
     leaveHost(handle);
-    leaveScreens(handle);
+    leaveScreens(handle); // while there is a window to take back what it holds from
     table().take(handle.number);
 }
 
@@ -411,7 +411,6 @@ BOOL SetForegroundWindow(HWND window) {
     if (found == nullptr || !found->native) {
         return FALSE;
     }
-    found->native->raise();
-    found->native->requestActivate();
+    raiseInFront(*found->native);
     return TRUE;
 }

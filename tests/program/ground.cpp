@@ -209,8 +209,12 @@ void Ground::press(const std::string& key, xcb_window_t window) const {
     this->command(command);
 }
 
+Process Ground::launch(const std::vector<std::string>& words) const {
+    return {words, environment_, toons()};
+}
+
 int Ground::command(const std::vector<std::string>& words) const {
-    return Process(words, environment_, root()).exitCode();
+    return launch(words).exitCode();
 }
 
 void Ground::typeInto(const std::string& title, const std::string& text) const {

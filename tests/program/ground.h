@@ -68,6 +68,9 @@ class Ground {
     /// The window that lies in a window of ours; 0 if none does.
     xcb_window_t childOf(xcb_window_t window) const;
 
+    /// Starts another program on the display.
+    Process launch(const std::vector<std::string>& words) const;
+
     /// Runs another program on the display to its end and gives its exit code.
     int command(const std::vector<std::string>& words) const;
 

@@ -155,6 +155,35 @@ TEST_F(Guard, FourPixelsOfTravelEndIt) {
     EXPECT_FALSE(endsOn(WM_MOUSEMOVE)) << "a preview";
 }
 
+std::vector<std::pair<UINT, WPARAM>> help; // what the parent of a preview has heard
+
+LRESULT parentProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
+    if (message == WM_HELP || message == WM_CONTEXTMENU) {
+        help.emplace_back(message, wParam);
+    }
+    return DefWindowProcA(window, message, wParam, lParam);
+}
+
+TEST_F(Guard, HelpOnAPreviewGoesToItsParent) {
+    WNDCLASSA windowClass{};
+    windowClass.lpfnWndProc = parentProc;
+    windowClass.lpszClassName = "GuardParentClass";
+    RegisterClassA(&windowClass);
+    const HWND parent = CreateWindowExA(0, "GuardParentClass", "", WS_POPUP, 0, 0, 99, 99, nullptr,
+                                        nullptr, nullptr, nullptr);
+    PreviewMode = 1;
+    openStage(90, 90, parent);
+    help.clear();
+    for (const UINT message : {WM_HELP, WM_CONTEXTMENU}) {
+        EXPECT_EQ(SendMessageA(stage, message, 0, 0), 1);
+    }
+    pass(0);
+    EXPECT_THAT(help, ElementsAre(std::pair(WM_HELP, WPARAM{parent.number}),
+                                  std::pair(WM_CONTEXTMENU, WPARAM{parent.number})));
+    closeStage();
+    DestroyWindow(parent);
+}
+
 TEST_F(Guard, TheTitleStays) {
     open();
     EXPECT_EQ(SendMessageA(stage, WM_SETTEXT, 0, reinterpret_cast<LPARAM>("Other")), 0);

@@ -5,6 +5,8 @@
 #include <QMessageBox>
 #include <QTimer>
 
+#include <stdexcept>
+
 namespace {
 
 using test::handlers;
@@ -57,6 +59,33 @@ TEST_F(Boxes, ShowTheirTextAndGiveTheAnswer) {
         EXPECT_EQ(text, QStringLiteral("Error reading \u00E9."));
         EXPECT_EQ(title, QStringLiteral("\u20AC caf\u00E9"));
     }
+}
+
+TEST_F(Boxes, ARequestToCloseWaitsForTheAnswer) {
+    for (const bool atTheLastMoment : {false, true}) {
+        test::seen.clear();
+        whenUp([&](QMessageBox& box) {
+            PostMessageA(window, WM_CLOSE, 0, 0);
+            PostMessageA(window, WM_CLOSE, 0, 0);
+            if (!atTheLastMoment) {
+                QCoreApplication::processEvents();
+            }
+            test::press(&box, Qt::Key_Return);
+        });
+        handlers[WM_CLOSE] = [](HWND, WPARAM, LPARAM) { return 0; };
+        MessageBoxA(window, "", "", MB_OK);
+        EXPECT_TRUE(test::seenAmong({WM_CLOSE}).empty());
+        test::handleWaiting();
+        EXPECT_EQ(test::seenAmong({WM_CLOSE}).size(), 1U) << "and there is one of them";
+    }
+}
+
+TEST_F(Boxes, AnExceptionBehindThemComesOutOfThem) {
+    handlers[WM_TIMER] = [](HWND, WPARAM, LPARAM) -> LRESULT { throw std::runtime_error("fault"); };
+    SetTimer(window, 1, 1, nullptr);
+    EXPECT_THROW(MessageBoxA(window, "", "", MB_OK), std::runtime_error);
+    EXPECT_EQ(QApplication::activeModalWidget(), nullptr);
+    KillTimer(window, 1);
 }
 
 TEST_F(Boxes, TimersAndPaintsGoOnBehindThem) {
