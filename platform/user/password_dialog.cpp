@@ -145,7 +145,7 @@ bool PasswordDialog::isRepetition(const QKeyEvent& key) {
     if (key.key() == Qt::Key_Backspace) {
         return false;
     }
-    const bool known = pressedHere_.count(key.nativeScanCode()) != 0;
+    const bool known = pressedHere_.contains(key.nativeScanCode());
     const std::pair keyAndTime(key.nativeScanCode(), key.timestamp());
     if (key.isAutoRepeat() || (!known && key.timestamp() != 0 && released_ == keyAndTime)) {
         return true;
