@@ -80,6 +80,19 @@ TEST_F(Boxes, ARequestToCloseWaitsForTheAnswer) {
     }
 }
 
+TEST_F(Boxes, ThePointerShowsWhileTheyAreUp) {
+    QWindow* const below = test::lastNative();
+    const HCURSOR before = SetCursor(nullptr);
+    EXPECT_EQ(below->cursor().shape(), Qt::BlankCursor);
+    whenUp([&](QMessageBox& box) {
+        EXPECT_EQ(below->cursor().shape(), Qt::ArrowCursor);
+        test::press(&box, Qt::Key_Return);
+    });
+    MessageBoxA(window, "", "", MB_OK);
+    EXPECT_EQ(below->cursor().shape(), Qt::BlankCursor);
+    SetCursor(before);
+}
+
 TEST_F(Boxes, AnExceptionBehindThemComesOutOfThem) {
     handlers[WM_TIMER] = [](HWND, WPARAM, LPARAM) -> LRESULT { throw std::runtime_error("fault"); };
     SetTimer(window, 1, 1, nullptr);
