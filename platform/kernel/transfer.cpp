@@ -76,18 +76,25 @@ std::string withoutLinks(const std::string& path) {
     return withoutLinks(whole ? next : path.substr(0, path.rfind('/') + 1) + next);
 }
 
-constexpr mode_t newFileMode = 0600;
 constexpr mode_t anybodyWrites = S_IWUSR | S_IWGRP | S_IWOTH;
 
-/// The mode that a file takes over from the one it replaces; 0 if that must not be replaced.
-mode_t modeForReplacing(const std::string& path) {
+/// The mode that a file takes over from the one it replaces; 0, and a reason in errno, if that must
+/// not be replaced.
+mode_t modeForReplacing(const std::string& path, mode_t newMode) {
     struct stat status = {};
     if (stat(path.c_str(), &status) != 0) {
-        return errno == ENOENT ? newFileMode : 0;
+        return errno == ENOENT ? newMode : 0;
     }
-    const bool writable = (status.st_mode & anybodyWrites) != 0 &&
-                          faccessat(AT_FDCWD, path.c_str(), W_OK, AT_EACCESS) == 0;
-    return S_ISREG(status.st_mode) && writable ? status.st_mode & 07777 : 0;
+    if (!S_ISREG(status.st_mode)) {
+        errno = EINVAL;
+        return 0;
+    }
+    if ((status.st_mode & anybodyWrites) == 0) {
+        errno = EACCES;
+        return 0;
+    }
+    const bool writable = faccessat(AT_FDCWD, path.c_str(), W_OK, AT_EACCESS) == 0;
+    return writable ? status.st_mode & 07777 : 0;
 }
 
 } // namespace
@@ -116,9 +123,9 @@ WholeFile readWholeFile(const std::string& path, std::size_t limit) {
     return readToEnd(file.number(), static_cast<std::size_t>(status.st_size), limit);
 }
 
-bool replaceFile(const std::string& path, std::string_view text) {
+bool replaceFile(const std::string& path, std::string_view text, mode_t newMode) {
     const std::string target = withoutLinks(path);
-    const mode_t mode = modeForReplacing(target);
+    const mode_t mode = modeForReplacing(target, newMode);
     if (mode == 0) {
         return false;
     }
@@ -132,7 +139,9 @@ bool replaceFile(const std::string& path, std::string_view text) {
         fchmod(file.number(), mode) == 0 && fsync(file.number()) == 0 &&
         rename(beside.c_str(), target.c_str()) == 0;
     if (!written) {
+        const int reason = errno;
         unlink(beside.c_str());
+        errno = reason;
     }
     return written;
 }

@@ -25,8 +25,9 @@ WholeFile readWholeFile(const std::string& path, std::size_t limit);
 
 /// Puts a file with this text in the place of the one at path, or makes it: written whole beside
 /// it and renamed, so that nobody ever sees half of it. A link stays a link, and its target is
-/// replaced. An old file's mode is kept, a new one has 0600. False, and the old file as it was, if
-/// anything fails, also if the old one is no regular file or may not be written.
-bool replaceFile(const std::string& path, std::string_view text);
+/// replaced. An old file's mode is kept, a new one has `newMode`. False with a reason in errno, and
+/// the old file as it was, if anything fails, also if the old one is no regular file (EINVAL) or
+/// may not be written.
+bool replaceFile(const std::string& path, std::string_view text, mode_t newMode = 0600);
 
 } // namespace seam
