@@ -20,20 +20,17 @@ LONG WalkDirection;
 static UINT WalkNotifyMessage;
 static Sprite* WalkedSprite;
 
-static constexpr LONG STRIDE_GROUP = 8;   // a walk's strides are a multiple of this
-static constexpr LONG MOST_STRIDES = 248; // the last multiple whose entries fit the table
-static constexpr LONG FIRST_CYCLE = 8;    // all eight walking pictures
-static constexpr LONG NEXT_CYCLE = 7;     // picture 0 isn't shown again
+static constexpr LONG STRIDE_GROUP = 8; // a walk's strides are a multiple of this
+static constexpr LONG FIRST_CYCLE = 8;  // all eight walking pictures
+static constexpr LONG NEXT_CYCLE = 7;   // picture 0 isn't shown again
 
-/// Strides for a distance. A walk that would need more than the table holds takes all that it
-/// holds, each longer.
-static LONG CountStrides(std::int64_t dx, std::int64_t dy, LONG stepLength) {
-    const double x = static_cast<double>(dx);
-    const double y = static_cast<double>(dy);
+std::int64_t StridesWanted(LONG fromX, LONG fromY, LONG toX, LONG toY, LONG stepLength) {
+    const double x = static_cast<double>(fromX) - toX;
+    const double y = static_cast<double>(fromY) - toY;
     const auto distance = static_cast<std::int64_t>(std::max(std::sqrt(x * x + y * y), 1.0));
     const std::int64_t strides = distance / std::max<LONG>(stepLength, 1);
     const std::int64_t grouped = (strides + STRIDE_GROUP - 1) / STRIDE_GROUP * STRIDE_GROUP;
-    return static_cast<LONG>(std::clamp<std::int64_t>(grouped, 1, MOST_STRIDES));
+    return std::max<std::int64_t>(grouped, 1);
 }
 
 static LONG CyclePicture(LONG entry) {
@@ -62,7 +59,9 @@ LONG BuildWalkPath(LONG fromX, LONG fromY, LONG toX, LONG toY, LONG stepLength, 
     // Two places of a Toon file can lie further apart than 32 bits hold.
     const std::int64_t dx = static_cast<std::int64_t>(fromX) - toX;
     const std::int64_t dy = static_cast<std::int64_t>(fromY) - toY;
-    const LONG strides = CountStrides(dx, dy, stepLength);
+    // Meant: a walk that would need more than the table holds takes all that it holds, each longer.
+    const auto strides = static_cast<LONG>(std::min<std::int64_t>(
+        StridesWanted(fromX, fromY, toX, toY, stepLength), WALK_MOST_STRIDES));
     for (LONG entry = 0; entry <= strides; ++entry) {
         WalkPath[entry].x = static_cast<LONG>(fromX - entry * (dx / strides));
         WalkPath[entry].y = static_cast<LONG>(fromY - entry * (dy / strides));

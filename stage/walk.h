@@ -6,6 +6,8 @@
 
 #include "stage/sprite.h"
 
+#include <cstdint>
+
 struct PathStep {
     LONG x;
     LONG y;
@@ -13,7 +15,8 @@ struct PathStep {
 };
 
 constexpr int WALK_PATH_ENTRIES = 255;
-constexpr LONG WALK_STRIDE = 20; // pixels aimed at per stride
+constexpr LONG WALK_STRIDE = 20;        // pixels aimed at per stride
+constexpr LONG WALK_MOST_STRIDES = 248; // the last multiple of 8 whose entries fit the table
 
 /// The walk under way: entry 0 is where it starts, entry n ends the movement, entry n + 1 holds the
 /// pose. Written by BuildWalkPath.
@@ -40,6 +43,9 @@ extern LONG WalkDirection;
 /// another walk runs it gives 0 and leaves no trace: that walk goes on, and neither the odometer
 /// nor WalkDirection changes. A walk that was stopped on its way is replaced.
 UINT_PTR WalkTo(HWND stage, LONG fromX, LONG fromY, LONG toX, LONG toY, LONG pose);
+
+/// Strides that a way asks for: 1, or a multiple of 8 that can be more than the table holds.
+std::int64_t StridesWanted(LONG fromX, LONG fromY, LONG toX, LONG toY, LONG stepLength);
 
 /// Fills WalkPath; gives WalkLastIndex, at least 2, or 0, and nothing touched, while a walk runs. A
 /// walk has 1 stride or a multiple of 8, 248 at most. Only a walk whose way divides by its
