@@ -11,7 +11,7 @@ void hourOfShow(benchmark::State& state) {
     setenv("QT_QPA_PLATFORM", "offscreen", 0);
     ReplayOptions options;
     for (const char* name : {"intro", "lost-thought", "shortest-way"}) {
-        options.toons.push_back(std::string(DORBO_SOURCE_DIR "/toons/") + name + ".zkt");
+        options.toons.push_back(std::string(DORBO_TOONS "/") + name + ".zkt");
     }
     options.width = 1920;
     options.height = 1080;

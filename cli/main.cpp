@@ -1,6 +1,6 @@
 // The program `toon`: what can be done with Toon files without a screen.
-#include "cli/make_print.h"
 #include "cli/replay.h"
+#include "cli/show_write.h"
 
 #include <cstdio>
 #include <string>
@@ -17,8 +17,8 @@ struct Command {
 };
 
 constexpr Command commands[] = {
-    {"make", "TEXT FILE.zkt", 2, 2, MakeCommand},
-    {"print", "FILE.zkt", 1, 1, PrintCommand},
+    {"show", "FILE.zkt", 1, 1, ShowCommand},
+    {"write", "FILE.json [-o FILE.zkt]", 1, 3, WriteCommand},
     {"trace", "[--size WxH] [--seed N] [--shows N] [--paces N] [FILE.zkt...]", 0, 1000,
      TraceCommand},
 };

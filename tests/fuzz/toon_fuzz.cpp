@@ -1,10 +1,12 @@
-// Any bytes for the loader of Toons: it may refuse them, and must keep its promises.
+// Any bytes for the loader of Toons and for the reader of JSON: they may refuse them, and must keep
+// their promises.
 //
 //   cmake --preset debug -B build/fuzz -DDORBO_FUZZ=ON
 //   cmake --build build/fuzz --target toon_fuzz
-//   mkdir -p build/fuzz/toons; export QT_QPA_PLATFORM=offscreen
-//   build/fuzz/tests/fuzz/toon_fuzz -max_total_time=60 build/fuzz/toons tests/toon/bad toons
-#include "cli/toon_text.h"
+//   mkdir -p build/fuzz/corpus; export QT_QPA_PLATFORM=offscreen
+//   build/fuzz/tests/fuzz/toon_fuzz -max_total_time=60 -dict=tests/fuzz/toon.dict build/fuzz/corpus
+//   tests/toon/bad toons
+#include "cli/toon_json.h"
 #include "platform/harness.h"
 #include "tests/fuzz/scratch_directory.h"
 #include "toon/toon_document.h"
@@ -32,12 +34,23 @@ void checkFrames() {
     demand(strnlen(CaptionText, sizeof CaptionText) < sizeof CaptionText);
 }
 
-void checkText(std::string_view bytes) {
-    const std::optional<std::string> text = ToonToText(bytes);
-    if (text) {
-        demand(TextToToon(*text).bytes == bytes);
+/// What is shown of a Toon makes a Toon that shows the same.
+void checkShown(const Toon& toon) {
+    const std::string json = ToonToJson(toon);
+    const ToonFromJson made = JsonToToon(json);
+    demand(made.error.empty());
+    demand(ToonToJson(made.toon) == json);
+}
+
+void checkJson(std::string_view bytes) {
+    Toon toon{};
+    if (ToonFromBytes(bytes, toon).empty()) {
+        checkShown(toon);
     }
-    TextToToon(bytes); // may fail, and must end
+    const ToonFromJson made = JsonToToon(bytes);
+    if (made.error.empty()) {
+        checkShown(made.toon);
+    }
 }
 
 } // namespace
@@ -57,6 +70,6 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t siz
         FrameStoreDelete(0);
         checkFrames();
     }
-    checkText({reinterpret_cast<const char*>(bytes), size});
+    checkJson({reinterpret_cast<const char*>(bytes), size});
     return 0;
 }

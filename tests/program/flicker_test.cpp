@@ -106,7 +106,7 @@ std::optional<Found> explain(const QImage& grab, const QImage& background, const
 
 TEST(Walk, ShowsFinishedPicturesOnly) {
     const Ground ground(1280, 1024); // on which the whole of him shows on his way in
-    std::filesystem::copy_file(DORBO_SOURCE_DIR "/toons/intro.zkt", ground.toons() / "intro.zkt");
+    std::filesystem::copy_file(DORBO_TOONS "/intro.zkt", ground.toons() / "intro.zkt");
     const QImage tile = ground::loadPicture("bg01");
     auto saver = ground.start({"S"});
     ASSERT_TRUE(ground::waitFor([&] { return ground.grab().pixel(0, 0) == tile.pixel(0, 0); }));

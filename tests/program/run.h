@@ -12,8 +12,7 @@ namespace ground {
 class Run : public testing::Test {
   protected:
     void addToon(const std::string& name) {
-        std::filesystem::copy_file(std::string(DORBO_SOURCE_DIR "/toons/") + name,
-                                   ground.toons() / name);
+        std::filesystem::copy_file(std::string(DORBO_TOONS "/") + name, ground.toons() / name);
     }
 
     /// Waits until the saver's title stands on the screen.

@@ -187,7 +187,7 @@ TEST_F(ToonFile, AReloadDiscardsChangesAndCountsWhatTheStoreHas) {
 // ---- Saving -----------------------------------------------------------------------------------
 
 TEST_F(ToonFile, ASavedToonComesBackByteForByte) {
-    const std::string bytes = test::readFile(test::sourceDirectory / "toons/intro.zkt");
+    const std::string bytes = test::readFile(test::toonDirectory / "intro.zkt");
     make("x.zkt", bytes);
     CurrentFrameIndex = 9;
     ASSERT_EQ(ToonOpenNamed(nullptr, "x.zkt"), 1);

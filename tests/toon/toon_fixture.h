@@ -17,8 +17,8 @@ inline std::string readFile(const std::filesystem::path& path) {
     return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
 }
 
-inline const std::filesystem::path sourceDirectory = DORBO_SOURCE_DIR;
-inline const std::filesystem::path badDirectory = sourceDirectory / "tests/toon/bad";
+inline const std::filesystem::path badDirectory = DORBO_SOURCE_DIR "/tests/toon/bad";
+inline const std::filesystem::path toonDirectory = DORBO_TOONS;
 
 class ToonTest : public ScratchDirectory {
   protected:
