@@ -1,7 +1,9 @@
 // The program `toon`: what can be done with Toon files without a screen.
+#include "cli/check.h"
 #include "cli/replay.h"
 #include "cli/show_write.h"
 
+#include <climits>
 #include <cstdio>
 #include <string>
 #include <vector>
@@ -19,6 +21,7 @@ struct Command {
 constexpr Command commands[] = {
     {"show", "FILE.zkt", 1, 1, ShowCommand},
     {"write", "FILE.json [-o FILE.zkt]", 1, 3, WriteCommand},
+    {"check", "[--json] FILE...", 1, INT_MAX, CheckCommand},
     {"trace", "[--size WxH] [--seed N] [--shows N] [--paces N] [FILE.zkt...]", 0, 1000,
      TraceCommand},
 };

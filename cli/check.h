@@ -1,0 +1,26 @@
+// Tells what the saver would do with a Toon file, without a screen.
+#pragma once
+
+#include "cli/toon_record.h"
+
+#include <optional>
+#include <string>
+#include <vector>
+
+struct ToonReport {
+    bool loads = false; // what follows is known
+    std::int64_t frames = 0;
+    std::int64_t pauses = 0;       // seconds of them all
+    std::optional<double> seconds; // that the show lasts, if it comes to an end
+    std::vector<Finding> findings; // in the order of the file
+
+    /// Whether anything is wrong.
+    bool faulty() const;
+};
+
+/// Reads a file and acts it out on a stage of 1024 x 768 for up to four hours of the show's time.
+/// Throws a std::exception if that can't be done.
+ToonReport CheckToon(const std::string& path);
+
+/// `toon check [--json] FILE...`: prints what was found, a line each; gives the exit code.
+int CheckCommand(const std::vector<std::string>& arguments);
