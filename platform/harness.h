@@ -1,6 +1,7 @@
 // What tests, benchmarks, replays and film makers ask of the seam. The program never does.
 #pragma once
 
+#include "platform/gdi/surface.h"
 #include "platform/types.h"
 
 #include <cstdint>
@@ -71,6 +72,13 @@ struct Picture {
 };
 
 Picture windowPicture(HWND window);
+
+/// Told, while set, each time what handlers drew becomes visible, also where no screen shows it:
+/// the window, the bounds of what was drawn since it was last told, and the whole picture, which is
+/// good until it returns. Nothing is drawn on that window meanwhile.
+using PictureWatcher =
+    std::function<void(HWND window, const RECT& drawn, const PixelView& picture)>;
+void watchPictures(PictureWatcher watcher);
 
 /// The same of a bitmap; monochrome pixels come as 0 and 1.
 Picture bitmapPicture(HBITMAP bitmap);

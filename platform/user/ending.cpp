@@ -51,7 +51,7 @@ void endProgram(int pipe) {
 void catchSignal(int number) {
     struct sigaction action = {};
     sigaction(number, nullptr, &action);
-    if (action.sa_handler == SIG_IGN) {
+    if (action.sa_handler != SIG_DFL) {
         return;
     }
     action = {};

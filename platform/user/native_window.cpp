@@ -19,6 +19,7 @@
 
 #include <algorithm>
 #include <cstring>
+#include <utility>
 
 namespace seam {
 
@@ -29,11 +30,17 @@ namespace {
 /// longer can show a step half drawn; asking it at each step would cost twice the wake-ups.
 constexpr std::int64_t fetchTime = 50;
 
+PictureWatcher pictureWatcher;
+
 QRect toQt(const RECT& area) {
     return {area.left, area.top, area.right - area.left, area.bottom - area.top};
 }
 
 } // namespace
+
+void watchPictures(PictureWatcher watcher) {
+    pictureWatcher = std::move(watcher);
+}
 
 NativeWindow::NativeWindow(HWND owner, const QRect& place, bool topmost, QWindow* parent)
     : QWindow(parent), owner_(owner), store_(this) {
@@ -75,6 +82,18 @@ void NativeWindow::touch(const RECT& area) {
         store_.endPaint();
     }
     dirty_ |= rectangle;
+    if (pictureWatcher) {
+        untold_ |= rectangle;
+    }
+}
+
+void NativeWindow::tellWatcher() {
+    const QRect drawn = std::exchange(untold_, QRect());
+    if (pictureWatcher && !drawn.isEmpty()) {
+        const RECT area{drawn.x(), drawn.y(), drawn.x() + drawn.width(),
+                        drawn.y() + drawn.height()};
+        pictureWatcher(owner_, area, pixels());
+    }
 }
 
 void NativeWindow::flush() {

@@ -26,6 +26,9 @@ class NativeWindow : public QWindow, public Surface {
     /// Brings what has been touched to the screen.
     void flush();
 
+    /// Tells the watcher of pictures what has been drawn.
+    void tellWatcher();
+
     /// Gives the picture the window's present size and keeps what fits of it.
     void resizePicture(QSize size);
 
@@ -51,6 +54,7 @@ class NativeWindow : public QWindow, public Surface {
     QBackingStore store_;
     QImage shadow_; // the picture where the display's pixels have another form than ours
     QRect dirty_;   // one rectangle: what a step touches overlaps, and each piece costs a request
+    QRect untold_;  // what the watcher of pictures hasn't been told of
     std::int64_t flushed_ = 0; // when the server was last told to fetch pixels
 };
 

@@ -238,6 +238,7 @@ void wake() {
 void flushWindows() {
     forEachWindow([](Window& window) {
         if (window.native) {
+            window.native->tellWatcher();
             window.native->flush();
         }
     });
