@@ -18,7 +18,7 @@ void hourOfShow(benchmark::State& state) {
     options.shows = 70; // of 49 to 55 seconds each
     std::string last;
     for (auto _ : state) {
-        Replay(options, [&](const std::string& line) { last = line; });
+        Replay(options, {[&](const std::string& line) { last = line; }});
     }
     constexpr std::size_t timePrefix = 2; // "t="
     state.counters["seconds_shown"] = std::stod(last.substr(timePrefix)) / 1000;

@@ -1,48 +1,69 @@
 // The program `toon`: what can be done with Toon files without a screen.
 #include "cli/check.h"
-#include "cli/replay.h"
+#include "cli/help.h"
 #include "cli/show_write.h"
+#include "cli/trace.h"
 
-#include <climits>
+#include <algorithm>
 #include <cstdio>
+#include <limits>
 #include <string>
 #include <vector>
 
 namespace {
 
+using Arguments = std::vector<std::string>;
+
+constexpr std::size_t anyNumber = std::numeric_limits<std::size_t>::max();
+constexpr int usageError = 2;
+
 struct Command {
     const char* name;
-    const char* usage;
-    int fewest; // arguments behind the name
-    int most;
-    int (*run)(const std::vector<std::string>& arguments); // gives the exit code
+    std::size_t fewest; // arguments behind the name
+    std::size_t most;
+    int (*run)(const Arguments& arguments); // gives the exit code
 };
 
 constexpr Command commands[] = {
-    {"show", "FILE.zkt", 1, 1, ShowCommand},
-    {"write", "FILE.json [-o FILE.zkt]", 1, 3, WriteCommand},
-    {"check", "[--json] FILE...", 1, INT_MAX, CheckCommand},
-    {"trace", "[--size WxH] [--seed N] [--shows N] [--paces N] [FILE.zkt...]", 0, 1000,
-     TraceCommand},
+    {"show", 1, 1, ShowCommand},
+    {"write", 1, 3, WriteCommand},
+    {"check", 1, anyNumber, CheckCommand},
+    {"trace", 0, anyNumber, TraceCommand}, // counts for itself
 };
 
-int TellUsage() {
-    for (const Command& command : commands) {
-        std::fprintf(stderr, "usage: toon %s %s\n", command.name, command.usage);
+bool asksForHelp(const Arguments& arguments) {
+    return std::any_of(arguments.begin(), arguments.end(), [](const std::string& argument) {
+        return argument == "--help" || argument == "-h";
+    });
+}
+
+int Run(const Command& command, const Arguments& arguments) {
+    if (asksForHelp(arguments)) {
+        PrintHelp(command.name);
+        return 0;
     }
-    return 2;
+    if (arguments.size() < command.fewest || arguments.size() > command.most) {
+        std::fprintf(stderr, "usage: %s\n", UsageOf(command.name).c_str());
+        return usageError;
+    }
+    return command.run(arguments);
 }
 
 } // namespace
 
-int main(int count, char** arguments) {
-    constexpr int inFront = 2; // the program's name and the command's
-    const int behind = count - inFront;
+int main(int count, char** words) {
+    const Arguments all(words + std::min(count, 1), words + count);
+    const std::string name = all.empty() ? "" : all.front();
     for (const Command& command : commands) {
-        if (behind >= command.fewest && behind <= command.most &&
-            command.name == std::string(arguments[1])) {
-            return command.run({arguments + inFront, arguments + count});
+        if (name == command.name) {
+            return Run(command, {all.begin() + 1, all.end()});
         }
     }
-    return TellUsage();
+    if (asksForHelp({name})) {
+        PrintHelp("");
+        return 0;
+    }
+    std::fprintf(stderr, "toon: %s%s\nTry: toon --help\n",
+                 all.empty() ? "which command?" : "there is no command ", name.c_str());
+    return usageError;
 }

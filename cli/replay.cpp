@@ -1,6 +1,5 @@
 #include "cli/replay.h"
 
-#include "platform/harness.h"
 #include "platform/kernel.h"
 #include "platform/trace.h"
 #include "saver/saver_guard.h"
@@ -13,12 +12,11 @@
 #include "toon/settings.h"
 #include "toon/toon_document.h"
 
-#include <charconv>
-#include <cstdio>
 #include <cstdlib>
 #include <filesystem>
-#include <limits>
 #include <stdexcept>
+#include <strings.h>
+#include <system_error>
 
 namespace {
 
@@ -26,11 +24,12 @@ namespace fs = std::filesystem;
 
 constexpr const char* replayClass = "ReplayClass";
 
-std::function<void(const std::string&)> lineSink;
+const ReplayHooks* hooked = nullptr; // those of the replay under way
 int showsLeft = 0;
 int showsDone = 0;
 
 constexpr const char* homeVariable = "XDG_CONFIG_HOME";
+constexpr const char* runtimeVariable = "XDG_RUNTIME_DIR";
 
 /// The saver's procedure, but that the stage closes at the end of the last show. The first walk
 /// about tells of its end twice; it is over when the second message comes.
@@ -79,6 +78,10 @@ ReplayGround::ReplayGround() : before_(fs::current_path()) {
     fs::create_directories(root_ / "home");
     fs::create_directories(root_ / "toons");
     setenv(homeVariable, (root_ / "home").c_str(), 1);
+    if (std::getenv(runtimeVariable) == nullptr) {
+        lentRuntime_ = true; // the toolkit complains where there is none
+        setenv(runtimeVariable, root_.c_str(), 1);
+    }
     fs::current_path(root_ / "toons");
 }
 
@@ -86,6 +89,9 @@ ReplayGround::~ReplayGround() {
     std::error_code ignored;
     fs::current_path(before_, ignored);
     fs::remove_all(root_, ignored);
+    if (lentRuntime_) {
+        unsetenv(runtimeVariable);
+    }
     if (homeBefore_) {
         setenv(homeVariable, homeBefore_->c_str(), 1);
     } else {
@@ -113,88 +119,107 @@ void ForgetEarlierStages() {
     SaverClosing = 0;
 }
 
-void Replay(const ReplayOptions& options, const std::function<void(const std::string&)>& line) {
-    const ReplayGround ground;
-    for (const std::string& toon : options.toons) {
-        fs::copy_file(toon, ground.toons() / fs::path(toon).filename());
-    }
-    ForgetEarlierStages();
-    setStartSettings(options);
-    lineSink = line;
-    showsLeft = options.shows;
-    showsDone = 0;
-    seam::useManualClock(options.seed);
-    seam::answerBoxes([](const std::string&, const std::string&, UINT) { return IDOK; });
-    TraceStart();
-    TraceSink = [](const char* event) { lineSink(event); };
-    const HWND stage = createStage(options);
-    auto due = seam::nextDeadline();
-    while (due && *due <= options.longest && seam::runUntil(*due)) {
-        due = seam::nextDeadline();
-    }
-    DestroyWindow(stage);
-    Trace("end odometer=%u shows=%d", PacesWalked, showsDone);
-    seam::runUntil(seam::clockNow()); // takes the quit that the window's end has posted
-    TraceSink = nullptr;
-    seam::answerBoxes(nullptr);
-}
-
 namespace {
 
-/// Reads a decimal number that is all of the text and lies within the bounds.
-template <class Number>
-bool readNumber(const std::string& text, Number lowest, Number highest, Number& number) {
-    Number read{};
-    const char* end = text.data() + text.size();
-    const auto [stopped, error] = std::from_chars(text.data(), end, read);
-    if (error != std::errc() || stopped != end || read < lowest || read > highest) {
-        return false;
-    }
-    number = read;
-    return true;
+/// The name under which the saver finds a Toon, whatever its file is called.
+fs::path playedName(const fs::path& toon) {
+    const bool found = strcasecmp(toon.extension().c_str(), ".zkt") == 0 &&
+                       toon.filename().native().size() < NEXT_TOON_SIZE;
+    return found ? toon.filename() : "toon.zkt";
 }
 
-/// Reads one option with its value; false if it is none that we know.
-bool readOption(const std::string& name, const std::string& value, ReplayOptions& options) {
-    constexpr int largestSide = 0x7FFF;
-    if (name == "--size") {
-        const auto cross = value.find('x');
-        return cross != std::string::npos &&
-               readNumber(value.substr(0, cross), 1, largestSide, options.width) &&
-               readNumber(value.substr(cross + 1), 1, largestSide, options.height);
+void copyToons(const std::vector<std::string>& toons, const fs::path& before,
+               const fs::path& target) {
+    for (const std::string& toon : toons) {
+        std::error_code error;
+        fs::copy_file(before / toon, target / playedName(toon), error);
+        if (error) {
+            throw std::runtime_error(toon + ": " + error.message());
+        }
     }
-    if (name == "--shows") {
-        return readNumber(value, 1, std::numeric_limits<int>::max(), options.shows);
+}
+
+/// A stage whose shows are told of, up to its end, however that comes.
+class ToldStage {
+  public:
+    ToldStage(const ReplayOptions& options, const ReplayHooks& hooks, ReplayEnd& end) {
+        hooked = &hooks;
+        if (hooks.line) {
+            TraceSink = [](const char* event) { hooked->line(event); };
+        }
+        if (hooks.picture) {
+            seam::watchPictures([&](HWND, const RECT& drawn, const seam::PixelView& picture) {
+                hooks.picture(seam::clockNow(), drawn, picture);
+            });
+        }
+        seam::answerBoxes([&end](const std::string& text, const std::string&, UINT) {
+            end.message = end.message.empty() ? text : end.message;
+            return IDOK;
+        });
+        stage_ = createStage(options);
     }
-    constexpr auto largest = std::numeric_limits<std::uint32_t>::max();
-    if (name == "--seed") {
-        return readNumber(value, 0U, largest, options.seed);
+
+    ToldStage(const ToldStage&) = delete;
+    ToldStage& operator=(const ToldStage&) = delete;
+
+    ~ToldStage() {
+        close();
+        TraceSink = nullptr;
+        seam::watchPictures(nullptr);
+        seam::answerBoxes(nullptr);
+        hooked = nullptr;
     }
-    return name == "--paces" && readNumber(value, 0U, largest, options.paces);
+
+    bool stands() const {
+        return IsWindow(stage_) != FALSE;
+    }
+
+    void close() {
+        if (stands()) {
+            DestroyWindow(stage_);
+        }
+    }
+
+  private:
+    HWND stage_;
+};
+
+/// Goes from one moment at which something happens to the next one, as far as it may.
+void act(const ReplayOptions& options, const ReplayHooks& hooks) {
+    auto due = seam::nextDeadline();
+    bool stands = true;
+    while (stands && due && *due <= options.longest && (!hooks.goesOn || hooks.goesOn())) {
+        stands = seam::runUntil(*due);
+        due = seam::nextDeadline();
+    }
+    if (stands && due && *due > options.longest) {
+        seam::runUntil(options.longest);
+    }
 }
 
 } // namespace
 
-int TraceCommand(const std::vector<std::string>& arguments) {
-    ReplayOptions options;
-    for (std::size_t i = 0; i < arguments.size(); ++i) {
-        if (arguments[i].rfind("--", 0) != 0) {
-            options.toons.push_back(fs::absolute(arguments[i]));
-        } else if (i + 1 == arguments.size() ||
-                   !readOption(arguments[i], arguments[i + 1], options)) {
-            std::fprintf(stderr, "toon trace: %s is no option with a value that can be used\n",
-                         arguments[i].c_str());
-            return 2;
-        } else {
-            ++i;
-        }
+ReplayEnd Replay(const ReplayOptions& options, const ReplayHooks& hooks) {
+    setenv("QT_QPA_PLATFORM", "offscreen", 1); // whatever the user's desktop is
+    const fs::path before = fs::current_path();
+    const ReplayGround ground;
+    copyToons(options.toons, before, ground.toons());
+    ForgetEarlierStages();
+    setStartSettings(options);
+    showsLeft = options.shows;
+    showsDone = 0;
+    seam::useManualClock(options.seed);
+    TraceStart();
+    ReplayEnd end;
+    ToldStage stage(options, hooks, end);
+    if (!stage.stands()) {
+        throw std::runtime_error("there is no room for a stage of this size");
     }
-    setenv("QT_QPA_PLATFORM", "offscreen", 0);
-    try {
-        Replay(options, [](const std::string& event) { std::puts(event.c_str()); });
-    } catch (const std::exception& error) {
-        std::fprintf(stderr, "toon trace: %s\n", error.what());
-        return 1;
-    }
-    return 0;
+    act(options, hooks);
+    stage.close();
+    Trace("end odometer=%u shows=%d", PacesWalked, showsDone);
+    end.moment = seam::clockNow();
+    end.shows = showsDone;
+    seam::runUntil(end.moment); // takes the quit that the window's end has posted
+    return end;
 }

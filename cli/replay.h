@@ -2,6 +2,8 @@
 // the saver's own road from its window's creation on, the same each time for the same seed.
 #pragma once
 
+#include "platform/harness.h"
+
 #include <cstdint>
 #include <filesystem>
 #include <functional>
@@ -30,6 +32,7 @@ class ReplayGround {
     std::filesystem::path before_;
     std::filesystem::path root_;
     std::optional<std::string> homeBefore_;
+    bool lentRuntime_ = false;
 };
 
 /// Brings what outlives a stage to how it stands in a fresh process, so that the next stage doesn't
@@ -39,7 +42,7 @@ void ForgetEarlierStages();
 
 struct ReplayOptions {
     std::vector<std::string>
-        toons;        // whole paths; copied into a directory of their own. None: walks about
+        toons;        // files; copied into a directory of their own. None: walks about
     int width = 1024; // of the stage, in pixels
     int height = 768;
     std::uint32_t seed = 1;  // of the random numbers
@@ -49,12 +52,30 @@ struct ReplayOptions {
     bool statements = true;                       // whether walks about use the table of statements
 };
 
-/// Hands each line of the record to `line`. A stage that stands still for good, as after a Toon
-/// that doesn't load, is closed; message boxes are answered with OK. The settings are those of a
-/// fresh user and lie in a directory that goes at the end. Throws a std::exception that tells why
-/// if the files can't be copied.
-void Replay(const ReplayOptions& options, const std::function<void(const std::string&)>& line);
+/// Who is told of a show while it runs. What is empty isn't called.
+struct ReplayHooks {
+    /// Each line of the record.
+    std::function<void(const std::string& line)> line = {};
 
-/// `toon trace [--size WxH] [--seed N] [--shows N] [--paces N] [FILE...]`: prints the record; gives
-/// the exit code.
-int TraceCommand(const std::vector<std::string>& arguments);
+    /// What has been drawn becomes visible: the moment in ms from the stage's creation on, the
+    /// bounds of what was drawn, and the whole stage. More than one call of a moment: the last one
+    /// stands.
+    std::function<void(std::int64_t moment, const RECT& drawn, const seam::PixelView& stage)>
+        picture = {};
+
+    /// Asked before each moment at which something happens; false closes the stage.
+    std::function<bool()> goesOn = {};
+};
+
+struct ReplayEnd {
+    std::int64_t moment = 0; // at which the stage closed, in ms
+    int shows = 0;           // that have ended
+    std::string message;     // what the first message box said; empty if none came up
+};
+
+/// Acts shows out as the saver does. A stage that stands still for good, as after a Toon that
+/// doesn't load, is closed; message boxes are answered with OK. The settings are those of a fresh
+/// user and lie in a directory that goes at the end. What a hook throws closes the stage and is
+/// passed on, but for `line`, which must not throw. Throws a std::exception that tells why if the
+/// files can't be copied or there is no room for the stage.
+ReplayEnd Replay(const ReplayOptions& options, const ReplayHooks& hooks);

@@ -27,11 +27,11 @@ using Lines = std::vector<std::string>;
 Lines replay(const ReplayOptions& options) {
     // What is made once and kept has been made by the end of the first one.
     static const seam::HandleCounts baseline = [&] {
-        Replay(options, [](const std::string&) {});
+        Replay(options, {[](const std::string&) {}});
         return seam::liveHandles();
     }();
     Lines lines;
-    Replay(options, [&](const std::string& line) { lines.push_back(line); });
+    Replay(options, {[&](const std::string& line) { lines.push_back(line); }});
     EXPECT_EQ(seam::liveHandles(), baseline) << "a handle or timer was left behind";
     return lines;
 }

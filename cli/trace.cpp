@@ -1,0 +1,69 @@
+#include "cli/trace.h"
+
+#include "cli/interruption.h"
+#include "cli/options.h"
+
+#include <cerrno>
+#include <csignal>
+#include <cstdio>
+#include <cstring>
+#include <exception>
+
+const char* const traceUsage =
+    "FILE.zkt... | --walk-about [--size WxH] [--seed N] [--shows N] [--paces N] [--mode saver]";
+
+static std::string readTraceArguments(const std::vector<std::string>& line,
+                                      StageArguments& arguments) {
+    const std::string wrong = ReadArguments(
+        line, {optionSize, optionSeed, optionShows, optionPaces, optionMode, optionWalkAbout},
+        arguments);
+    if (wrong.empty() && arguments.names.empty() && !arguments.walkAbout) {
+        return "it takes a Toon, or --walk-about";
+    }
+    if (!arguments.walkAbout) {
+        arguments.stage.toons = arguments.names;
+    }
+    return wrong;
+}
+
+static int fail(const std::string& what) {
+    std::fprintf(stderr, "toon trace: %s\n", what.c_str());
+    return 1;
+}
+
+/// Prints the record. Whoever reads it may go before its end, as `head` does.
+static int printTrace(const ReplayOptions& options) {
+    int error = 0;
+    ReplayHooks hooks;
+    hooks.line = [&](const std::string& line) {
+        if (error == 0 && std::puts(line.c_str()) < 0) {
+            error = errno;
+        }
+    };
+    hooks.goesOn = [&] { return error == 0 && Interruption() == 0; };
+    const ReplayEnd end = Replay(options, hooks);
+    if (error == 0 && std::fflush(stdout) != 0) {
+        error = errno;
+    }
+    if (Interruption() != 0 || error == EPIPE) {
+        return EndBySignal(error == EPIPE ? SIGPIPE : Interruption());
+    }
+    if (error != 0) {
+        return fail(std::string("the record can't be written: ") + std::strerror(error));
+    }
+    return end.message.empty() ? 0 : fail(end.message);
+}
+
+int TraceCommand(const std::vector<std::string>& line) {
+    StageArguments arguments;
+    const std::string wrong = readTraceArguments(line, arguments);
+    if (!wrong.empty()) {
+        return TellWrongUsage("trace", wrong, traceUsage);
+    }
+    CatchInterruptions();
+    try {
+        return printTrace(arguments.stage);
+    } catch (const std::exception& error) {
+        return fail(error.what());
+    }
+}
