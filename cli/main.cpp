@@ -1,5 +1,6 @@
 // The program `toon`: what can be done with Toon files without a screen.
 #include "cli/check.h"
+#include "cli/film.h"
 #include "cli/help.h"
 #include "cli/show_write.h"
 #include "cli/trace.h"
@@ -28,7 +29,8 @@ constexpr Command commands[] = {
     {"show", 1, 1, ShowCommand},
     {"write", 1, 3, WriteCommand},
     {"check", 1, anyNumber, CheckCommand},
-    {"trace", 0, anyNumber, TraceCommand}, // counts for itself
+    {"film", 0, anyNumber, FilmCommand}, // this one and the next count for themselves
+    {"trace", 0, anyNumber, TraceCommand},
 };
 
 bool asksForHelp(const Arguments& arguments) {

@@ -51,7 +51,7 @@ static int printTrace(const ReplayOptions& options) {
     if (error != 0) {
         return fail(std::string("the record can't be written: ") + std::strerror(error));
     }
-    return end.message.empty() ? 0 : fail(end.message);
+    return end.message.empty() ? 0 : fail("the saver says: " + end.message);
 }
 
 int TraceCommand(const std::vector<std::string>& line) {
