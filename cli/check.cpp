@@ -85,7 +85,9 @@ ActedShow ActOut(const std::string& path) {
     options.toons = {std::filesystem::absolute(path)};
     options.longest = longestShow;
     ActedShow show;
-    Replay(options, [&](const std::string& line) { TakeLine(show, line); });
+    ReplayHooks hooks;
+    hooks.line = [&](const std::string& line) { TakeLine(show, line); };
+    Replay(options, hooks);
     return show;
 }
 

@@ -39,7 +39,7 @@ struct Field {
     std::size_t size;       // in bytes
     bool required;          // else it may be missing in what people write
     std::int64_t low;       // what the editor makes, as people see it; of a text, its characters
-    std::int64_t high;      //
+    std::int64_t high;      // the same
     std::int64_t most;      // characters that a text has room for
     std::string_view noun;  // "9 is no pose"
     std::string_view right; // "1 to 8 would be right"
