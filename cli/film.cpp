@@ -30,7 +30,7 @@ struct FilmArguments {
 
 std::string readFilmArguments(const std::vector<std::string>& line, FilmArguments& film) {
     StageArguments arguments;
-    const std::string wrong =
+    std::string wrong =
         ReadArguments(line, {optionSize, optionSeed, optionStill, optionWalkAbout}, arguments);
     if (!wrong.empty()) {
         return wrong;
@@ -73,7 +73,7 @@ ReplayEnd shoot(const FilmArguments& film, const std::function<void(const FilmPi
         reel.draw(moment, drawn, stage);
     };
     hooks.goesOn = goesOn;
-    const ReplayEnd end = Replay(film.stage, hooks);
+    ReplayEnd end = Replay(film.stage, hooks);
     reel.end(end.moment + lastPictureStays);
     if (last) {
         last->changed = {0, 0, last->pixels.width, last->pixels.height};

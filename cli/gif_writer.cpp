@@ -181,7 +181,8 @@ void GifWriter::putReduced(const FilmPicture& picture, const RECT& area) {
             }
         }
     }
-    const Palette palette(std::vector<DWORD>(Colours::most));
+    const std::vector<DWORD> unset(Colours::most);
+    const Palette palette(unset);
     int size = Colours::most;
     check(GifQuantizeBuffer(static_cast<unsigned>(area.right - area.left),
                             static_cast<unsigned>(area.bottom - area.top), &size, parts[0].data(),

@@ -3,8 +3,9 @@
 #pragma once
 
 /// From now on SIGINT, SIGTERM and SIGHUP are kept for Interruption, but for one that was ignored
-/// when the process started. The second of a kind ends the process at once. A file that grows
-/// beyond what the user may write is an error like that of a full disk, and ends nothing.
+/// when the process started. One that comes more than a second after the first ends the process at
+/// once: something hangs then. A file that grows beyond what the user may write is an error like
+/// that of a full disk, and ends nothing.
 void CatchInterruptions();
 
 /// The signal that has come; 0 if none has.

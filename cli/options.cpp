@@ -104,7 +104,7 @@ std::string ReadArguments(const std::vector<std::string>& line, const std::vecto
         } else if (line[place] == "--") {
             optionsOver = true;
         } else {
-            const std::string wrong = readOption(line, place, options, arguments);
+            std::string wrong = readOption(line, place, options, arguments);
             if (!wrong.empty()) {
                 return wrong;
             }

@@ -1,6 +1,8 @@
 // Windows: their making and end, their picture, painting, and handles that have gone stale.
 #include "tests/user/test_window.h"
 
+#include <tuple>
+
 namespace {
 
 using test::handlers;
@@ -133,6 +135,30 @@ TEST_F(Windows, DrawingShowsAtOnceAndAPaintIsClippedToItsArea) {
     FillRect(dc, &all, red); // the window's picture has gone: nothing is drawn, nothing breaks
     EXPECT_TRUE(ReleaseDC(window, dc)) << "also once the window has gone";
     DeleteObject(red);
+}
+
+TEST_F(Windows, WatchersAreToldOnceOfAllThatAHandlerDrewAlsoWhereNothingIsShown) {
+    const HWND hidden = test::makeWindow(50, 20, WS_POPUP);
+    std::vector<std::tuple<HWND, LONG, LONG, LONG, LONG, DWORD>> told;
+    seam::watchPictures([&](HWND which, const RECT& drawn, const seam::PixelView& picture) {
+        told.emplace_back(which, drawn.left, drawn.top, drawn.right, drawn.bottom,
+                          picture.bits[19 * picture.stride + 49] & 0xFFFFFFU);
+    });
+    test::handleWaiting();
+    told.clear();
+    const HDC dc = GetDC(hidden);
+    const RECT one{45, 18, 60, 60}; // as far as it goes
+    const RECT other{3, 4, 5, 6};
+    FillRect(dc, &one, HBRUSH{GetStockObject(LTGRAY_BRUSH)});
+    FillRect(dc, &other, HBRUSH{GetStockObject(LTGRAY_BRUSH)});
+    ReleaseDC(hidden, dc);
+    EXPECT_TRUE(told.empty()) << "the handler isn't done";
+    test::handleWaiting();
+    test::handleWaiting();
+    ASSERT_EQ(told.size(), 1U);
+    EXPECT_EQ(told[0], std::tuple(hidden, 3, 4, 50, 20, 0xC0C0C0U));
+    seam::watchPictures(nullptr);
+    DestroyWindow(hidden);
 }
 
 TEST_F(Windows, ResizingKeepsThePictureAndPaintsAnew) {
