@@ -132,10 +132,13 @@ void copyToons(const std::vector<std::string>& toons, const fs::path& before,
                const fs::path& target) {
     for (const std::string& toon : toons) {
         std::error_code error;
-        fs::copy_file(before / toon, target / playedName(toon), error);
+        const fs::path copy = target / playedName(toon);
+        fs::copy_file(before / toon, copy, error);
         if (error) {
             throw std::runtime_error(toon + ": " + error.message());
         }
+        // The saver would refuse one that it may not write, and wait with a box.
+        fs::permissions(copy, fs::perms::owner_read | fs::perms::owner_write, error);
     }
 }
 

@@ -2,6 +2,7 @@
 
 #include "cli/interruption.h"
 #include "cli/options.h"
+#include "platform/codepage.h"
 
 #include <cerrno>
 #include <csignal>
@@ -14,7 +15,7 @@ const char* const traceUsage =
 
 static std::string readTraceArguments(const std::vector<std::string>& line,
                                       StageArguments& arguments) {
-    const std::string wrong = ReadArguments(
+    std::string wrong = ReadArguments(
         line, {optionSize, optionSeed, optionShows, optionPaces, optionMode, optionWalkAbout},
         arguments);
     if (wrong.empty() && arguments.names.empty() && !arguments.walkAbout) {
@@ -31,12 +32,28 @@ static int fail(const std::string& what) {
     return 1;
 }
 
+/// A line as people read it: what he says is UTF-8, and stands on one line whatever it holds.
+static std::string shownLine(const std::string& line) {
+    const std::size_t key = line.find(" text=");
+    if (key == std::string::npos) {
+        return line;
+    }
+    std::string shown = line;
+    if (line.find(" bubble_show ") < key) {
+        shown = line.substr(0, key) + seam::utf8FromWindows1252(line.substr(key));
+    }
+    for (std::size_t at = 0; (at = shown.find('\n', at)) != std::string::npos; at += 2) {
+        shown.replace(at, 1, "\\n");
+    }
+    return shown;
+}
+
 /// Prints the record. Whoever reads it may go before its end, as `head` does.
 static int printTrace(const ReplayOptions& options) {
     int error = 0;
     ReplayHooks hooks;
     hooks.line = [&](const std::string& line) {
-        if (error == 0 && std::puts(line.c_str()) < 0) {
+        if (error == 0 && std::puts(shownLine(line).c_str()) < 0) {
             error = errno;
         }
     };

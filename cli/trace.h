@@ -8,4 +8,4 @@
 extern const char* const traceUsage;
 
 /// toon trace FILE.zkt... or --walk-about: prints the record of the show; gives the exit code.
-int TraceCommand(const std::vector<std::string>& arguments);
+int TraceCommand(const std::vector<std::string>& line);

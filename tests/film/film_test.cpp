@@ -152,6 +152,28 @@ TEST_F(Program, KeepsTheOnePictureOfAMoment) {
     EXPECT_FALSE(fs::exists("late.png"));
 }
 
+TEST_F(Program, TracesTheRecordInUtf8WithOneLineAnEvent) {
+    make("short.zkt", toon({{60, 120, 2, 2, 0, "Caf\xE9,\rthen\ntea", 0}}));
+    ReplayOptions options;
+    options.toons = {"short.zkt"};
+    options.width = 320;
+    options.height = 240;
+    std::string record;
+    Replay(options, {[&](const std::string& line) {
+               const std::size_t said = line.find("Caf\xE9");
+               record += said == std::string::npos
+                             ? line
+                             : line.substr(0, said) + "Caf\xC3\xA9,\\rthen\\ntea";
+               record += '\n';
+           }});
+    EXPECT_THAT(record, HasSubstr("tea"));
+    EXPECT_EQ(run("trace --mode saver --size 320x240 short.zkt"), 0);
+    EXPECT_EQ(textOf("out"), record);
+    setMode("short.zkt", 0400); // the saver would refuse it, and there would be nothing to tell
+    EXPECT_EQ(run("trace short.zkt --size 320x240"), 0);
+    EXPECT_EQ(textOf("out"), record);
+}
+
 TEST_F(Program, SaysWhatIsWrongAndLeavesNothing) {
     make("short.zkt", shortToon);
     make("out", "");
