@@ -84,6 +84,7 @@ ActedShow ActOut(const std::string& path) {
     ReplayOptions options;
     options.toons = {std::filesystem::absolute(path)};
     options.longest = longestShow;
+    options.anyName = false;
     ActedShow show;
     ReplayHooks hooks;
     hooks.line = [&](const std::string& line) { TakeLine(show, line); };

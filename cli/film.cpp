@@ -1,6 +1,7 @@
 #include "cli/film.h"
 
 #include "cli/film_writer.h"
+#include "cli/help.h"
 #include "cli/interruption.h"
 #include "cli/options.h"
 #include "cli/progress.h"
@@ -13,9 +14,6 @@
 #include <stdexcept>
 
 namespace fs = std::filesystem;
-
-const char* const filmUsage =
-    "FILE.zkt | --walk-about OUT.gif|OUT.png|DIRECTORY [--size WxH] [--seed N] [--still MS]";
 
 static constexpr std::int64_t lastPictureStays = 1000; // ms, behind the end of the show
 
@@ -137,7 +135,7 @@ int FilmCommand(const std::vector<std::string>& line) {
     try {
         const std::string wrong = readFilmArguments(line, film);
         if (!wrong.empty()) {
-            return TellWrongUsage("film", wrong, filmUsage);
+            return TellWrongUsage("film", wrong);
         }
         makeFilm(film);
     } catch (const std::exception& error) {

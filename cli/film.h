@@ -4,9 +4,6 @@
 #include <string>
 #include <vector>
 
-/// What stands behind `toon film`, for the user.
-extern const char* const filmUsage;
-
 /// toon film FILE.zkt OUT, or --walk-about OUT: acts a show out and keeps it as a film, or as one
 /// picture with --still MS. What OUT ends in says the form (film_writer.h). Gives the exit code.
 int FilmCommand(const std::vector<std::string>& line);

@@ -13,7 +13,8 @@ struct Help {
 
 constexpr const char* overview =
     "\n"
-    "A Toon is a little play for Dorbo: frames that say where he walks, which pose he strikes, what he\n"
+    "A Toon is a little play for Dorbo: frames that say where he walks, which pose he strikes, "
+    "what he\n"
     "says and how long he stays. The saver plays the .zkt files of one directory.\n"
     "\n"
     "  Begin with one that is there:     toon show intro.zkt > mine.json\n"
@@ -21,13 +22,15 @@ constexpr const char* overview =
     "  See what the saver makes of it:   toon check mine.zkt\n"
     "  Send it to a friend:              toon film mine.zkt mine.gif\n"
     "\n"
-    "`toon COMMAND --help` tells more of each. Exit code: 0 done, 1 something is wrong with a file,\n"
+    "`toon COMMAND --help` tells more of each. Exit code: 0 done, 1 something is wrong with a "
+    "file,\n"
     "2 the command line is.\n";
 
 constexpr Help helps[] = {
     {"show", "FILE.zkt", "prints a Toon as JSON",
      "\n"
-     "Poses count from 1. In texts \\n is the line break of a bubble; \\r stands for a line feed, which\n"
+     "Poses count from 1. In texts \\n is the line break of a bubble; \\r stands for a line feed, "
+     "which\n"
      "no editor of Toons writes. What is printed can be turned back by `toon write`.\n"
      "\n"
      "  toon show intro.zkt                    look at it\n"
@@ -37,7 +40,8 @@ constexpr Help helps[] = {
      "\n"
      "  -o FILE.zkt   where to; else beside the source, with .zkt for .json\n"
      "\n"
-     "An error names the file, the line, the frame and the field, and what would be right. Nothing is\n"
+     "An error names the file, the line, the frame and the field, and what would be right. Nothing "
+     "is\n"
      "written then.\n"
      "\n"
      "  toon write mine.json                   makes mine.zkt\n"
@@ -46,25 +50,26 @@ constexpr Help helps[] = {
      "\n"
      "  --json   the same for programs: an array with an object for each file\n"
      "\n"
-     "A line each: how many frames and seconds, or what is out of range, what would stand still for\n"
+     "A line each: how many frames and seconds, or what is out of range, what would stand still "
+     "for\n"
      "ever, what can't be played. Exit code 1 if anything is wrong.\n"
      "\n"
      "  toon check *.zkt\n"
      "  toon check --json *.zkt | jq '.[] | select(.findings != [])'\n"},
-    {"film", "FILE.zkt OUT [--size WxH] [--seed N] [--walk-about] [--still MS]",
+    {"film", "FILE.zkt OUT | --walk-about OUT [--size WxH] [--seed N] [--still MS]",
      "acts a Toon out and films it, without a screen",
      "\n"
      "  OUT           .gif, .png (animated), or a directory for numbered pictures\n"
      "  --size WxH    the stage in pixels; 1024x768 if not told\n"
      "  --seed N      of the random numbers; the same film for the same seed\n"
-     "  --walk-about  films a walk about, in the place of a Toon: toon film --walk-about OUT\n"
+     "  --walk-about  films a walk about, in the place of a Toon\n"
      "  --still MS    the one picture that stands MS milliseconds after the start\n"
      "\n"
      "  toon film intro.zkt intro.gif\n"
      "  toon film intro.zkt intro.png --size 640x480\n"
      "  toon film intro.zkt title.png --still 1000\n"},
     {"trace",
-     "[FILE.zkt...] [--size WxH] [--seed N] [--mode saver] [--walk-about] [--shows N] [--paces N]",
+     "FILE.zkt... | --walk-about [--size WxH] [--seed N] [--mode saver] [--shows N] [--paces N]",
      "prints what happens in a show, to the millisecond",
      "\n"
      "  --size WxH    the stage in pixels; 1024x768 if not told\n"
@@ -110,8 +115,13 @@ bool PrintHelp(const std::string& command) {
     return true;
 }
 
-std::string UsageOf(const std::string& command) {
+int TellWrongUsage(const std::string& command, const std::string& wrong) {
+    constexpr int wrongUsage = 2;
+    if (!wrong.empty()) {
+        std::fprintf(stderr, "toon %s: %s\n", command.c_str(), wrong.c_str());
+    }
     const Help* help = find(command);
-    return help == nullptr ? "toon COMMAND ARGUMENTS"
-                           : std::string("toon ") + help->name + " " + help->arguments;
+    std::fprintf(stderr, "usage: toon %s %s\n", command.c_str(),
+                 help == nullptr ? "" : help->arguments);
+    return wrongUsage;
 }

@@ -7,5 +7,6 @@
 /// empty name. False if there is no such command.
 bool PrintHelp(const std::string& command);
 
-/// The command's line of usage, "toon NAME ARGUMENTS", for error messages.
-std::string UsageOf(const std::string& command);
+/// Says on stderr what is wrong with a command line, if it isn't empty, and how the command is
+/// used; gives the exit code.
+int TellWrongUsage(const std::string& command, const std::string& wrong);

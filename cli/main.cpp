@@ -45,8 +45,7 @@ int Run(const Command& command, const Arguments& arguments) {
         return 0;
     }
     if (arguments.size() < command.fewest || arguments.size() > command.most) {
-        std::fprintf(stderr, "usage: %s\n", UsageOf(command.name).c_str());
-        return usageError;
+        return TellWrongUsage(command.name, "");
     }
     return command.run(arguments);
 }

@@ -112,10 +112,3 @@ std::string ReadArguments(const std::vector<std::string>& line, const std::vecto
     }
     return "";
 }
-
-int TellWrongUsage(const char* command, const std::string& wrong, const char* usage) {
-    constexpr int wrongUsage = 2;
-    std::fprintf(stderr, "toon %s: %s\nusage: toon %s %s\n", command, wrong.c_str(), command,
-                 usage);
-    return wrongUsage;
-}

@@ -128,11 +128,11 @@ fs::path playedName(const fs::path& toon) {
     return found ? toon.filename() : "toon.zkt";
 }
 
-void copyToons(const std::vector<std::string>& toons, const fs::path& before,
-               const fs::path& target) {
-    for (const std::string& toon : toons) {
+void copyToons(const ReplayOptions& options, const fs::path& before, const fs::path& target) {
+    for (const std::string& toon : options.toons) {
         std::error_code error;
-        const fs::path copy = target / playedName(toon);
+        const fs::path copy =
+            target / (options.anyName ? playedName(toon) : fs::path(toon).filename());
         fs::copy_file(before / toon, copy, error);
         if (error) {
             throw std::runtime_error(toon + ": " + error.message());
@@ -206,7 +206,7 @@ ReplayEnd Replay(const ReplayOptions& options, const ReplayHooks& hooks) {
     setenv("QT_QPA_PLATFORM", "offscreen", 1); // whatever the user's desktop is
     const fs::path before = fs::current_path();
     const ReplayGround ground;
-    copyToons(options.toons, before, ground.toons());
+    copyToons(options, before, ground.toons());
     ForgetEarlierStages();
     setStartSettings(options);
     showsLeft = options.shows;

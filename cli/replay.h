@@ -50,6 +50,7 @@ struct ReplayOptions {
     std::uint32_t paces = 0; // the odometer at the start; 0 plays intro.zkt first
     std::int64_t longest = 24LL * 60 * 60 * 1000; // ms, after which the stage closes at the latest
     bool statements = true;                       // whether walks about use the table of statements
+    bool anyName = true; // a Toon is played whatever its file is called; else as the saver finds it
 };
 
 /// Who is told of a show while it runs. What is empty isn't called.

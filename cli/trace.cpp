@@ -1,5 +1,6 @@
 #include "cli/trace.h"
 
+#include "cli/help.h"
 #include "cli/interruption.h"
 #include "cli/options.h"
 #include "platform/codepage.h"
@@ -9,9 +10,6 @@
 #include <cstdio>
 #include <cstring>
 #include <exception>
-
-const char* const traceUsage =
-    "FILE.zkt... | --walk-about [--size WxH] [--seed N] [--shows N] [--paces N] [--mode saver]";
 
 static std::string readTraceArguments(const std::vector<std::string>& line,
                                       StageArguments& arguments) {
@@ -75,7 +73,7 @@ int TraceCommand(const std::vector<std::string>& line) {
     StageArguments arguments;
     const std::string wrong = readTraceArguments(line, arguments);
     if (!wrong.empty()) {
-        return TellWrongUsage("trace", wrong, traceUsage);
+        return TellWrongUsage("trace", wrong);
     }
     CatchInterruptions();
     try {
