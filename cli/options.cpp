@@ -21,7 +21,7 @@ bool readNumber(const std::string& text, Number lowest, Number highest, Number& 
 }
 
 bool readSize(const std::string& value, StageArguments& arguments) {
-    constexpr int largestSide = 0x7FFF;
+    constexpr int largestSide = 8192; // pixels: beyond it pictures fill the memory
     const auto cross = value.find('x');
     return cross != std::string::npos &&
            readNumber(value.substr(0, cross), 1, largestSide, arguments.stage.width) &&
@@ -86,8 +86,7 @@ std::string readOption(const std::vector<std::string>& line, std::size_t& place,
 
 } // namespace
 
-const Option optionSize = {"--size", "a width and a height of 1 to 32767, as in 1024x768",
-                           readSize};
+const Option optionSize = {"--size", "a width and a height of 1 to 8192, as in 1024x768", readSize};
 const Option optionSeed = {"--seed", "a number of 0 to 4294967295", readSeed};
 const Option optionShows = {"--shows", "a number from 1 on", readShows};
 const Option optionPaces = {"--paces", "a number of 0 to 4294967295", readPaces};

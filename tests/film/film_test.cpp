@@ -185,7 +185,7 @@ TEST_F(Program, SaysWhatIsWrongAndLeavesNothing) {
         {"film short.zkt", 2, "toon film: it takes a FILE.zkt and one OUT\nusage: toon film FILE"},
         {"film --walk-about", 2, "toon film: with --walk-about it takes one OUT\n"},
         {"film short.zkt a.gif --shows 2", 2, "toon film: --shows is no option here\n"},
-        {"film short.zkt a.gif --size 0x5", 2, "--size takes a width and a height of 1 to 32767"},
+        {"film short.zkt a.gif --size 0x5", 2, "--size takes a width and a height of 1 to 8192"},
         {"film short.zkt a.gif --size 5", 2, ", not 5\n"},
         {"film short.zkt a.gif --seed", 2, "toon film: --seed takes a number of 0 to 4294967295\n"},
         {"film short.zkt a.gif --seed 4294967296", 2, ", not 4294967296\n"},
