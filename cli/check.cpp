@@ -1,5 +1,7 @@
 #include "cli/check.h"
 
+#include "cli/help.h"
+#include "cli/interruption.h"
 #include "cli/json_text.h"
 #include "cli/replay.h"
 #include "cli/show_write.h"
@@ -11,10 +13,13 @@
 #include <unistd.h>
 
 #include <algorithm>
+#include <cerrno>
 #include <cinttypes>
 #include <cmath>
+#include <csignal>
 #include <cstdio>
 #include <cstdlib>
+#include <cstring>
 #include <exception>
 #include <filesystem>
 
@@ -88,6 +93,7 @@ ActedShow ActOut(const std::string& path) {
     ActedShow show;
     ReplayHooks hooks;
     hooks.line = [&](const std::string& line) { TakeLine(show, line); };
+    hooks.goesOn = [] { return Interruption() == 0; };
     Replay(options, hooks);
     return show;
 }
@@ -278,23 +284,27 @@ void PrintJson(const std::string& path, const ToonReport& report) {
 
 } // namespace
 
-int CheckCommand(const std::vector<std::string>& arguments) {
-    const bool json = arguments.front() == "--json";
-    const std::vector<std::string> files(arguments.begin() + (json ? 1 : 0), arguments.end());
-    if (files.empty() || files.front().starts_with("--")) {
-        std::fputs("usage: toon check [--json] FILE...\n", stderr);
-        return 2;
+namespace {
+
+ToonReport CheckOrTell(const std::string& file) {
+    try {
+        return CheckToon(file);
+    } catch (const std::exception& error) {
+        ToonReport report;
+        report.findings.push_back({0, "", std::string("it can't be acted out: ") + error.what()});
+        return report;
     }
-    setenv("QT_QPA_PLATFORM", "offscreen", 1);
+}
+
+/// Prints what is found of each file, up to the one that is under way when a signal comes. Whether
+/// any is faulty.
+bool PrintAll(const std::vector<std::string>& files, bool json) {
     bool faulty = false;
     const char* between = "[\n";
     for (const std::string& file : files) {
-        ToonReport report;
-        try {
-            report = CheckToon(file);
-        } catch (const std::exception& error) {
-            report.findings.push_back(
-                {0, "", std::string("it can't be acted out: ") + error.what()});
+        const ToonReport report = CheckOrTell(file);
+        if (Interruption() != 0) {
+            return faulty;
         }
         faulty = faulty || report.faulty();
         if (json) {
@@ -308,9 +318,43 @@ int CheckCommand(const std::vector<std::string>& arguments) {
     if (json) {
         std::fputs("\n]\n", stdout);
     }
-    if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0) {
-        std::perror("toon check: the report can't be printed");
-        return 1;
+    return faulty;
+}
+
+} // namespace
+
+std::string WhyUnplayable(const std::string& path) {
+    std::string bytes;
+    Toon toon{};
+    std::string error = ReadWholeFile(path, bytes);
+    if (error.empty()) {
+        error = ToonFromBytes(bytes, toon);
+    }
+    return error.empty() && toon.frames.empty() ? "it has no frame" : error;
+}
+
+int CheckCommand(const std::vector<std::string>& arguments) {
+    std::vector<std::string> files = arguments;
+    const bool json = std::erase(files, "--json") != 0;
+    const auto option = std::find_if(
+        files.begin(), files.end(), [](const std::string& file) { return file.starts_with("--"); });
+    if (option != files.end()) {
+        return TellWrongUsage("check", *option + " is no option");
+    }
+    if (files.empty()) {
+        return TellWrongUsage("check", "it takes a FILE.zkt");
+    }
+    setenv("QT_QPA_PLATFORM", "offscreen", 1);
+    CatchInterruptions();
+    const bool faulty = PrintAll(files, json);
+    const bool printed = std::fflush(stdout) == 0 && std::ferror(stdout) == 0;
+    if (Interruption() != 0) {
+        return EndBySignal(Interruption());
+    }
+    if (!printed) {
+        const int error = errno;
+        std::fprintf(stderr, "toon check: the report can't be printed: %s\n", std::strerror(error));
+        return error == EPIPE ? EndBySignal(SIGPIPE) : 1;
     }
     return faulty ? 1 : 0;
 }

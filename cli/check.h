@@ -22,5 +22,8 @@ struct ToonReport {
 /// Throws a std::exception if that can't be done.
 ToonReport CheckToon(const std::string& path);
 
-/// `toon check [--json] FILE...`: prints what was found, a line each; gives the exit code.
+/// Why the file is no Toon that can be acted out, read only as far as that; empty if it is one.
+std::string WhyUnplayable(const std::string& path);
+
+/// `toon check [--json] FILE.zkt...`: prints what was found, a line each; gives the exit code.
 int CheckCommand(const std::vector<std::string>& arguments);

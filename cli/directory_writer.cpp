@@ -7,7 +7,8 @@
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
-#include <sstream>
+#include <set>
+#include <stdexcept>
 #include <sys/stat.h>
 
 namespace {
@@ -35,7 +36,8 @@ class DirectoryWriter : public FilmWriter {
     void writeFile(const std::string& name, const Bytes& bytes) const;
     void pack(const FilmPicture& picture);
     Bytes whole(const seam::PixelView& picture) const;
-    void removeEarlier() const;
+    std::set<std::string> earlier() const;
+    void refuseToReplaceOthers(const std::set<std::string>& ours) const;
 
     std::string shown_; // the path as the user gave it
     fs::path path_;
@@ -142,30 +144,48 @@ void DirectoryWriter::add(const FilmPicture& picture) {
     writeFile(names_.back(), whole(picture.pixels));
 }
 
-/// Takes away what the list of an earlier film names, and nothing else.
-void DirectoryWriter::removeEarlier() const {
+/// The pictures of an earlier film, by the list that it left, and that list.
+std::set<std::string> DirectoryWriter::earlier() const {
+    std::set<std::string> names;
     std::ifstream list(path_ / timesName);
     for (std::string line; std::getline(list, line);) {
         const std::string name = line.substr(0, line.find(' '));
-        if (name.ends_with(".png") && name.find('/') == std::string::npos) {
-            std::error_code ignored;
-            fs::remove(path_ / name, ignored);
+        if (!name.ends_with(".png") || name.find('/') != std::string::npos) {
+            return {}; // somebody else's list
+        }
+        names.insert(name);
+    }
+    if (!names.empty()) {
+        names.insert(timesName);
+    }
+    return names;
+}
+
+void DirectoryWriter::refuseToReplaceOthers(const std::set<std::string>& ours) const {
+    for (const std::string& name : names_) {
+        if (!ours.contains(name) && fs::exists(fs::symlink_status(path_ / name))) {
+            throw std::runtime_error(shown_ + "/" + name + ": it is there, and of no film");
         }
     }
 }
 
 void DirectoryWriter::finish() {
+    std::set<std::string> surplus = earlier();
     writeFile(timesName, Bytes(times_.begin(), times_.end()));
-    removeEarlier();
     names_.emplace_back(timesName);
+    refuseToReplaceOthers(surplus);
     for (const std::string& name : names_) {
         std::error_code error;
         fs::rename(work_ / name, path_ / name, error);
         if (error) {
             FailWith(shown_ + "/" + name, error.value());
         }
+        surplus.erase(name);
     }
     std::error_code ignored;
+    for (const std::string& name : surplus) {
+        fs::remove(path_ / name, ignored);
+    }
     fs::remove(work_, ignored);
 }
 

@@ -1,5 +1,6 @@
 #include "cli/film.h"
 
+#include "cli/check.h"
 #include "cli/film_writer.h"
 #include "cli/help.h"
 #include "cli/interruption.h"
@@ -81,7 +82,7 @@ ReplayEnd shoot(const FilmArguments& film, const std::function<void(const FilmPi
     return end;
 }
 
-/// Acts the show out for a first time, which takes a hundredth of the film's making or less.
+/// Acts the show out for a first time, to know its length and its colours.
 FilmPlan planFilm(const FilmArguments& film) {
     FilmPlan plan;
     const ReplayEnd end = shoot(film, [&](const FilmPicture& picture) {
@@ -106,7 +107,13 @@ std::unique_ptr<FilmWriter> writerFor(const std::string& out, const FilmPlan& pl
     if (extension == ".gif") {
         return MakeGifWriter(out, plan);
     }
-    return extension == ".png" ? MakePngWriter(out, plan) : MakeDirectoryWriter(out, plan);
+    if (extension == ".png") {
+        return MakePngWriter(out, plan);
+    }
+    if (!extension.empty() && !fs::is_directory(out)) {
+        throw std::runtime_error(out + ": a film ends in .gif or .png, or is a directory");
+    }
+    return MakeDirectoryWriter(out, plan);
 }
 
 void makeFilm(const FilmArguments& film) {
@@ -136,6 +143,12 @@ int FilmCommand(const std::vector<std::string>& line) {
         const std::string wrong = readFilmArguments(line, film);
         if (!wrong.empty()) {
             return TellWrongUsage("film", wrong);
+        }
+        for (const std::string& toon : film.stage.toons) {
+            const std::string unplayable = WhyUnplayable(toon);
+            if (!unplayable.empty()) {
+                throw std::runtime_error(toon + ": " + unplayable);
+            }
         }
         makeFilm(film);
     } catch (const std::exception& error) {

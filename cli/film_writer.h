@@ -42,5 +42,6 @@ std::unique_ptr<FilmWriter> MakePngWriter(const std::string& path, const FilmPla
 
 /// A directory, made if it is missing, with pictures 0001.png, 0002.png and so on, and times.txt,
 /// of which each line tells a picture, when it comes and how long it stands, in ms. The pictures of
-/// an earlier film there are replaced by it.
+/// an earlier film there, by its times.txt, are replaced by it; anything else of these names is an
+/// error.
 std::unique_ptr<FilmWriter> MakeDirectoryWriter(const std::string& path, const FilmPlan& plan);

@@ -88,7 +88,8 @@ std::string BytesForText(const Field& field, std::string_view text, std::string&
         }
         if (!byte || byte->size() != 1) {
             const std::string seen = IsUtf8(character) ? JsonText(character) + ", " : "";
-            error = Advice(seen + CodePoint(character) + ", is not in Windows-1252",
+            error = Advice(seen + CodePoint(character) + (seen.empty() ? "" : ",") +
+                               " is not in Windows-1252",
                            "a character of that set");
             return "";
         }
@@ -354,7 +355,7 @@ bool Reader::closeFrame() {
         }
     }
     place_ = Place::frames;
-    name_ = "";
+    name_ = framesName;
     return true;
 }
 

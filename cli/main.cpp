@@ -16,7 +16,6 @@ namespace {
 using Arguments = std::vector<std::string>;
 
 constexpr std::size_t anyNumber = std::numeric_limits<std::size_t>::max();
-constexpr int usageError = 2;
 
 struct Command {
     const char* name;
@@ -64,6 +63,7 @@ int main(int count, char** words) {
         PrintHelp("");
         return 0;
     }
+    constexpr int usageError = 2;
     std::fprintf(stderr, "toon: %s%s\nTry: toon --help\n",
                  all.empty() ? "which command?" : "there is no command ", name.c_str());
     return usageError;

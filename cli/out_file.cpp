@@ -19,7 +19,12 @@ OutFile::OutFile(const std::string& path) : shown_(path) {
     std::error_code error;
     const fs::file_status status = fs::status(path, error);
     if (fs::exists(status) && !fs::is_regular_file(status)) {
-        FailWith(path, fs::is_directory(status) ? EISDIR : EINVAL);
+        throw std::runtime_error(path + ": it is no regular file");
+    }
+    constexpr fs::perms anybodyWrites =
+        fs::perms::owner_write | fs::perms::group_write | fs::perms::others_write;
+    if (fs::exists(status) && (status.permissions() & anybodyWrites) == fs::perms::none) {
+        FailWith(path, EACCES); // read-only by its mode bits, for whoever it is
     }
     if (fs::exists(status) && access(path.c_str(), W_OK) != 0) {
         FailWith(path, errno);

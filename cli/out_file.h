@@ -14,7 +14,8 @@ using Bytes = std::vector<std::uint8_t>;
 /// Each operation throws as above. A file that isn't put into its place goes with its record.
 class OutFile {
   public:
-    /// What stands at the path already has to be a regular file; a link stays one.
+    /// What stands at the path already has to be a regular file that isn't
+    /// read-only; a link to one stays a link.
     explicit OutFile(const std::string& path);
     OutFile(const OutFile&) = delete;
     OutFile& operator=(const OutFile&) = delete;

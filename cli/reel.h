@@ -18,8 +18,8 @@ struct FilmPicture {
 /// and what looks as before, makes none.
 class Reel {
   public:
-    /// `sink` gets each picture when it is known how long it stands; the pixels are good until it
-    /// returns. The first picture has changed everywhere.
+    /// `sink` gets each picture when it is known how long it stands; the pixels are good until
+    /// the next picture, or the end of the reel. The first picture has changed everywhere.
     explicit Reel(std::function<void(const FilmPicture&)> sink);
 
     /// These bounds of the stage have been drawn. Moments never go back.

@@ -134,6 +134,9 @@ void copyToons(const ReplayOptions& options, const fs::path& before, const fs::p
         const fs::path copy =
             target / (options.anyName ? playedName(toon) : fs::path(toon).filename());
         fs::copy_file(before / toon, copy, error);
+        if (error == std::errc::file_exists) {
+            throw std::runtime_error(toon + ": another Toon has this name already");
+        }
         if (error) {
             throw std::runtime_error(toon + ": " + error.message());
         }

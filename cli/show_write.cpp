@@ -1,5 +1,6 @@
 #include "cli/show_write.h"
 
+#include "cli/help.h"
 #include "cli/toon_json.h"
 
 #include "platform/kernel/transfer.h"
@@ -85,8 +86,7 @@ int ShowCommand(const std::vector<std::string>& arguments) {
 int WriteCommand(const std::vector<std::string>& arguments) {
     WriteOptions options;
     if (!ReadWriteOptions(arguments, options)) {
-        std::fputs("usage: toon write FILE.json [-o FILE.zkt]\n", stderr);
-        return 2;
+        return TellWrongUsage("write", "");
     }
     std::string text;
     const std::string unread = ReadWholeFile(options.source, text);

@@ -1,5 +1,6 @@
 #include "cli/trace.h"
 
+#include "cli/check.h"
 #include "cli/help.h"
 #include "cli/interruption.h"
 #include "cli/options.h"
@@ -74,6 +75,12 @@ int TraceCommand(const std::vector<std::string>& line) {
     const std::string wrong = readTraceArguments(line, arguments);
     if (!wrong.empty()) {
         return TellWrongUsage("trace", wrong);
+    }
+    for (const std::string& toon : arguments.stage.toons) {
+        const std::string unplayable = WhyUnplayable(toon);
+        if (!unplayable.empty()) {
+            return fail(toon + ": " + unplayable);
+        }
     }
     CatchInterruptions();
     try {

@@ -179,7 +179,9 @@ TEST_F(Program, SaysWhatIsWrongAndLeavesNothing) {
     make("out", "");
     make("err", "");
     make("taken.gif/file", "");
+    make("mine/0001.png", "");
     make("no-toon.zkt", "frame\npause 1\n");
+    make("no-frame.zkt", toon({}));
     const std::vector<std::string> before = files();
     const std::tuple<const char*, int, const char*> cases[] = {
         {"film short.zkt", 2, "toon film: it takes a FILE.zkt and one OUT\nusage: toon film FILE"},
@@ -192,15 +194,18 @@ TEST_F(Program, SaysWhatIsWrongAndLeavesNothing) {
         {"film short.zkt a.gif --still 1s", 2, "--still takes a moment in milliseconds"},
         {"trace short.zkt --mode editor", 2, "toon trace: --mode takes saver, not editor\n"},
         {"trace", 2, "toon trace: it takes a Toon, or --walk-about\n"},
-        {"film missing.zkt a.gif", 1, "toon film: missing.zkt: No such file or directory\n"},
+        {"film missing.zkt a.gif", 1, "toon film: missing.zkt: it can't be read: No such file"},
         {"film no-toon.zkt a.gif", 1,
-         "toon film: no-toon.zkt: the saver says: Not enough memory.\n"},
+         "toon film: no-toon.zkt: it is no Toon: of the header's 104 bytes it has 14\n"},
         {"film short.zkt missing/a.gif", 1, "toon film: missing/a.gif: No such file"},
         {"film short.zkt missing/a", 1, "toon film: missing/a: No such file"},
-        {"film short.zkt taken.gif", 1, "toon film: taken.gif: Is a directory\n"},
-        {"film short.zkt no-toon.zkt", 1, "toon film: no-toon.zkt: Not a directory\n"},
-        {"trace missing.zkt", 1, "toon trace: missing.zkt: No such file or directory\n"},
-        {"trace no-toon.zkt", 1, "toon trace: the saver says: Not enough memory.\n"},
+        {"film short.zkt taken.gif", 1, "toon film: taken.gif: it is no regular file\n"},
+        {"film short.zkt a.jpg", 1, "a film ends in .gif or .png, or is a directory\n"},
+        {"film short.zkt err", 1, "toon film: err: Not a directory\n"},
+        {"film short.zkt mine", 1, "toon film: mine/0001.png: it is there, and of no film\n"},
+        {"trace missing.zkt", 1, "toon trace: missing.zkt: it can't be read: No such file"},
+        {"trace no-toon.zkt", 1, "toon trace: no-toon.zkt: it is no Toon"},
+        {"trace no-frame.zkt", 1, "toon trace: no-frame.zkt: it has no frame\n"},
     };
     for (const auto& [arguments, code, reason] : cases) {
         EXPECT_EQ(run(arguments), code) << arguments;
@@ -243,12 +248,15 @@ TEST_F(Program, LeavesNothingWhenItIsEndedFromOutside) {
     const std::vector<std::string> before = files();
     const std::tuple<int, const char*, std::size_t> cases[] = {
         {SIGINT, "film.gif", 1}, // while it is planned: the files that pass are there
-        {SIGINT, "film.gif", 7}, {SIGTERM, "film.png", 7}, {SIGHUP, "film", 9}, {SIGINT, "old", 9},
+        {SIGINT, "film.gif", 7}, {SIGTERM, "film.png", 7}, {SIGHUP, "film", 9},
+        {SIGINT, "old", 9},      {SIGINT, "check", 1},
     };
     for (const auto& [signal, out, filesThere] : cases) {
         SCOPED_TRACE(out);
         const pid_t child =
-            start({"toon", "film", "long.zkt", out, "--size", "1024x768", "--seed", "2"});
+            std::string("check") == out
+                ? start({"toon", "check", "long.zkt", "long.zkt", "long.zkt", "long.zkt"})
+                : start({"toon", "film", "long.zkt", out, "--size", "1024x768", "--seed", "2"});
         int status = 0;
         while (files().size() < before.size() + filesThere &&
                waitpid(child, &status, WNOHANG) == 0) {

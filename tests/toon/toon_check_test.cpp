@@ -210,14 +210,14 @@ TEST_F(ToonCheck, TheProgramPrintsLinesOrJsonAndItsCodeTellsWhetherAnythingIsWro
          "  }\n"
          "]\n"},
         {"--json", 2, ""},
-        {"--all one.zkt", 2, ""},
+        {"one.zkt --all", 2, ""},
     };
     for (const auto& [arguments, code, printed] : cases) {
         const std::string command = DORBO_TOON " check " + arguments + " >out 2>err";
         const int status = std::system(command.c_str());
         EXPECT_EQ(WIFEXITED(status) ? WEXITSTATUS(status) : -1, code) << arguments;
         EXPECT_EQ(textOf("out"), printed);
-        EXPECT_TRUE(code != 2 || textOf("err") == "usage: toon check [--json] FILE...\n");
+        EXPECT_EQ(textOf("err").find("usage: toon check") != std::string::npos, code == 2);
     }
     const int full = std::system(DORBO_TOON " check one.zkt >/dev/full 2>err");
     EXPECT_EQ(WEXITSTATUS(full), 1);
