@@ -246,7 +246,7 @@ void PrintLines(const std::string& path, const ToonReport& report) {
                     finding.fault ? "" : "note: ", Where(finding.frame, finding.field).c_str(),
                     finding.what.c_str());
     }
-    if (!report.faulty()) {
+    if (report.loads) {
         std::printf("%s: %s\n", path.c_str(), Summary(report).c_str());
     }
 }

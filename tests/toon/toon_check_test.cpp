@@ -176,7 +176,9 @@ TEST_F(ToonCheck, TheProgramPrintsLinesOrJsonAndItsCodeTellsWhetherAnythingIsWro
     const std::tuple<std::string, int, std::string> cases[] = {
         {"one.zkt", 0, "one.zkt: " + note + "one.zkt: 1 frame, 14 seconds (1 of pauses)\n"},
         {"\xE9.zkt no", 1,
-         "\xE9.zkt: " + pose + "no: it can't be read: No such file or directory\n"},
+         "\xE9.zkt: " + pose +
+             "\xE9.zkt: 1 frame, 14 seconds (1 of pauses)\n"
+             "no: it can't be read: No such file or directory\n"},
         {"--json \xE9.zkt one.zkt no", 1,
          "[\n"
          "  {\n"
