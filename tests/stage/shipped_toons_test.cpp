@@ -1,0 +1,152 @@
+// The Toons that come with the program, as somebody sees them who watches.
+#include "stage/bubble.h"
+#include "stage/character.h"
+#include "stage/player.h"
+#include "stage/walk.h"
+#include "tests/stage/stage_fixture.h"
+
+#include <cstdio>
+#include <filesystem>
+#include <set>
+
+namespace {
+
+namespace fs = std::filesystem;
+
+class ShippedToons : public StageTest {
+  protected:
+    void SetUp() override {
+        StageTest::SetUp();
+        before_ = fs::current_path();
+        fs::current_path(DORBO_TOONS);
+        for (const auto& entry : fs::directory_iterator(fs::path(DORBO_SOURCE_DIR) / "toons")) {
+            if (entry.path().extension() == ".json") {
+                names.insert(entry.path().stem().string() + ".zkt");
+            }
+        }
+    }
+
+    void TearDown() override {
+        fs::current_path(before_);
+        StageTest::TearDown();
+    }
+
+    std::vector<ToonFrame> open(const std::string& name) const {
+        EXPECT_EQ(ToonOpenNamed(stage, name.c_str()), 1) << name;
+        std::vector<ToonFrame> frames(static_cast<std::size_t>(FrameCount));
+        for (LONG index = 0; index < FrameCount; ++index) {
+            FrameGet(index, &frames[static_cast<std::size_t>(index)]);
+        }
+        return frames;
+    }
+
+    /// Acts the open Toon out until he goes off. Gives where he stood at the end of each walk.
+    std::vector<POINT> places() const {
+        PlayNextFrame(stage);
+        EXPECT_TRUE(runUntilEvent("walk_off"));
+        std::vector<POINT> found;
+        POINT at = {};
+        for (const std::string& line : events({"draw", "walk_done"})) {
+            if (line == "walk_done") {
+                found.push_back(at);
+            } else {
+                std::sscanf(line.c_str(), "draw i=%*d bitmap=%*s at=[%d,%d]", &at.x, &at.y);
+            }
+        }
+        return found;
+    }
+
+    /// The same show's bubbles.
+    static std::vector<RECT> bubbles() {
+        std::vector<RECT> found;
+        for (const std::string& line : events({"bubble_show"})) {
+            RECT area = {};
+            std::sscanf(line.c_str(), "bubble_show rect=[%d,%d,%d,%d]", &area.left, &area.top,
+                        &area.right, &area.bottom);
+            found.push_back(area);
+        }
+        return found;
+    }
+
+    std::set<std::string> names;
+
+  private:
+    fs::path before_;
+};
+
+/// How much of him is to be seen along one axis, of 130 pixels.
+LONG seen(LONG at, LONG length) {
+    return std::max<LONG>(0, std::min(at + CharacterSprite.cx, length) - std::max<LONG>(at, 0));
+}
+
+} // namespace
+
+TEST_F(ShippedToons, AreEightOnTilesOfTheirOwnAtEverySpeedInEveryPose) {
+    std::set<LONG> tiles;
+    std::set<LONG> speeds;
+    std::set<LONG> poses;
+    std::set<DWORD> winks;
+    for (const std::string& name : names) {
+        const std::vector<ToonFrame> frames = open(name);
+        EXPECT_THAT(frames.size(), testing::AllOf(testing::Ge(4U), testing::Le(12U))) << name;
+        tiles.insert(BackgroundIndex);
+        speeds.insert(ToonSpeed);
+        for (const ToonFrame& frame : frames) {
+            poses.insert(frame.pose);
+            winks.insert(static_cast<DWORD>(frame.wink));
+        }
+    }
+    EXPECT_EQ(names.size(), 8U);
+    EXPECT_TRUE(names.contains("intro.zkt"));
+    EXPECT_EQ(tiles.size(), names.size());
+    EXPECT_EQ(speeds, (std::set<LONG>{1, 2, 3, 4, 5}));
+    EXPECT_EQ(poses, (std::set<LONG>{0, 1, 2, 3, 4, 5, 6, 7}));
+    EXPECT_EQ(winks, (std::set<DWORD>{0, 1}));
+}
+
+TEST_F(ShippedToons, SayWhatFitsTheBubbleInLinesThatBreakWhereTheyMeanTo) {
+    constexpr int body = 71; // pixels of the bubble's height for text
+    PlaceBubble(stage);
+    const int line = DrawBubbleText(stage, "Hello");
+    ASSERT_GT(line, 0);
+    EXPECT_GT(DrawBubbleText(stage, "A line that is too long for him"), line);
+    for (const std::string& name : names) {
+        for (const ToonFrame& frame : open(name)) {
+            if (frame.text[0] == '\0') {
+                continue;
+            }
+            const std::string text = frame.text;
+            const auto lines = static_cast<int>(1 + std::count(text.begin(), text.end(), '\r'));
+            EXPECT_EQ(DrawBubbleText(stage, frame.text), lines * line) << name << ": " << text;
+            EXPECT_LE(lines * line, body) << name << ": " << text;
+        }
+    }
+}
+
+TEST_F(ShippedToons, ShowHimAndHisBubbleWhollyWhileHeSpeaksAndElseWhollyOrNotAtAll) {
+    const SIZE stages[] = {{640, 480}, {1024, 768}, {1920, 1080}};
+    for (const SIZE& size : stages) {
+        openStage(size.cx, size.cy);
+        for (const std::string& name : names) {
+            SCOPED_TRACE(name + " on " + std::to_string(size.cx) + "x" + std::to_string(size.cy));
+            const std::vector<ToonFrame> frames = open(name);
+            const std::vector<POINT> stood = places();
+            ASSERT_EQ(stood.size(), frames.size());
+            for (std::size_t i = 0; i < frames.size(); ++i) {
+                const LONG across = seen(stood[i].x, size.cx);
+                const LONG down = seen(stood[i].y, size.cy);
+                const bool wholly = across == CharacterSprite.cx && down == CharacterSprite.cy;
+                const bool silent = frames[i].text[0] == '\0';
+                EXPECT_TRUE(wholly || (silent && across * down == 0))
+                    << "frame " << i + 1 << ": " << stood[i].x << ' ' << stood[i].y;
+            }
+            for (const RECT& bubble : bubbles()) {
+                EXPECT_TRUE(bubble.left >= 0 && bubble.top >= 0 && bubble.right <= size.cx &&
+                            bubble.bottom <= size.cy)
+                    << "bubble at " << bubble.left << ' ' << bubble.top;
+            }
+            EXPECT_TRUE(runUntilEvent("walk_done"));
+            ResetShow(stage);
+        }
+    }
+}
