@@ -146,6 +146,7 @@ TEST_F(ShippedToons, ShowHimAndHisBubbleWhollyWhileHeSpeaksAndElseWhollyOrNotAtA
                     << "bubble at " << bubble.left << ' ' << bubble.top;
             }
             EXPECT_TRUE(runUntilEvent("walk_done"));
+            EXPECT_EQ(seen(CharacterSprite.drawX, size.cx), 0) << "he is still there at the end";
             ResetShow(stage);
         }
     }

@@ -192,7 +192,7 @@ TEST_F(ToonFile, ASavedToonComesBackByteForByte) {
     CurrentFrameIndex = 9;
     ASSERT_EQ(ToonOpenNamed(nullptr, "x.zkt"), 1);
     EXPECT_EQ(CurrentFrameIndex, 0);
-    EXPECT_EQ(EditFrame.x, 420);
+    EXPECT_EQ(EditFrame.x, 430);
     EXPECT_EQ(BackgroundIndex, 4);
     EXPECT_STREQ(CaptionText, "Dorbo says hello (to the furniture, mostly)");
     make("x.zkt", std::string(5000, 'x')); // is cut
