@@ -1,4 +1,4 @@
-// Draws the pictures of the stage into the directory that is given: draw_art resources/bitmaps
+// Draws the program's pictures into the directory that is given: draw_art resources
 
 #include "resources/art/bmp_file.h"
 #include "resources/art/gallery.h"
@@ -12,7 +12,7 @@ int main(int argc, char** argv) {
     }
     const std::string directory = argv[1];
     for (const art::Exhibit& exhibit : art::drawGallery()) {
-        const std::string path = directory + "/" + exhibit.name + ".bmp";
+        const std::string path = directory + "/" + exhibit.file;
         if (!art::writeFile(path, exhibit.bytes)) {
             std::fprintf(stderr, "draw_art: can't write %s\n", path.c_str());
             return 1;

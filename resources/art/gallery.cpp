@@ -2,8 +2,13 @@
 
 #include "resources/art/bmp_file.h"
 #include "resources/art/bubbles.h"
+#include "resources/art/buttons.h"
+#include "resources/art/emblem.h"
 #include "resources/art/expressions.h"
+#include "resources/art/icons.h"
+#include "resources/art/png_file.h"
 #include "resources/art/poses.h"
+#include "resources/art/target.h"
 #include "resources/art/tiles.h"
 #include "resources/art/walk.h"
 
@@ -15,8 +20,12 @@ namespace {
 
 constexpr int TileCount = 10;
 
+std::string bitmapFile(const std::string& name) {
+    return "bitmaps/" + name + ".bmp";
+}
+
 Exhibit sixteenColours(const std::string& name, const Picture& picture) {
-    return {name, bmpBytes(picture, SixteenColours, {4, 0})};
+    return {bitmapFile(name), bmpBytes(picture, SixteenColours, {4, 0})};
 }
 
 void addWalks(std::vector<Exhibit>& gallery) {
@@ -48,9 +57,21 @@ void addTiles(std::vector<Exhibit>& gallery) {
     for (int i = 1; i <= TileCount; ++i) {
         const Tile tile = drawTile(i);
         const std::string name = (i < 10 ? "bg0" : "bg") + std::to_string(i);
-        gallery.push_back(
-            {name, bmpBytes(tile.picture, tile.colours, Forms[static_cast<std::size_t>(i - 1)])});
+        gallery.push_back({bitmapFile(name), bmpBytes(tile.picture, tile.colours,
+                                                      Forms[static_cast<std::size_t>(i - 1)])});
     }
+}
+
+void addIcons(std::vector<Exhibit>& gallery) {
+    const auto file = [](int size) { return "icons/" + std::to_string(size) + ".png"; };
+    for (const int size : SmallIcons) {
+        gallery.push_back({file(size), pngBytes(trueColours(drawSmallIcon(size)))});
+    }
+    for (const int size : LargeIcons) {
+        gallery.push_back({file(size), pngBytes(drawEmblem(size))});
+    }
+    const std::string svg = emblemSvg();
+    gallery.push_back({"icons/dorbo.svg", {svg.begin(), svg.end()}});
 }
 
 } // namespace
@@ -65,6 +86,9 @@ std::vector<Exhibit> drawGallery() {
     gallery.push_back(sixteenColours("bubright", mirrored(bubble)));
     gallery.push_back(sixteenColours("expresns", drawExpressions()));
     addTiles(gallery);
+    gallery.push_back(sixteenColours("sysbuts", drawSysButtons()));
+    addIcons(gallery);
+    gallery.push_back({"cursors/target.cur", targetCursor()});
     return gallery;
 }
 

@@ -6,14 +6,14 @@
 
 namespace art {
 
-// A finished bitmap file.
+// A finished file.
 struct Exhibit {
-    // The name of the resource, without an ending.
-    std::string name;
+    // Where it lies in the directory resources/.
+    std::string file;
     std::vector<std::uint8_t> bytes;
 };
 
-// Draws every picture that the program shows on its stage: always the same bytes.
+// Draws every picture that the program has: always the same bytes.
 std::vector<Exhibit> drawGallery();
 
 } // namespace art

@@ -1,7 +1,8 @@
-// The pictures of the stage: what the program takes for granted about them, and that the drawing
-// program still draws them.
+// The pictures: what the program takes for granted about them, and that the drawing program still
+// draws them.
 
 #include "resources/art/gallery.h"
+#include "resources/art/icons.h"
 #include "resources/art/poses.h"
 
 #include <algorithm>
@@ -10,6 +11,7 @@
 #include <fstream>
 #include <gtest/gtest.h>
 #include <iterator>
+#include <png.h>
 #include <string>
 #include <tuple>
 #include <utility>
@@ -36,8 +38,12 @@ struct Bitmap {
 };
 
 Bytes readFile(const std::string& name) {
-    std::ifstream file(DORBO_SOURCE_DIR "/resources/bitmaps/" + name + ".bmp", std::ios::binary);
+    std::ifstream file(DORBO_SOURCE_DIR "/resources/" + name, std::ios::binary);
     return Bytes(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>());
+}
+
+Bytes readBitmap(const std::string& name) {
+    return readFile("bitmaps/" + name + ".bmp");
 }
 
 std::uint32_t number(const Bytes& bytes, std::size_t at) {
@@ -45,7 +51,7 @@ std::uint32_t number(const Bytes& bytes, std::size_t at) {
 }
 
 Bitmap load(const std::string& name) {
-    const Bytes bytes = readFile(name);
+    const Bytes bytes = readBitmap(name);
     Bitmap bitmap{name,
                   static_cast<int>(number(bytes, 18)),
                   static_cast<int>(number(bytes, 22)),
@@ -119,6 +125,32 @@ std::size_t smallestHole(const Bitmap& bitmap) {
     return smallest;
 }
 
+/// An icon, with black for the pixels that aren't solid.
+Bitmap loadIcon(int size) {
+    const Bytes bytes = readFile("icons/" + std::to_string(size) + ".png");
+    png_image png{};
+    png.version = PNG_IMAGE_VERSION;
+    EXPECT_NE(png_image_begin_read_from_memory(&png, bytes.data(), bytes.size()), 0);
+    png.format = PNG_FORMAT_RGBA;
+    Bytes pixels(PNG_IMAGE_SIZE(png));
+    EXPECT_NE(png_image_finish_read(&png, nullptr, pixels.data(), 0, nullptr), 0) << png.message;
+    EXPECT_EQ(png.warning_or_error, 0U) << png.message;
+    Bitmap icon{std::to_string(size),
+                static_cast<int>(png.width),
+                static_cast<int>(png.height),
+                32,
+                {},
+                {}};
+    for (std::size_t at = 0; at < pixels.size(); at += 4) {
+        const std::uint32_t colour = pixels[at] * 65536U + pixels[at + 1] * 256U + pixels[at + 2];
+        icon.pixels.push_back(pixels[at + 3] == 255 ? colour : Black);
+        if (size <= 32) {
+            EXPECT_EQ(pixels[at + 3] % 255, 0) << "solid or not there";
+        }
+    }
+    return icon;
+}
+
 int differences(const Bitmap& sheet, int expression, int pose, const Bitmap& picture,
                 art::Point corner) {
     int count = 0;
@@ -147,12 +179,13 @@ int step(const Bitmap& tile, int from, int to, bool rows) {
     return sum;
 }
 
+const std::vector<std::uint32_t> sixteenColours = {
+    0x000000, 0x800000, 0x008000, 0x808000, 0x000080, 0x800080, 0x008080, 0x808080,
+    0xC0C0C0, 0xFF0000, 0x00FF00, 0xFFFF00, 0x0000FF, 0xFF00FF, 0x00FFFF, 0xFFFFFF};
+
 } // namespace
 
 TEST(Art, FilesHaveTheFormThatTheProgramReadsAndAreStillDrawnSo) {
-    const std::vector<std::uint32_t> sixteen = {
-        0x000000, 0x800000, 0x008000, 0x808000, 0x000080, 0x800080, 0x008080, 0x808080,
-        0xC0C0C0, 0xFF0000, 0x00FF00, 0xFFFF00, 0x0000FF, 0xFF00FF, 0x00FFFF, 0xFFFFFF};
     const std::tuple<std::vector<Bitmap>, int, int> kinds[] = {
         {figures(), 130, 130},
         {series("bg0", 1), 135, 135},
@@ -160,6 +193,7 @@ TEST(Art, FilesHaveTheFormThatTheProgramReadsAndAreStillDrawnSo) {
         {{load("bg03"), load("bg05"), load("bg07"), load("bg09"), load("bg10")}, 80, 80},
         {{load("bubleft"), load("bubright")}, 160, 95},
         {{load("expresns")}, 54, 87},
+        {{load("sysbuts")}, 44, 11},
     };
 
     std::size_t count = 0;
@@ -167,7 +201,7 @@ TEST(Art, FilesHaveTheFormThatTheProgramReadsAndAreStillDrawnSo) {
         for (const Bitmap& bitmap : bitmaps) {
             SCOPED_TRACE(bitmap.name);
             const bool tile = bitmap.name.starts_with("bg") && bitmap.name != "bg01";
-            const Bytes bytes = readFile(bitmap.name);
+            const Bytes bytes = readBitmap(bitmap.name);
             EXPECT_EQ(std::string(bytes.begin(), bytes.begin() + 2), "BM");
             EXPECT_EQ(number(bytes, 2), bytes.size());
             EXPECT_EQ(number(bytes, 14), 40U);
@@ -178,16 +212,83 @@ TEST(Art, FilesHaveTheFormThatTheProgramReadsAndAreStillDrawnSo) {
             EXPECT_EQ(bitmap.bits, tile ? 8U : 4U);
             EXPECT_EQ(bitmap.colours.size(), tile ? 256U : 16U);
             EXPECT_EQ(number(bytes, 46), bitmap.name > "bg06" && tile ? 256U : 0U);
-            EXPECT_TRUE(tile || bitmap.colours == sixteen) << "in their fixed order";
+            EXPECT_TRUE(tile || bitmap.colours == sixteenColours) << "in their fixed order";
             ++count;
         }
     }
-    EXPECT_EQ(count, 41U);
+    EXPECT_EQ(count, 42U);
     const auto gallery = art::drawGallery();
-    EXPECT_EQ(gallery.size(), count);
+    EXPECT_EQ(gallery.size(), count + 10) << "and the icons and the pointer";
     for (const art::Exhibit& exhibit : gallery) {
-        EXPECT_TRUE(exhibit.bytes == readFile(exhibit.name)) << exhibit.name;
+        EXPECT_TRUE(exhibit.bytes == readFile(exhibit.file)) << exhibit.file;
     }
+}
+
+TEST(Art, ButtonsHaveTheirPicturesWhereTheyAreCopiedFrom) {
+    const Bitmap sheet = load("sysbuts");
+    constexpr std::uint32_t Grey = 0xC0C0C0;
+    const std::tuple<const char*, std::uint32_t, int, int> cells[] = {
+        {"bar", Black, 0, 11}, {"cross", Black, 11, 22}, {"walk", 0x000080, 20, 44}};
+
+    int drawn = 0;
+    for (const auto& [name, colour, left, right] : cells) {
+        SCOPED_TRACE(name);
+        int sum = 0;
+        int count = 0;
+        for (int i = 0; i < (right - left) * 11; ++i) {
+            const int x = i % (right - left);
+            const int y = i / (right - left);
+            if (sheet.at(left + x, y) != Grey) {
+                EXPECT_EQ(sheet.at(left + x, y), colour);
+                EXPECT_TRUE(x < 10 || right == 44) << "seen on a pressed button";
+                EXPECT_LT(y, 10) << "seen on a pressed button";
+                sum += x;
+                ++count;
+            }
+        }
+        ASSERT_GT(count, 0);
+        EXPECT_NEAR(2.0 * sum / count + 1, right == 44 ? 28 : 11, 1) << "in the middle";
+        drawn += count;
+    }
+    EXPECT_EQ(std::ranges::count(sheet.pixels, Grey), 44 * 11 - drawn) << "none counted twice";
+}
+
+TEST(Art, IconsFillTheirSquareAndTheSmallOnesKeepToTheSixteenColours) {
+    std::vector<int> sizes(std::begin(art::SmallIcons), std::end(art::SmallIcons));
+    sizes.insert(sizes.end(), std::begin(art::LargeIcons), std::end(art::LargeIcons));
+    EXPECT_EQ(sizes, (std::vector<int>{16, 22, 24, 32, 48, 64, 128, 256}));
+    for (const int size : sizes) {
+        SCOPED_TRACE(size);
+        const Bitmap icon = loadIcon(size);
+        ASSERT_EQ(icon.width, size);
+        ASSERT_EQ(icon.height, size);
+        EXPECT_EQ(smallestHole(icon), icon.pixels.size());
+        EXPECT_EQ(icon.at(0, 0) | icon.at(size - 1, 0) | icon.at(0, size - 1), Black);
+        const auto solid =
+            icon.pixels.size() - static_cast<std::size_t>(std::ranges::count(icon.pixels, Black));
+        EXPECT_GE(solid * 2, icon.pixels.size());
+        for (const std::uint32_t pixel : icon.pixels) {
+            ASSERT_TRUE(size > 32 || std::ranges::count(sixteenColours, pixel) == 1) << pixel;
+        }
+    }
+}
+
+TEST(Art, TargetIsARingAndADotThatShowsOnAnyGround) {
+    const Bytes cursor = readFile("cursors/target.cur");
+    ASSERT_EQ(cursor.size(), 326U);
+    EXPECT_EQ(number(cursor, 2), 2U + 65536U) << "one picture, a cursor";
+    EXPECT_EQ(cursor[6] * 256 + cursor[7], 32 * 256 + 32);
+    EXPECT_EQ(cursor[10] * 256 + cursor[12], 16 * 256 + 15) << "the hot spot";
+    // A row through the hot spot, by the two bits of each pixel.
+    std::string row;
+    for (unsigned x = 0; x < 32; ++x) {
+        const std::size_t at = 70 + (31 - 15) * 4 + x / 8;
+        const unsigned bit = 7 - x % 8;
+        const bool white = (cursor.at(at) >> bit & 1) != 0;
+        const bool clear = (cursor.at(at + 128) >> bit & 1) != 0;
+        row += white ? 'W' : clear ? '.' : 'B';
+    }
+    EXPECT_EQ(row, ".....WBBW.....WBBBW.....WBBW....");
 }
 
 TEST(Art, FiguresHaveNoHolesAndStandOnOneLine) {
