@@ -244,7 +244,7 @@ BOOL KillTimer(HWND window, UINT_PTR timer); ///< TRUE if it ran; a tick that wa
 constexpr ResourceName IDC_ARROW{32512};
 constexpr ResourceName IDC_WAIT{32514};
 HCURSOR LoadCursorA(HINSTANCE instance, ResourceName name); ///< null instance: the system's own
-HICON LoadIconA(HINSTANCE instance, ResourceName name);     ///< null if there is none
+HICON LoadIconA(HINSTANCE instance, ResourceName name);     ///< of the program; null if none
 HCURSOR SetCursor(HCURSOR cursor);                          ///< null: none; gives the one before
 int ShowCursor(BOOL show); ///< the display count after it; the pointer shows from 0 up
 BOOL GetCursorPos(POINT* point);

@@ -67,10 +67,6 @@ HCURSOR LoadCursorA(HINSTANCE instance, ResourceName name) {
     return !instance && known ? HCURSOR{name.number} : HCURSOR{};
 }
 
-HICON LoadIconA(HINSTANCE /*instance*/, ResourceName /*name*/) {
-    return {}; // the program file holds no icon
-}
-
 HCURSOR SetCursor(HCURSOR cursor) {
     const HCURSOR before = current;
     current = cursor;

@@ -18,6 +18,7 @@ struct WindowClass {
     UINT style = 0;
     WNDPROC procedure = nullptr;
     HINSTANCE instance;
+    HICON icon;
     HCURSOR cursor;
     HBRUSH background;
 };

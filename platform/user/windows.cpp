@@ -6,6 +6,7 @@
 #include "platform/trace.h"
 #include "platform/user/cursors.h"
 #include "platform/user/foreign.h"
+#include "platform/user/icons.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
 #include "platform/user/roster.h"
@@ -48,6 +49,9 @@ std::unique_ptr<NativeWindow> makeNative(const Window& window) {
     }
     auto native = std::make_unique<NativeWindow>(window.handle, place, window.topmost, host);
     native->setTitle(shownText(window.title));
+    if (!window.parent) {
+        native->setIcon(iconOf(window.windowClass->icon));
+    }
     return native;
 }
 
@@ -213,6 +217,7 @@ WORD RegisterClassA(const WNDCLASSA* windowClass) {
                        windowClass->style,
                        windowClass->lpfnWndProc,
                        windowClass->hInstance,
+                       windowClass->hIcon,
                        windowClass->hCursor,
                        windowClass->hbrBackground};
     return static_cast<WORD>(classes().size());

@@ -1,6 +1,8 @@
 // Windows: their making and end, their picture, painting, and handles that have gone stale.
 #include "tests/user/test_window.h"
 
+#include <QIcon>
+
 #include <tuple>
 
 namespace {
@@ -172,6 +174,27 @@ TEST_F(Windows, ResizingKeepsThePictureAndPaintsAnew) {
     EXPECT_EQ(seen.front().lParam, 60 | (20 << 16));
     test::handleWaiting();
     EXPECT_EQ(pixel(window, 59, 19), 0xC0C0C0U);
+}
+
+TEST_F(Windows, WearTheIconOfTheirClass) {
+    const HINSTANCE program = GetModuleHandleA(nullptr);
+    EXPECT_FALSE(LoadIconA(nullptr, 100)) << "none of the system's";
+    EXPECT_FALSE(LoadIconA(program, 101));
+    EXPECT_FALSE(LoadIconA(program, "100"));
+    WNDCLASSA windowClass{};
+    windowClass.lpfnWndProc = test::recordingProc;
+    windowClass.hIcon = LoadIconA(program, 100);
+    windowClass.lpszClassName = "IconClass";
+    EXPECT_TRUE(windowClass.hIcon);
+    EXPECT_NE(RegisterClassA(&windowClass), 0);
+    const HWND wearer = CreateWindowExA(0, "IconClass", "", WS_POPUP, 0, 0, 9, 9, nullptr, nullptr,
+                                        program, nullptr);
+    const QList<QSize> sizes = test::lastNative()->icon().availableSizes();
+    EXPECT_TRUE(sizes.contains(QSize(16, 16)) && sizes.contains(QSize(128, 128)));
+    DestroyWindow(wearer);
+    const HWND plain = test::makeWindow();
+    EXPECT_TRUE(test::lastNative()->icon().isNull());
+    DestroyWindow(plain);
 }
 
 TEST_F(Windows, PointerHidesByCountOrByShape) {
