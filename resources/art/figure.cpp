@@ -186,6 +186,11 @@ Figure mirrored(const Figure& figure) {
         leg.toe = -leg.toe;
         leg.bend = -leg.bend;
     }
+    if (figure.turn < 0.5) {
+        // What was on the left is now on the right. From the side the far ones stay the far ones.
+        std::swap(other.arms[0], other.arms[1]);
+        std::swap(other.legs[0], other.legs[1]);
+    }
     return other;
 }
 

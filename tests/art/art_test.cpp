@@ -312,6 +312,19 @@ TEST(Art, FiguresHaveNoHolesAndStandOnOneLine) {
     EXPECT_NEAR(heel("fdl2r6") - 18, heel("fdl2r7"), 1);
 }
 
+TEST(Art, HeTurnsToTheLeftAsToTheRight) {
+    for (const char* number : {"1", "2"}) {
+        const Bitmap right = load(std::string("fdltn") + number);
+        const Bitmap left = load(std::string("fdrtn") + number);
+        int differing = 0;
+        for (int i = 0; i < 130 * 130; ++i) {
+            const bool his = right.at(i % 130, i / 130) != Black;
+            differing += his != (left.at(129 - i % 130, i / 130) != Black);
+        }
+        EXPECT_LT(differing, 20) << "another outline in " << number;
+    }
+}
+
 TEST(Art, FacesFitThePoses) {
     const Bitmap sheet = load("expresns");
     for (int pose = 0; pose < art::PoseCount; ++pose) {
