@@ -38,13 +38,23 @@ Trunk trunkOf(const Figure& figure) {
     return {figure.neck, figure.pelvis};
 }
 
+// 1 where he is turned to the right, -1 to the left.
+double facing(const Figure& figure) {
+    return figure.head.turn < 0 ? -1 : 1;
+}
+
+// The same for the order of his limbs: seen from the front the first is on the left either way.
+double facingOfLimbs(const Figure& figure) {
+    return figure.turn < 0.5 ? 1 : facing(figure);
+}
+
 Point shoulder(const Figure& figure, std::size_t which) {
-    const double aside = 12 - 9.5 * figure.turn;
+    const double aside = (12 - 9.5 * figure.turn) * facingOfLimbs(figure);
     return trunkOf(figure)(which == 0 ? -aside : aside, 0.16) - Point{0, figure.shoulderLift};
 }
 
 Point hip(const Figure& figure, std::size_t which) {
-    const double aside = 6.5 - 5.5 * figure.turn;
+    const double aside = (6.5 - 5.5 * figure.turn) * facingOfLimbs(figure);
     return figure.pelvis + Point{which == 0 ? -aside : aside, -4};
 }
 
@@ -67,8 +77,10 @@ std::vector<Outline> coatOutlines(const Figure& figure) {
               at(-13 * slim, 1.12), at(-15 * slim, 0.95), at(-13.5 * slim, 0.5),
               at(-14 * slim, 0.14 - lift), at(-9 * slim, 0.02 - lift)})};
     if (figure.tails > 0) {
-        const std::vector<Point> hang = {at(-7, 0.7), at(-10 - figure.tails * 0.3, 1.0),
-                                         at(-9 - figure.tails, 1.3)};
+        const double side = facing(figure);
+        const std::vector<Point> hang = {at(-7 * side, 0.7),
+                                         at((-10 - figure.tails * 0.3) * side, 1.0),
+                                         at((-9 - figure.tails) * side, 1.3)};
         for (Outline& outline : tube(hang, 8, 4)) {
             outlines.push_back(std::move(outline));
         }
@@ -155,14 +167,14 @@ void paintCoat(Picture& picture, const Figure& figure) {
     const Trunk at = trunkOf(figure);
     const Mask coat =
         paintOutlined(picture, {coatOutlines(figure), Coat, CoatShade, 3, CoatGlow}, Line);
-    const double seam = 8 * figure.turn;
+    const double seam = 8 * figure.turn * facing(figure);
+    const double buttons = seam + 3.2 * facingOfLimbs(figure);
     paintWithin(picture, {{bone(at(seam, 0), at(seam, 1.3), 0.55, 0.55)}, CoatShade, CoatShade, 0},
                 coat);
     for (const double down : {0.32, 0.56, 0.8}) {
-        paintWithin(picture, {{ellipse(at(seam + 3.2, down), 1.7, 1.7)}, Brass, BrassShade, 1},
-                    coat);
+        paintWithin(picture, {{ellipse(at(buttons, down), 1.7, 1.7)}, Brass, BrassShade, 1}, coat);
     }
-    const Point collar = at(1.5 * figure.turn, 0.02);
+    const Point collar = at(1.5 * figure.turn * facing(figure), 0.02);
     paintOutlined(picture, {{ellipse(collar, 10 - 2 * figure.turn, 3.6)}, Linen, LinenShade, 1},
                   Line);
 }

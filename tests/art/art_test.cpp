@@ -312,16 +312,18 @@ TEST(Art, FiguresHaveNoHolesAndStandOnOneLine) {
     EXPECT_NEAR(heel("fdl2r6") - 18, heel("fdl2r7"), 1);
 }
 
-TEST(Art, HeTurnsToTheLeftAsToTheRight) {
-    for (const char* number : {"1", "2"}) {
-        const Bitmap right = load(std::string("fdltn") + number);
-        const Bitmap left = load(std::string("fdrtn") + number);
+TEST(Art, HeWalksAndTurnsToTheLeftAsToTheRight) {
+    std::vector<Bitmap> rights = series("fdl2r", 8);
+    std::vector<Bitmap> lefts = series("fdr2l", 8);
+    std::ranges::move(series("fdltn", 2), std::back_inserter(rights));
+    std::ranges::move(series("fdrtn", 2), std::back_inserter(lefts));
+    for (std::size_t number = 0; number < rights.size(); ++number) {
         int differing = 0;
         for (int i = 0; i < 130 * 130; ++i) {
-            const bool his = right.at(i % 130, i / 130) != Black;
-            differing += his != (left.at(129 - i % 130, i / 130) != Black);
+            const bool his = rights[number].at(i % 130, i / 130) != Black;
+            differing += his != (lefts[number].at(129 - i % 130, i / 130) != Black);
         }
-        EXPECT_LT(differing, 20) << "another outline in " << number;
+        EXPECT_LT(differing, 20) << "another outline in " << lefts[number].name;
     }
 }
 
