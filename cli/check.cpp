@@ -323,14 +323,22 @@ bool PrintAll(const std::vector<std::string>& files, bool json) {
 
 } // namespace
 
-std::string WhyUnplayable(const std::string& path) {
-    std::string bytes;
-    Toon toon{};
-    std::string error = ReadWholeFile(path, bytes);
-    if (error.empty()) {
-        error = ToonFromBytes(bytes, toon);
+std::string WhyUnplayable(const std::vector<std::string>& paths) {
+    for (const std::string& path : paths) {
+        std::string bytes;
+        Toon toon{};
+        std::string error = ReadWholeFile(path, bytes);
+        if (error.empty()) {
+            error = ToonFromBytes(bytes, toon);
+        }
+        if (error.empty() && toon.frames.empty()) {
+            error = "it has no frame";
+        }
+        if (!error.empty()) {
+            return std::string(path).append(": ").append(error);
+        }
     }
-    return error.empty() && toon.frames.empty() ? "it has no frame" : error;
+    return "";
 }
 
 int CheckCommand(const std::vector<std::string>& arguments) {

@@ -22,8 +22,9 @@ struct ToonReport {
 /// Throws a std::exception if that can't be done.
 ToonReport CheckToon(const std::string& path);
 
-/// Why the file is no Toon that can be acted out, read only as far as that; empty if it is one.
-std::string WhyUnplayable(const std::string& path);
+/// Which of the files is no Toon that can be acted out and why, as "FILE: reason"; empty if all
+/// are.
+std::string WhyUnplayable(const std::vector<std::string>& paths);
 
 /// `toon check [--json] FILE.zkt...`: prints what was found, a line each; gives the exit code.
 int CheckCommand(const std::vector<std::string>& arguments);

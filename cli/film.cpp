@@ -144,11 +144,9 @@ int FilmCommand(const std::vector<std::string>& line) {
         if (!wrong.empty()) {
             return TellWrongUsage("film", wrong);
         }
-        for (const std::string& toon : film.stage.toons) {
-            const std::string unplayable = WhyUnplayable(toon);
-            if (!unplayable.empty()) {
-                throw std::runtime_error(toon + ": " + unplayable);
-            }
+        const std::string unplayable = WhyUnplayable(film.stage.toons);
+        if (!unplayable.empty()) {
+            throw std::runtime_error(unplayable);
         }
         makeFilm(film);
     } catch (const std::exception& error) {

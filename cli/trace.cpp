@@ -76,11 +76,9 @@ int TraceCommand(const std::vector<std::string>& line) {
     if (!wrong.empty()) {
         return TellWrongUsage("trace", wrong);
     }
-    for (const std::string& toon : arguments.stage.toons) {
-        const std::string unplayable = WhyUnplayable(toon);
-        if (!unplayable.empty()) {
-            return fail(toon + ": " + unplayable);
-        }
+    const std::string unplayable = WhyUnplayable(arguments.stage.toons);
+    if (!unplayable.empty()) {
+        return fail(unplayable);
     }
     CatchInterruptions();
     try {
