@@ -49,7 +49,7 @@ std::unique_ptr<NativeWindow> makeNative(const Window& window) {
     }
     auto native = std::make_unique<NativeWindow>(window.handle, place, window.topmost, host);
     native->setTitle(shownText(window.title));
-    if (!window.parent) {
+    if (!window.parent && !window.topmost) { // no window manager would show that of a topmost one
         native->setIcon(iconOf(window.windowClass->icon));
     }
     return native;
