@@ -201,12 +201,9 @@ bool ToonReport::faulty() const {
 
 ToonReport CheckToon(const std::string& path) {
     ToonReport report;
-    std::string bytes;
     Toon toon{};
-    std::string error = ReadWholeFile(path, bytes);
-    if (error.empty()) {
-        error = ToonFromBytes(bytes, toon);
-    }
+    std::size_t size = 0;
+    const std::string error = ReadToon(path, toon, size);
     if (!error.empty()) {
         report.findings.push_back({0, "", error});
         return report;
@@ -216,7 +213,7 @@ ToonReport CheckToon(const std::string& path) {
     for (const ToonFrame& frame : toon.frames) {
         report.pauses += std::max<LONG>(frame.pause, 0);
     }
-    CheckSize(report, bytes.size());
+    CheckSize(report, size);
     AddFindings(report, OddValues(toon));
     CheckUnseen(report, toon);
     if (!MayBeWritten(path)) {
@@ -325,12 +322,9 @@ bool PrintAll(const std::vector<std::string>& files, bool json) {
 
 std::string WhyUnplayable(const std::vector<std::string>& paths) {
     for (const std::string& path : paths) {
-        std::string bytes;
         Toon toon{};
-        std::string error = ReadWholeFile(path, bytes);
-        if (error.empty()) {
-            error = ToonFromBytes(bytes, toon);
-        }
+        std::size_t size = 0;
+        std::string error = ReadToon(path, toon, size);
         if (error.empty() && toon.frames.empty()) {
             error = "it has no frame";
         }

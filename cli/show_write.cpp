@@ -58,22 +58,27 @@ bool ReadWriteOptions(const std::vector<std::string>& arguments, WriteOptions& o
     return !options.source.empty();
 }
 
-} // namespace
-
+/// Why the file can't be read, or nothing.
 std::string ReadWholeFile(const std::string& path, std::string& bytes) {
     seam::WholeFile file = seam::readWholeFile(path, INT32_MAX);
     bytes = std::move(file.text);
     return file.error == 0 ? "" : "it can't be read: " + Reason(file.error);
 }
 
+} // namespace
+
+std::string ReadToon(const std::string& path, Toon& toon, std::size_t& size) {
+    std::string bytes;
+    const std::string unread = ReadWholeFile(path, bytes);
+    size = bytes.size();
+    return unread.empty() ? ToonFromBytes(bytes, toon) : unread;
+}
+
 int ShowCommand(const std::vector<std::string>& arguments) {
     const std::string& path = arguments.front();
-    std::string bytes;
     Toon toon{};
-    std::string error = ReadWholeFile(path, bytes);
-    if (error.empty()) {
-        error = ToonFromBytes(bytes, toon);
-    }
+    std::size_t size = 0;
+    const std::string error = ReadToon(path, toon, size);
     if (!error.empty()) {
         return Fail("show", path, error);
     }

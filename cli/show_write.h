@@ -1,6 +1,8 @@
 // The sub-commands that go between a Toon file and its JSON. They give the exit code.
 #pragma once
 
+#include "cli/toon_record.h"
+
 #include <string>
 #include <vector>
 
@@ -11,5 +13,6 @@ int ShowCommand(const std::vector<std::string>& arguments);
 /// Nothing is written if anything is wrong.
 int WriteCommand(const std::vector<std::string>& arguments);
 
-/// Reads a regular file of any size that a Toon can have; gives why it can't be read, or nothing.
-std::string ReadWholeFile(const std::string& path, std::string& bytes);
+/// Reads a Toon's file; gives why it can't be read or is no Toon, or nothing. `size` is the file's,
+/// in bytes.
+std::string ReadToon(const std::string& path, Toon& toon, std::size_t& size);
