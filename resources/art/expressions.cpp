@@ -31,9 +31,10 @@ Picture drawFace(int number, Eyes eyes, Mouth mouth) {
 void drawRow(Picture& sheet, int number) {
     const Point eyes = EyeCells[static_cast<std::size_t>(number)];
     const Point mouth = MouthCells[static_cast<std::size_t>(number)];
-    const Picture plain = drawFace(number, Eyes::Open, Mouth::Smile);
+    const Figure figure = pose(number);
+    const Picture plain = drawFigure(figure);
     const Picture talking = drawFace(number, Eyes::Shut, Mouth::Open);
-    const Picture amazed = drawFace(number, Eyes::Open, Mouth::Round);
+    const Picture amazed = drawFace(number, figure.head.eyes, Mouth::Round);
     copyCell(sheet, 0, number, talking, eyes);
     copyCell(sheet, 1, number, plain, eyes);
     copyCell(sheet, 2, number, talking, mouth);

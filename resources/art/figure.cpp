@@ -14,7 +14,6 @@ namespace {
 // See-through spots up to this many pixels would look like dirt in the figure.
 constexpr std::size_t LargestSpeck = 12;
 
-constexpr double HandSize = 1.12;
 constexpr double UpperArm = 19;
 constexpr double LowerArm = 18;
 constexpr double Thigh = 24.5;
@@ -58,15 +57,6 @@ Point hip(const Figure& figure, std::size_t which) {
     return figure.pelvis + Point{which == 0 ? -aside : aside, -4};
 }
 
-std::vector<Outline> placed(std::vector<Outline> outlines, Point at, double degrees, double flip) {
-    for (Outline& outline : outlines) {
-        for (Point& point : outline) {
-            point = at + turned({point.x * HandSize, point.y * flip * HandSize}, degrees);
-        }
-    }
-    return outlines;
-}
-
 std::vector<Outline> coatOutlines(const Figure& figure) {
     const Trunk at = trunkOf(figure);
     const double slim = 1 - 0.22 * figure.turn;
@@ -86,25 +76,6 @@ std::vector<Outline> coatOutlines(const Figure& figure) {
         }
     }
     return outlines;
-}
-
-// A hand at the origin with its fingers to the right and the thumb below.
-std::vector<Outline> handOutlines(Grip grip) {
-    switch (grip) {
-    case Grip::Relaxed:
-        return {ellipse({4.5, 0}, 5.2, 4.4), bone({6, -1.5}, {9.5, -0.5}, 2.6, 2.2),
-                bone({3, 2}, {6.5, 5.6}, 1.9, 1.7)};
-    case Grip::Open:
-        return {ellipse({4.5, 0}, 4.8, 4.5), bone({6, -2}, {11.5, -6}, 1.9, 1.7),
-                bone({7, 0}, {13.5, -0.5}, 1.9, 1.7), bone({6, 1.5}, {12, 5}, 1.9, 1.7),
-                bone({3, 2}, {4, 8.5}, 1.9, 1.7)};
-    case Grip::Pointing:
-        return {ellipse({4.5, 0}, 4.8, 4.6), bone({6, -2}, {15.5, -2.5}, 2, 1.7),
-                bone({3, 2}, {6, 6.4}, 1.9, 1.7)};
-    case Grip::Fist:
-        return {ellipse({4.2, 0}, 5.2, 5), bone({4, 3}, {7.5, 3.5}, 2, 1.8)};
-    }
-    return {};
 }
 
 // Takes away the line between sleeve and coat at the shoulder, where they are one piece of cloth.
@@ -127,15 +98,13 @@ void paintArm(Picture& picture, const Figure& figure, std::size_t which) {
     const double seen = distance(root, arm.wrist) * (1 + arm.slack) / (UpperArm + LowerArm);
     const double scale = std::min(seen, 1.0);
     const Point elbow = joint(root, arm.wrist, UpperArm * scale, LowerArm * scale, arm.bend);
-    const Part hand = {placed(handOutlines(arm.grip), arm.wrist, arm.angle, arm.thumb), Linen,
-                       LinenShade, 2};
     const Point end = mix(arm.wrist, elbow, 3 / std::max(distance(arm.wrist, elbow), 3.0));
     const Part sleeve = {tube({root, elbow, end}, 5.4, 4.4), Coat, CoatShade, 2, CoatGlow};
     paintOutlined(picture, sleeve, Line);
     if (figure.turn < 0.5 && !arm.behind) {
         joinSleeve(picture, figure, root);
     }
-    paintOutlined(picture, hand, Line);
+    paintHand(picture, arm.grip, arm.wrist, arm.angle, arm.thumb);
     paintCuff(picture, elbow, arm.wrist);
 }
 

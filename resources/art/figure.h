@@ -1,5 +1,6 @@
 #pragma once
 
+#include "resources/art/hand.h"
 #include "resources/art/head.h"
 #include "resources/art/outline.h"
 #include "resources/art/picture.h"
@@ -11,8 +12,6 @@ namespace art {
 constexpr int FigureSize = 130;
 // The row on which the soles stand: the first that a flat shoe leaves free.
 constexpr double Ground = 127;
-
-enum class Grip { Relaxed, Open, Pointing, Fist };
 
 // An arm is given by its hand; the elbow follows.
 struct Arm {

@@ -1,18 +1,15 @@
 #include "resources/art/head.h"
 
+#include "resources/art/features.h"
 #include "resources/art/wardrobe.h"
 
-#include <algorithm>
 #include <cmath>
-#include <string>
 #include <utility>
 #include <vector>
 
 namespace art {
 
 namespace {
-
-using Rows = std::vector<std::string>;
 
 // The measures below are for a face of this length from eyes to mouth.
 constexpr double PlainLength = 17;
@@ -57,7 +54,8 @@ std::vector<Point> faceHalf() {
 
 void paintEar(Picture& picture, const Place& at, double x) {
     const Part ear = skinPart({ellipse(at(x, 4), 2.8, 4.2)}, 1);
-    paintOutlined(picture, ear, Line);
+    const Mask inside = paintOutlined(picture, ear, Line);
+    paintWithin(picture, {{ellipse(at(x, 4.4), 1.3, 2.3)}, Blush, Blush, 0}, inside);
 }
 
 // Hair sticks out below the cap, on the sides that can be seen.
@@ -67,9 +65,9 @@ void paintHair(Picture& picture, const Place& at) {
                                   ellipse(at(back - 1.5, 4), 4, 4),
                                   ellipse(at(back - 0.5, 9.5), 3.4, 4)};
     if (at.turn < 0.5) {
-        tufts.push_back(ellipse(at(13.5, -2), 4, 4.5));
-        tufts.push_back(ellipse(at(13, 4), 4, 4));
-        tufts.push_back(ellipse(at(12, 9.5), 3.4, 4));
+        tufts.push_back(ellipse(at(14.5, -2), 4, 4.5));
+        tufts.push_back(ellipse(at(14, 4), 4, 4));
+        tufts.push_back(ellipse(at(12.8, 9.5), 3.4, 4));
     }
     paintOutlined(picture, {std::move(tufts), Hair, HairShade, 1}, Line);
 }
@@ -127,51 +125,6 @@ void paintCap(Picture& picture, const Place& at, double swing) {
     paintOutlined(picture, band, Line);
 }
 
-// Eyes for a head that looks right; the others are the same the other way round.
-Rows eyeRows(Eyes eyes) {
-    if (eyes == Eyes::Open) {
-        return {" bbb bbb  ", "bWWWbWWWb ", "bWWWbWWWb ", "bWbbbWbbb ",
-                "bWbbbWbbb ", "bWWWbWWWb ", " bbb bbb  "};
-    }
-    return {" bbb bbb  ", "bsssbsssb ", "bsssbsssb ", "bsssbsssb ",
-            "bsssbsssb ", "bbbsbbbsb ", " bbb bbb  "};
-}
-
-Rows browRows(Brows brows) {
-    switch (brows) {
-    case Brows::Level:
-        return {"          ", " bb   bb  "};
-    case Brows::Raised:
-        return {" bbb bbb  "};
-    case Brows::OneUp:
-        return {"     bbb  ", "bbb       "};
-    case Brows::Worried:
-        return {"  bb bb   ", "bb     bb "};
-    }
-    return {};
-}
-
-Rows mouthRows(Mouth mouth) {
-    switch (mouth) {
-    case Mouth::Smile:
-        return {" b      b ", "  bb  bb  ", "    bb    "};
-    case Mouth::Open:
-        return {" bbbbbbbb ", "  brrrrb  ", "  brRRrb  ", "   bbbb   "};
-    case Mouth::Round:
-        return {"    bb    ", "   brrb   ", "   brrb   ", "   bRRb   ", "    bb    "};
-    }
-    return {};
-}
-
-void stampFacing(Picture& picture, Point corner, double side, Rows rows) {
-    for (std::string& row : rows) {
-        if (side < 0) {
-            std::reverse(row.begin(), row.end());
-        }
-    }
-    stamp(picture, static_cast<int>(corner.x), static_cast<int>(corner.y), rows, Skin);
-}
-
 } // namespace
 
 Head mirrored(const Head& head, int pictureWidth) {
@@ -193,9 +146,7 @@ void paintHead(Picture& picture, const Head& head) {
     paintFace(picture, at);
     paintCap(picture, at, head.capSwing);
     paintNose(picture, at);
-    stampFacing(picture, head.eyeCell + Point{0, 3}, at.side, eyeRows(head.eyes));
-    stampFacing(picture, head.eyeCell, at.side, browRows(head.brows));
-    stampFacing(picture, head.mouthCell + Point{0, 4}, at.side, mouthRows(head.mouth));
+    paintFeatures(picture, head);
 }
 
 } // namespace art

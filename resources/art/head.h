@@ -6,9 +6,9 @@
 
 namespace art {
 
-enum class Eyes { Open, Shut };
-enum class Mouth { Smile, Open, Round };
-enum class Brows { Level, Raised, OneUp, Worried };
+enum class Eyes { Open, Shut, Wide, Merry, Aside };
+enum class Mouth { Smile, Open, Round, Grin, Laugh, Gasp, Whisper, Musing };
+enum class Brows { Level, Raised, High, OneUp, Worried };
 
 constexpr int CellSize = 10;
 

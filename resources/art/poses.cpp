@@ -19,28 +19,34 @@ Figure standing(Head head) {
     figure.head = head;
     figure.neck = {chin(head).x, 50};
     figure.pelvis = {(figure.neck.x + 2 * 63) / 3, 84};
-    figure.arms = {Arm{figure.neck + Point{-23, 35}, 100, Grip::Relaxed, 1, -1, false},
-                   Arm{figure.neck + Point{23, 35}, 80, Grip::Relaxed, -1, 1, false}};
+    figure.arms = {Arm{figure.neck + Point{-21, 38}, 98, Grip::Relaxed, 1, -1, false, 0.01},
+                   Arm{figure.neck + Point{21, 38}, 82, Grip::Relaxed, -1, 1, false, 0.01}};
     figure.legs = {planted(figure.pelvis.x - 9, -0.8), planted(figure.pelvis.x + 9, 0.8)};
     return figure;
 }
 
-void welcome(Figure& figure) {
-    figure.pelvis.x -= 2;
-    figure.arms[1] = {{95, 74}, 12, Grip::Open, 1, 1, false, 0.08};
+// One leg carries him, the other is at ease.
+void stand(Figure& figure) {
+    figure.pelvis = {60, 84};
+    figure.arms[0].wrist = figure.neck + Point{-21, 38};
+    figure.legs = {planted(54, -0.7), planted(75, 1)};
 }
 
-void cheer(Figure& figure) {
-    figure.head.brows = Brows::Raised;
-    figure.arms[0] = {{22, 38}, -105, Grip::Open, -1, 1, false, 0.12};
-    figure.arms[1] = {{108, 36}, -75, Grip::Open, 1, -1, false, 0.12};
-    figure.legs = {planted(47, -0.8), planted(81, 0.8)};
+void startle(Figure& figure) {
+    figure.head.brows = Brows::High;
+    figure.head.eyes = Eyes::Wide;
+    figure.head.mouth = Mouth::Gasp;
+    figure.head.capSwing = 36;
+    figure.shoulderLift = 3;
+    figure.arms[0] = {{30, 44}, -112, Grip::Open, -1, 1, false, 0.35};
+    figure.arms[1] = {{104, 44}, -68, Grip::Open, 1, -1, false, 0.35};
+    figure.legs = {Leg{{50, Ground - 6}, 0, -0.8, 1, 0.12}, Leg{{84, Ground - 14}, -18, 1, -1, 0.2}};
 }
 
-void crossArms(Figure& figure) {
-    figure.arms[0] = {{73, 70}, -12, Grip::Fist, 1, -1, false, 1};
-    figure.arms[1] = {{50, 74}, 192, Grip::Fist, -1, 1, false, 1};
-    figure.legs = {planted(55, -0.8), planted(69, 0.8)};
+void swear(Figure& figure) {
+    figure.arms[0] = {{33, 78}, 130, Grip::Open, 1, -1, false, 0.02};
+    figure.arms[1] = {{76, 66}, 190, Grip::Flat, -1, 1, false, 1.5};
+    figure.legs = {planted(54, -0.8), planted(72, 0.8)};
 }
 
 void point(Figure& figure) {
@@ -51,42 +57,51 @@ void point(Figure& figure) {
     figure.legs = {planted(49, -1), planted(76, 0.8)};
 }
 
-void shrug(Figure& figure) {
-    figure.head.brows = Brows::Worried;
-    figure.shoulderLift = 4;
-    figure.arms[0] = {{27, 62}, 200, Grip::Open, -1, 1, false, 0.3};
-    figure.arms[1] = {{97, 62}, -20, Grip::Open, 1, -1, false, 0.3};
+void embrace(Figure& figure) {
+    figure.head.brows = Brows::Raised;
+    figure.head.mouth = Mouth::Grin;
+    figure.arms[0] = {{22, 56}, 195, Grip::Open, -1, 1, false, 0.03};
+    figure.arms[1] = {{102, 56}, -15, Grip::Open, 1, -1, false, 0.03};
+    figure.legs = {planted(48, -0.8), planted(77, 0.8)};
 }
 
 void think(Figure& figure) {
-    figure.head.brows = Brows::Raised;
+    figure.head.brows = Brows::OneUp;
+    figure.head.mouth = Mouth::Musing;
     figure.pelvis.x = 62;
-    figure.arms[1] = {{52, 80}, 185, Grip::Fist, -1, 1, false, 1};
-    figure.arms[0] = {{60, 58}, -104, Grip::Pointing, 1, 1, false, 10};
+    figure.arms[1] = {{58, 82}, 180, Grip::Relaxed, -1, 1, false, 0.6};
+    figure.arms[0] = {{62, 57}, -98, Grip::Fist, 1, 1, false, 2};
     figure.legs = {planted(52, -0.9), planted(72, 0.7)};
 }
 
-void wave(Figure& figure) {
+void laugh(Figure& figure) {
     figure.head.brows = Brows::Raised;
-    figure.pelvis.x = 59;
-    figure.arms[1] = {{103, 40}, -75, Grip::Open, 1, -1, false, 0.15};
-    figure.legs = {planted(51, -0.7), planted(72, 0.9)};
+    figure.head.eyes = Eyes::Merry;
+    figure.head.mouth = Mouth::Laugh;
+    figure.head.capSwing = 18;
+    figure.neck.x -= 2;
+    figure.pelvis = {69, 84};
+    figure.arms[0] = {{54, 78}, 5, Grip::Flat, 1, -1, false, 0.6};
+    figure.arms[1] = {{86, 77}, 170, Grip::Flat, -1, 1, false, 0.5};
+    figure.legs = {planted(56, -0.6), Leg{{94, Ground - 16}, -28, 1, -1, 0.05}};
 }
 
-void bow(Figure& figure) {
-    figure.pelvis.x = 61;
-    figure.arms[0] = {{68, 72}, -8, Grip::Relaxed, 1, -1, false, 1};
-    figure.arms[1] = {{106, 70}, 8, Grip::Open, 1, 1, false, 0.08};
-    figure.legs = {Leg{{34, Ground - 8}, -25, -1, 1, 0.01},
-                   Leg{{72, Ground - 6}, 0, 0.9, -1, 0.08}};
+void whisper(Figure& figure) {
+    figure.head.brows = Brows::OneUp;
+    figure.head.eyes = Eyes::Aside;
+    figure.head.mouth = Mouth::Whisper;
+    figure.pelvis = {52, 84};
+    figure.arms[0] = {{50, 56}, -65, Grip::Flat, 1, -1, false, 0.5};
+    figure.arms[1] = {{66, 82}, 180, Grip::Relaxed, -1, 1, true, 0.3};
+    figure.legs = {Leg{{32, Ground - 8}, -25, -1, 1, 0.01}, Leg{{62, Ground - 6}, 0, 0.9, -1, 0.05}};
 }
 
 } // namespace
 
 Figure pose(int number) {
     using Strike = void (*)(Figure&);
-    constexpr Strike Strikes[PoseCount] = {welcome, cheer, crossArms, point,
-                                           shrug,   think, wave,      bow};
+    constexpr Strike Strikes[PoseCount] = {stand,   startle, swear, point,
+                                           embrace, think,   laugh, whisper};
     const auto index = static_cast<std::size_t>(number);
     Head head;
     head.eyeCell = EyeCells[index];
