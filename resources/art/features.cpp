@@ -22,7 +22,7 @@ constexpr double Profile = 1.2;
 Rows profileRows(Eyes eyes) {
     if (eyes == Eyes::Shut) {
         return {"sssssss   ", "sYYYsYYs  ", "YYYYYYYY  ", "YYYYYYYY  ",
-                "YYYYYYYY  ", "bYYYbYYb  ", " bbb bb   "};
+                "bYYYbYYb  ", " bbb bb   ", " sss ss   "};
     }
     return {" bbb bb   ", "bWWWbWWb  ", "bWWWbWWb  ", "bWbbbWbb  ",
             "bWbbbWbb  ", "bWWWbWWb  ", " bbb bb   "};
@@ -34,8 +34,8 @@ Rows eyeRows(Eyes eyes) {
         return {" bbb bbb  ", "bWWWbWWWb ", "bWWWbWWWb ", "bWbbbWbbb ",
                 "bWbbbWbbb ", "bWWWbWWWb ", " bbb bbb  "};
     case Eyes::Shut:
-        return {"ssssssss  ", "sYYYsYYYs ", "YYYYYYYYY ", "YYYYYYYYY ",
-                "YYYYYYYYY ", "bYYYbYYYb ", " bbb bbb  "};
+        return {"ssssssss  ", "sYYYsYYYs ", "YYYYsYYYY ", "bYYbsbYYb ",
+                "sbbsssbbs ", "sssssss   ", " sss sss  "};
     case Eyes::Wide:
         return {"bWWWbWWWb ", "bWWWbWWWb ", "bWbWbWbWb ", "bWbWbWbWb ",
                 "bWWWbWWWb ", "bWWWbWWWb ", " bbb bbb  "};

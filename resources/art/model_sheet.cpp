@@ -24,10 +24,11 @@ struct Face {
 };
 
 constexpr Face Faces[] = {
-    {Eyes::Open, Mouth::Smile, Brows::Level},  {Eyes::Shut, Mouth::Smile, Brows::Level},
-    {Eyes::Open, Mouth::Open, Brows::Level},   {Eyes::Open, Mouth::Round, Brows::Level},
-    {Eyes::Open, Mouth::Smile, Brows::Raised}, {Eyes::Open, Mouth::Smile, Brows::OneUp},
-    {Eyes::Open, Mouth::Round, Brows::Worried}};
+    {Eyes::Open, Mouth::Smile, Brows::Level},   {Eyes::Shut, Mouth::Smile, Brows::Level},
+    {Eyes::Open, Mouth::Open, Brows::Level},    {Eyes::Open, Mouth::Round, Brows::Level},
+    {Eyes::Open, Mouth::Grin, Brows::Raised},   {Eyes::Merry, Mouth::Laugh, Brows::Raised},
+    {Eyes::Wide, Mouth::Gasp, Brows::High},     {Eyes::Aside, Mouth::Whisper, Brows::OneUp},
+    {Eyes::Open, Mouth::Musing, Brows::Worried}};
 constexpr double Turns[] = {0, 1, 1.5};
 
 // Top of the cap, chin, hem of the coat, soles.
