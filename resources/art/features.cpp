@@ -6,6 +6,7 @@
 #include <algorithm>
 #include <cmath>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace art {
@@ -17,6 +18,8 @@ using Rows = std::vector<std::string>;
 // All features are drawn for a head that looks right; the others are the same the other way round.
 
 constexpr double Profile = 1.2;
+// Less turned than this, he looks at us.
+constexpr double Facing = 0.2;
 
 // Seen from the side the nose hides a part of the far eye.
 Rows profileRows(Eyes eyes) {
@@ -26,6 +29,12 @@ Rows profileRows(Eyes eyes) {
     }
     return {" bbb bb   ", "bWWWbWWb  ", "bWWWbWWb  ", "bWbbbWbb  ",
             "bWbbbWbb  ", "bWWWbWWb  ", " bbb bb   "};
+}
+
+// Seen from the front he looks straight at us.
+Rows facingRows() {
+    return {" bbb bbb  ", "bWWWbWWWb ", "bWbWbWbWb ", "bWbWbWbWb ",
+            "bWbWbWbWb ", "bWWWbWWWb ", " bbb bbb  "};
 }
 
 Rows eyeRows(Eyes eyes) {
@@ -40,8 +49,8 @@ Rows eyeRows(Eyes eyes) {
         return {"bWWWbWWWb ", "bWWWbWWWb ", "bWbWbWbWb ", "bWbWbWbWb ",
                 "bWWWbWWWb ", "bWWWbWWWb ", " bbb bbb  "};
     case Eyes::Merry:
-        return {"ssssssss  ", "sbbbsbbbs ", "bWWWbWWWb ", "bWbbbWbbb ",
-                "bWbbbWbbb ", "bYYYYYYYb ", "          "};
+        return {"ssssssss  ", "sbbsssbbs ", "bssbsbssb ", "bssbsbssb ",
+                "sssssssss ", "sssssss   ", " sss sss  "};
     case Eyes::Aside:
         return {"ssssssss  ", "bbbbbbbbb ", "bWWWbWWWb ", "bWWbbWWbb ",
                 "bWWbbWWbb ", "bWWWbWWWb ", " bbb bbb  "};
@@ -76,7 +85,7 @@ Rows mouthRows(Mouth mouth) {
     case Mouth::Grin:
         return {" bbbbbbbb ", " bWWWWWWb ", "  bWWWWb  ", "   bbbb   "};
     case Mouth::Laugh:
-        return {" bbbbbbbb ", " bWWWWWWb ", " brrrrrrb ", "  bRRRRb  ", "   bbbb   "};
+        return {" bbbbbbbb ", " bWWWWWWb ", " brrrrrrb ", "  brRRrb  ", "   bbbb   "};
     case Mouth::Gasp:
         return {"   bbbb   ", "  brrrrb  ", "  brrrrb  ", "  brRRrb  ", "   bbbb   "};
     case Mouth::Whisper:
@@ -99,10 +108,13 @@ void stampFacing(Picture& picture, Point corner, double side, Rows rows) {
 } // namespace
 
 void paintFeatures(Picture& picture, const Head& head) {
+    const double turn = std::fabs(head.turn);
     const double side = head.turn < 0 ? -1 : 1;
-    const bool fromTheSide = std::fabs(head.turn) > Profile;
-    stampFacing(picture, head.eyeCell + Point{0, 3}, side,
-                fromTheSide ? profileRows(head.eyes) : eyeRows(head.eyes));
+    Rows eyes = turn > Profile ? profileRows(head.eyes) : eyeRows(head.eyes);
+    if (turn < Facing && head.eyes == Eyes::Open) {
+        eyes = facingRows();
+    }
+    stampFacing(picture, head.eyeCell + Point{0, 3}, side, std::move(eyes));
     stampFacing(picture, head.eyeCell, side, browRows(head.brows));
     stampFacing(picture, head.mouthCell + Point{0, 4}, side, mouthRows(head.mouth));
 }

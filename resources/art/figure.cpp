@@ -84,6 +84,16 @@ void joinSleeve(Picture& picture, const Figure& figure, Point root) {
     paintWithin(picture, {{ellipse(root + Point{0, 1.5}, 5, 5.5)}, Coat, Coat, 0}, coat);
 }
 
+// No light falls on a sleeve's rim where the body is behind it.
+void takeGlow(Picture& picture, const Figure& figure, const Mask& sleeve) {
+    const Mask coat = coverage(coatOutlines(figure), picture.width, picture.height);
+    for (std::size_t i = 0; i < picture.pixels.size(); ++i) {
+        if (sleeve.pixels[i] != 0 && coat.pixels[i] != 0 && picture.pixels[i] == Magenta) {
+            picture.pixels[i] = DarkMagenta;
+        }
+    }
+}
+
 void paintCuff(Picture& picture, Point elbow, Point wrist) {
     const Point along = (wrist - elbow) * (1 / std::max(distance(elbow, wrist), 0.001));
     const Point across = {-along.y, along.x};
@@ -97,10 +107,12 @@ void paintArm(Picture& picture, const Figure& figure, std::size_t which) {
     const Point root = shoulder(figure, which);
     const double seen = distance(root, arm.wrist) * (1 + arm.slack) / (UpperArm + LowerArm);
     const double scale = std::min(seen, 1.0);
-    const Point elbow = joint(root, arm.wrist, UpperArm * scale, LowerArm * scale, arm.bend);
+    const Point elbow =
+        arm.elbow.value_or(joint(root, arm.wrist, UpperArm * scale, LowerArm * scale, arm.bend));
     const Point end = mix(arm.wrist, elbow, 3 / std::max(distance(arm.wrist, elbow), 3.0));
     const Part sleeve = {tube({root, elbow, end}, 5.4, 4.4), Coat, CoatShade, 2, CoatGlow};
-    paintOutlined(picture, sleeve, Line);
+    const Mask cloth = paintOutlined(picture, sleeve, Line);
+    takeGlow(picture, figure, cloth);
     if (figure.turn < 0.5 && !arm.behind) {
         joinSleeve(picture, figure, root);
     }
@@ -128,7 +140,8 @@ void paintLeg(Picture& picture, const Figure& figure, std::size_t which) {
     paintShoe(picture, leg);
     const bool far = which == 0 && figure.turn > 0.5;
     const Part trouser = {tube({root, knee, leg.ankle - Point{0, 1}}, 7, 4.6),
-                          far ? TrousersShade : Trousers, TrousersShade, 2};
+                          far ? TrousersShade : Trousers, TrousersShade, 2,
+                          far ? TrousersShade : TrousersGlow};
     paintOutlined(picture, trouser, Line);
 }
 
@@ -158,6 +171,9 @@ Figure mirrored(const Figure& figure) {
     flip(other.pelvis);
     for (Arm& arm : other.arms) {
         flip(arm.wrist);
+        if (arm.elbow) {
+            flip(*arm.elbow);
+        }
         arm.angle = 180 - arm.angle;
         arm.bend = -arm.bend;
         arm.thumb = -arm.thumb;

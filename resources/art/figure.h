@@ -6,6 +6,7 @@
 #include "resources/art/picture.h"
 
 #include <array>
+#include <optional>
 
 namespace art {
 
@@ -26,6 +27,8 @@ struct Arm {
     bool behind = false;
     // How much longer the arm looks than the way from shoulder to wrist, as a share of it.
     double slack = 1;
+    // Where it bends, for an arm that the body's turn shortens otherwise.
+    std::optional<Point> elbow = std::nullopt;
 };
 
 // A leg is given by its ankle, which is six pixels above the sole; the knee follows.

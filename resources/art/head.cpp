@@ -3,6 +3,7 @@
 #include "resources/art/features.h"
 #include "resources/art/wardrobe.h"
 
+#include <algorithm>
 #include <cmath>
 #include <utility>
 #include <vector>
@@ -27,7 +28,9 @@ struct Place {
           turn(std::fabs(head.turn)), stretch((head.mouthCell.y - head.eyeCell.y) / PlainLength) {}
 
     Point operator()(double x, double y) const {
-        return {eyes.x + side * x, eyes.y + (y > 0 ? y * stretch : y)};
+        // Between eyes and mouth his face is as long as the pose has it; the chin never changes.
+        const double below = std::max(y - PlainLength, 0.0);
+        return {eyes.x + side * x, eyes.y + (y > 0 ? (y - below) * stretch + below : y)};
     }
 
     std::vector<Point> operator()(std::vector<Point> points) const {
@@ -49,7 +52,7 @@ std::vector<Point> faceFront() {
 
 std::vector<Point> faceHalf() {
     return {{-3, -14}, {5, -12}, {9.5, -6}, {8.5, 3},  {12.5, 12}, {14, 19},  {11, 25},
-            {4.5, 27}, {-3, 25}, {-10, 19}, {-12, 12}, {-14, 4},   {-16, -5}, {-11, -12}};
+            {4.5, 27}, {-4, 26}, {-11, 21}, {-13, 13}, {-14, 4},   {-16, -5}, {-11, -12}};
 }
 
 void paintEar(Picture& picture, const Place& at, double x) {
@@ -91,9 +94,9 @@ void paintFace(Picture& picture, const Place& at) {
 }
 
 void paintNose(Picture& picture, const Place& at) {
-    const Point tip = at(7.5 * at.turn, 8.8);
+    const Point tip = at(7.5 * at.turn, 7.6);
     const Point root = at(2.0 * at.turn, 1);
-    Part nose = skinPart({bone(root, tip, 2.2, 4), ellipse(tip, 6.6, 5.2, 8 * at.side)}, 2);
+    Part nose = skinPart({bone(root, tip, 2.2, 4), ellipse(tip, 6.6, 4.9, 8 * at.side)}, 2);
     nose.shade = Blush;
     const Mask mask = paintOutlined(picture, nose, Line);
     const Part shine = {{ellipse(tip + Point{-2.2, -2}, 1.8, 1.3)}, White, White, 0};
@@ -116,7 +119,7 @@ void paintCap(Picture& picture, const Place& at, double swing) {
                             {back + 9, -14},
                             {back + 11.5, -9},
                             {back, -8}})));
-    paintOutlined(picture, {std::move(felt), Felt, FeltShade, 2}, Line);
+    paintOutlined(picture, {std::move(felt), Felt, FeltShade, 2, FeltGlow}, Line);
     paintOutlined(picture, {{ellipse(tip + Point{0, 3}, 3.6, 3.6)}, Bobble, BobbleShade, 1}, Line);
     const Part band = {{bone(at(back - 11.5, -8.6), at(back + 11.5 + at.turn, -9.4), 2.4, 2.4)},
                        Trim,

@@ -17,7 +17,7 @@ Leg planted(double x, double toe) {
 Figure standing(Head head) {
     Figure figure;
     figure.head = head;
-    figure.neck = {chin(head).x, 50};
+    figure.neck = chin(head) + Point{0, 2};
     figure.pelvis = {(figure.neck.x + 2 * 63) / 3, 84};
     figure.arms = {Arm{figure.neck + Point{-21, 38}, 98, Grip::Relaxed, 1, -1, false, 0.01},
                    Arm{figure.neck + Point{21, 38}, 82, Grip::Relaxed, -1, 1, false, 0.01}};
@@ -27,25 +27,29 @@ Figure standing(Head head) {
 
 // One leg carries him, the other is at ease.
 void stand(Figure& figure) {
-    figure.pelvis = {60, 84};
-    figure.arms[0].wrist = figure.neck + Point{-21, 38};
-    figure.legs = {planted(54, -0.7), planted(75, 1)};
+    figure.pelvis = {58, 84};
+    figure.arms[1] = {figure.neck + Point{18, 36}, 120, Grip::Relaxed, -1, 1};
+    figure.arms[1].elbow = figure.neck + Point{26, 21};
+    figure.legs = {planted(53, -0.7), planted(75, 1)};
 }
 
 void startle(Figure& figure) {
     figure.head.brows = Brows::High;
     figure.head.eyes = Eyes::Wide;
     figure.head.mouth = Mouth::Gasp;
-    figure.head.capSwing = 36;
-    figure.shoulderLift = 3;
-    figure.arms[0] = {{30, 44}, -112, Grip::Open, -1, 1, false, 0.35};
-    figure.arms[1] = {{104, 44}, -68, Grip::Open, 1, -1, false, 0.35};
-    figure.legs = {Leg{{50, Ground - 6}, 0, -0.8, 1, 0.12}, Leg{{84, Ground - 14}, -18, 1, -1, 0.2}};
+    figure.head.capSwing = 22;
+    figure.shoulderLift = 4;
+    figure.pelvis.x = 66;
+    figure.arms[0] = {{29, 43}, -112, Grip::Open, -1, 1, false, 0.35};
+    figure.arms[1] = {{104, 43}, -68, Grip::Open, 1, -1, false, 0.35};
+    figure.legs = {Leg{{46, Ground - 6}, 0, -0.9, -1, 0.04},
+                   Leg{{88, Ground - 6}, 0, 0.9, 1, 0.03}};
 }
 
 void swear(Figure& figure) {
-    figure.arms[0] = {{33, 78}, 130, Grip::Open, 1, -1, false, 0.02};
-    figure.arms[1] = {{76, 66}, 190, Grip::Flat, -1, 1, false, 1.5};
+    figure.arms[0] = {{34, 80}, 125, Grip::Relaxed, 1, -1, false, 0.02};
+    figure.arms[1] = {{77, 69}, 205, Grip::Flat, -1, 1};
+    figure.arms[1].elbow = {{88, 73}};
     figure.legs = {planted(54, -0.8), planted(72, 0.8)};
 }
 
@@ -60,18 +64,20 @@ void point(Figure& figure) {
 void embrace(Figure& figure) {
     figure.head.brows = Brows::Raised;
     figure.head.mouth = Mouth::Grin;
-    figure.arms[0] = {{22, 56}, 195, Grip::Open, -1, 1, false, 0.03};
-    figure.arms[1] = {{102, 56}, -15, Grip::Open, 1, -1, false, 0.03};
+    figure.arms[0] = {{24, 46}, 215, Grip::Open, -1, 1, false, 0.04};
+    figure.arms[1] = {{102, 46}, -35, Grip::Open, 1, -1, false, 0.04};
     figure.legs = {planted(48, -0.8), planted(77, 0.8)};
 }
 
 void think(Figure& figure) {
     figure.head.brows = Brows::OneUp;
     figure.head.mouth = Mouth::Musing;
-    figure.pelvis.x = 62;
-    figure.arms[1] = {{58, 82}, 180, Grip::Relaxed, -1, 1, false, 0.6};
-    figure.arms[0] = {{62, 57}, -98, Grip::Fist, 1, 1, false, 2};
-    figure.legs = {planted(52, -0.9), planted(72, 0.7)};
+    figure.pelvis.x = 64;
+    figure.arms[0] = {{53, 62}, -62, Grip::Pointing, 1, -1};
+    figure.arms[0].elbow = {{37, 76}};
+    figure.arms[1] = {{56, 82}, 190, Grip::Flat, -1, 1, false, 0.6};
+    figure.arms[1].elbow = {{82, 78}};
+    figure.legs = {planted(52, -0.9), planted(74, 0.7)};
 }
 
 void laugh(Figure& figure) {
@@ -79,21 +85,26 @@ void laugh(Figure& figure) {
     figure.head.eyes = Eyes::Merry;
     figure.head.mouth = Mouth::Laugh;
     figure.head.capSwing = 18;
-    figure.neck.x -= 2;
-    figure.pelvis = {69, 84};
-    figure.arms[0] = {{54, 78}, 5, Grip::Flat, 1, -1, false, 0.6};
-    figure.arms[1] = {{86, 77}, 170, Grip::Flat, -1, 1, false, 0.5};
-    figure.legs = {planted(56, -0.6), Leg{{94, Ground - 16}, -28, 1, -1, 0.05}};
+    figure.shoulderLift = 2;
+    figure.neck.x -= 3;
+    figure.pelvis = {70, 85};
+    figure.arms[0] = {{56, 80}, 0, Grip::Flat, 1, -1};
+    figure.arms[0].elbow = {{37, 72}};
+    figure.arms[1] = {{86, 75}, 165, Grip::Flat, -1, 1};
+    figure.arms[1].elbow = {{94, 66}};
+    figure.legs = {Leg{{54, Ground - 6}, 0, -0.9, 1, 0.1}, Leg{{88, Ground - 6}, 0, 1, -1, 0.06}};
 }
 
 void whisper(Figure& figure) {
+    figure.head.turn = 0.5;
     figure.head.brows = Brows::OneUp;
     figure.head.eyes = Eyes::Aside;
     figure.head.mouth = Mouth::Whisper;
-    figure.pelvis = {52, 84};
-    figure.arms[0] = {{50, 56}, -65, Grip::Flat, 1, -1, false, 0.5};
+    figure.pelvis = {50, 85};
+    figure.arms[0] = {{51, 50}, -72, Grip::Flat, 1, -1};
+    figure.arms[0].elbow = {{34, 62}};
     figure.arms[1] = {{66, 82}, 180, Grip::Relaxed, -1, 1, true, 0.3};
-    figure.legs = {Leg{{32, Ground - 8}, -25, -1, 1, 0.01}, Leg{{62, Ground - 6}, 0, 0.9, -1, 0.05}};
+    figure.legs = {planted(36, -0.9), Leg{{66, Ground - 6}, 0, 1, -1, 0.1}};
 }
 
 } // namespace

@@ -18,6 +18,8 @@ constexpr Ink CoatGlow = {Magenta, DarkMagenta};
 constexpr Ink Trousers = DarkCyan;
 constexpr Ink TrousersShade = {DarkCyan, DarkBlue};
 
+constexpr Ink TrousersGlow = {Cyan, DarkCyan};
+
 constexpr Ink Linen = White;
 constexpr Ink LinenShade = LightGrey;
 
@@ -32,6 +34,8 @@ constexpr Ink HairShade = Red;
 
 constexpr Ink Felt = DarkCyan;
 constexpr Ink FeltShade = {DarkCyan, DarkBlue};
+
+constexpr Ink FeltGlow = {Cyan, DarkCyan};
 
 constexpr Ink Trim = Yellow;
 constexpr Ink TrimShade = DarkYellow;
