@@ -4,7 +4,11 @@
 
 namespace art {
 
-// The speech bubble with its tail at the left edge, 160 by 95. The other one is its mirror picture.
-Picture drawBubble();
+// The edge that faces him.
+enum class Tail { Left, Right };
+
+// The speech bubble, 160 by 95, with the tip of its tail 50 rows down. It is white but for a touch
+// of shade beside the field of its text, on its lower right.
+Picture drawBubble(Tail tail);
 
 } // namespace art

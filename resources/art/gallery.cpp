@@ -81,9 +81,8 @@ std::vector<Exhibit> drawGallery() {
     addWalks(gallery);
     addTurns(gallery);
     addPoses(gallery);
-    const Picture bubble = drawBubble();
-    gallery.push_back(sixteenColours("bubleft", bubble));
-    gallery.push_back(sixteenColours("bubright", mirrored(bubble)));
+    gallery.push_back(sixteenColours("bubleft", drawBubble(Tail::Left)));
+    gallery.push_back(sixteenColours("bubright", drawBubble(Tail::Right)));
     gallery.push_back(sixteenColours("expresns", drawExpressions()));
     addTiles(gallery);
     gallery.push_back(sixteenColours("sysbuts", drawSysButtons()));
