@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstddef>
 
 namespace art {
 
@@ -15,10 +16,38 @@ int wrapped(int value, int count) {
     return ((value % count) + count) % count;
 }
 
-// The way from a to b where the places repeat.
-double wrappedGap(double a, double b, int size) {
-    const double gap = std::fabs(a - b);
-    return std::min(gap, size - gap);
+// How many samples stand for a pixel in each direction.
+constexpr int Samples = 4;
+
+Shade sampled(const std::function<Shade(double x, double y)>& paint, int x, int y) {
+    Shade sum;
+    for (int i = 0; i < Samples * Samples; ++i) {
+        const Shade shade =
+            paint(x + (i % Samples + 0.5) / Samples, y + (i / Samples + 0.5) / Samples);
+        sum = {sum.red + shade.red, sum.green + shade.green, sum.blue + shade.blue};
+    }
+    return mix({}, sum, 1.0 / (Samples * Samples));
+}
+
+std::uint8_t rounded(double part, int step) {
+    return static_cast<std::uint8_t>(std::clamp(std::lround(part / step) * step, 0L, 255L));
+}
+
+// The colours in steps of so much, as numbers: red, green and blue one above the other.
+std::vector<std::uint32_t> stepped(const std::vector<Shade>& shades, int step) {
+    std::vector<std::uint32_t> numbers;
+    numbers.reserve(shades.size());
+    for (const Shade& shade : shades) {
+        numbers.push_back(rounded(shade.red, step) * 65536U + rounded(shade.green, step) * 256U +
+                          rounded(shade.blue, step));
+    }
+    return numbers;
+}
+
+std::vector<std::uint32_t> different(std::vector<std::uint32_t> numbers) {
+    std::sort(numbers.begin(), numbers.end());
+    numbers.erase(std::unique(numbers.begin(), numbers.end()), numbers.end());
+    return numbers;
 }
 
 std::uint8_t blend(std::uint8_t from, std::uint8_t to, double share) {
@@ -69,7 +98,8 @@ double nearest(const std::vector<std::array<double, 2>>& points, double x, doubl
     double first = size;
     second = size;
     for (const auto& point : points) {
-        const double gap = std::hypot(wrappedGap(point[0], x, size), wrappedGap(point[1], y, size));
+        const double gap =
+            std::hypot(shortestWay(point[0], x, size), shortestWay(point[1], y, size));
         second = std::min(second, std::max(gap, first));
         first = std::min(first, gap);
     }
@@ -107,6 +137,65 @@ Tile shadedTile(int size, Rgb dark, Rgb light, const Field& brightness) {
         }
     }
     return tile;
+}
+
+Shade mix(Shade a, Shade b, double share) {
+    return {a.red + (b.red - a.red) * share, a.green + (b.green - a.green) * share,
+            a.blue + (b.blue - a.blue) * share};
+}
+
+Shade lit(Shade shade, double by) {
+    return {shade.red + by, shade.green + by, shade.blue + by};
+}
+
+Tile paintedTile(int size, const std::function<Shade(double x, double y)>& paint) {
+    constexpr std::size_t Colours = 256;
+    std::vector<Shade> shades;
+    for (int i = 0; i < size * size; ++i) {
+        shades.push_back(sampled(paint, i % size, i / size));
+    }
+    int step = 1;
+    while (different(stepped(shades, step)).size() > Colours) {
+        ++step;
+    }
+    const std::vector<std::uint32_t> numbers = stepped(shades, step);
+    const std::vector<std::uint32_t> palette = different(numbers);
+    Tile tile{Picture(size, size), std::vector<Rgb>(Colours)};
+    for (std::size_t i = 0; i < palette.size(); ++i) {
+        tile.colours[i] = {static_cast<std::uint8_t>(palette[i] >> 16U),
+                           static_cast<std::uint8_t>(palette[i] >> 8U),
+                           static_cast<std::uint8_t>(palette[i])};
+    }
+    for (std::size_t i = 0; i < numbers.size(); ++i) {
+        const auto found = std::lower_bound(palette.begin(), palette.end(), numbers[i]);
+        tile.picture.pixels[i] = static_cast<std::uint8_t>(found - palette.begin());
+    }
+    return tile;
+}
+
+double shortestWay(double a, double b, int size) {
+    return std::remainder(b - a, static_cast<double>(size));
+}
+
+std::vector<std::array<double, 2>> strewn(int size, int count, std::uint32_t seed) {
+    constexpr int Tries = 24;
+    std::vector<std::array<double, 2>> points;
+    for (int i = 0; i < count; ++i) {
+        std::array<double, 2> best = {};
+        double widest = -1;
+        for (int attempt = 0; attempt < Tries; ++attempt) {
+            const double x = size * chance(i, attempt, seed);
+            const double y = size * chance(i, attempt, seed + 1);
+            double second = 0;
+            const double gap = nearest(points, x, y, size, second);
+            if (gap > widest) {
+                widest = gap;
+                best = {x, y};
+            }
+        }
+        points.push_back(best);
+    }
+    return points;
 }
 
 Field relief(const Field& height, double strength) {

@@ -42,6 +42,27 @@ std::vector<Rgb> ramp(Rgb dark, Rgb light);
 // Turns a field of 0 to 1 into a tile of 256 colours.
 Tile shadedTile(int size, Rgb dark, Rgb light, const Field& brightness);
 
+// A colour in the making, each part from 0 to 255.
+struct Shade {
+    double red = 0;
+    double green = 0;
+    double blue = 0;
+};
+
+Shade mix(Shade a, Shade b, double share);
+// Lighter by so much in each part, or darker.
+Shade lit(Shade shade, double by);
+
+// Paints every place of a tile; places next to each other may differ as they like, since each pixel
+// takes the mean of several. The finest 256 steps of colour that do are found.
+Tile paintedTile(int size, const std::function<Shade(double x, double y)>& paint);
+
+// So many points that keep away from each other, also across the edges.
+std::vector<std::array<double, 2>> strewn(int size, int count, std::uint32_t seed);
+
+// The way from a to b across the nearest edge, if that is shorter: between -size / 2 and size / 2.
+double shortestWay(double a, double b, int size);
+
 // A field seen as a landscape in light from the upper left: 0.5 where it is flat.
 Field relief(const Field& height, double strength);
 

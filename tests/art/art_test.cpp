@@ -358,18 +358,42 @@ TEST(Art, BubblesAreWhiteForTheirTextAndHaveTheirTailsFiftyRowsDown) {
     }
 }
 
-TEST(Art, TilesAreLightAndRepeatWithoutASeam) {
+TEST(Art, TilesAreLightAndCalmAndRepeatWithoutASeam) {
     for (const Bitmap& tile : tiles()) {
         SCOPED_TRACE(tile.name);
         for (const bool rows : {false, true}) {
             int largest = 0;
+            int sum = 0;
             for (int i = 0; i + 1 < tile.width; ++i) {
                 largest = std::max(largest, step(tile, i, i + 1, rows));
+                sum += step(tile, i, i + 1, rows);
             }
             EXPECT_LE(step(tile, tile.width - 1, 0, rows), largest * 11 / 10);
+            EXPECT_LE(sum / tile.width, 7 * tile.width) << "it flickers";
         }
         const auto [darkest, lightest] = std::ranges::minmax(tile.pixels, {}, brightness);
         EXPECT_GE(brightness(darkest), 160);
         EXPECT_LE(brightness(lightest) - brightness(darkest), 64);
+    }
+}
+
+TEST(Art, NoTwoTilesAreTakenForEachOther) {
+    std::vector<std::vector<int>> others;
+    for (const Bitmap& tile : tiles()) {
+        std::vector<int> mean;
+        for (const unsigned shift : {0U, 8U, 16U}) {
+            int sum = 0;
+            for (const std::uint32_t pixel : tile.pixels) {
+                sum += static_cast<int>(pixel >> shift & 255U);
+            }
+            mean.push_back(sum / (tile.width * tile.height));
+        }
+        for (const auto& other : others) {
+            EXPECT_GE(std::abs(mean[0] - other[0]) + std::abs(mean[1] - other[1]) +
+                          std::abs(mean[2] - other[2]),
+                      24)
+                << tile.name;
+        }
+        others.push_back(mean);
     }
 }
