@@ -14,6 +14,8 @@ namespace art {
 namespace {
 
 constexpr double LineWidth = 1.1;
+// Where the light falls on the cap, so that it stands out on dark ground.
+constexpr Ink Shine = {Cyan, DarkCyan};
 
 // A shape that can be drawn smaller all round; the light is such a smaller one, up and left.
 struct Round {
@@ -80,13 +82,14 @@ void addCap(std::vector<Layer>& layers) {
                                     {43, 8},  {47.5, 17}, {31, 18.5}};
     layers[light - 1].outlines.push_back(blob(dome));
     layers[light].outlines.push_back(blob(lit));
+    layers.push_back({tube({{14.5, 11.8}, {18.5, 8}, {24.5, 5.8}, {31, 5.4}}, 1.2, 1.6), Shine, 0});
     addLit(layers, {{{6.6, 27.5}, {6.6, 27.5}, 5, 5}}, Bobble, BobbleShade, 1.2);
     addLit(layers, {{{17, 19.5}, {49, 17.5}, 3.6, 3.6}}, Trim, TrimShade, 0.9);
 }
 
-void addNose(std::vector<Layer>& layers, Ink shade) {
+void addNose(std::vector<Layer>& layers, Ink shade, double shadow) {
     addLit(layers, {{{41, 34}, {46, 40}, 4, 7}, {{43.5, 40.5}, {51, 40}, 6.6, 7.4}}, Skin, shade,
-           1.7);
+           shadow);
     layers.push_back({{ellipse({46.6, 37.4}, 3, 2.1, -25)}, White, 0});
 }
 
@@ -228,7 +231,7 @@ std::vector<Layer> emblemLayers(bool plain) {
         addEar(layers);
     }
     addCap(layers);
-    addNose(layers, plain ? Ink(Red) : Blush);
+    addNose(layers, plain ? Ink(Red) : Blush, plain ? 1.1 : 1.7);
     if (!plain) {
         addFeatures(layers);
     }

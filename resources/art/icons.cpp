@@ -15,10 +15,10 @@ namespace {
 Picture drawSmallest() {
     Picture picture(16, 16);
     stamp(picture, 0, 0,
-          {"    bbbbbb      ", "  bbccccccbb    ", " bccccccccccb   ", " bccbbbbbbbbbb  ",
-           "bccbYYYYYYYYYYb ", "bRRbYYYYYYYYYyb ", "bRRrbbbbbbbbbb  ", " bbbRsWWbWWbb   ",
-           "  bRRsWWbWWbb   ", "  bRssWbbWbbbbb ", "  bssssbssbYYYRb", "   bsssssbWYYYRb",
-           "   bsssssbYYRRRb", "   bssssssbbbbb ", "    bssssbbsb   ", "     bbbbbbb    "},
+          {"    bbbbbbb     ", "  bbCCcccccbb   ", " bCCccccccccbb  ", "bCCcbbbbbbbbbbb ",
+           "bccbYYYYYYYYYYyb", "bbbbbbbbbbbbbbb ", "bRRbWWWbWWWb    ", "bRRbWWbbWWbb    ",
+           " bbsWWbbWWbbbb  ", "  bssbbsbbYYYYb ", "  bssssssbWWYYYb", "  bsRssssbYYYYRb",
+           "  bssbssssbRRRb ", "   bssbbbbbbbb  ", "   bsssssssbb   ", "    bbbbbbbb    "},
           Skin);
     return picture;
 }
