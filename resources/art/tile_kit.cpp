@@ -150,12 +150,14 @@ Shade lit(Shade shade, double by) {
 
 Tile paintedTile(int size, const std::function<Shade(double x, double y)>& paint) {
     constexpr std::size_t Colours = 256;
+    // A screen or a film of 256 colours has to find room for the figure's beside them.
+    constexpr std::size_t Painted = 224;
     std::vector<Shade> shades;
     for (int i = 0; i < size * size; ++i) {
         shades.push_back(sampled(paint, i % size, i / size));
     }
     int step = 1;
-    while (different(stepped(shades, step)).size() > Colours) {
+    while (different(stepped(shades, step)).size() > Painted) {
         ++step;
     }
     const std::vector<std::uint32_t> numbers = stepped(shades, step);

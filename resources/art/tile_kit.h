@@ -54,7 +54,7 @@ Shade mix(Shade a, Shade b, double share);
 Shade lit(Shade shade, double by);
 
 // Paints every place of a tile; places next to each other may differ as they like, since each pixel
-// takes the mean of several. The finest 256 steps of colour that do are found.
+// takes the mean of several. The colours are taken as fine as fits into the tile's table.
 Tile paintedTile(int size, const std::function<Shade(double x, double y)>& paint);
 
 // So many points that keep away from each other, also across the edges.

@@ -152,7 +152,7 @@ Tile shingles() {
             if (down < rim) {
                 const double own =
                     chance((column + Columns) % Columns, (row + Rows) % Rows, 51) - 0.5;
-                const double moss = clouds(x, y, Size, 10, 3, 52) - 0.5;
+                const double moss = clouds(x, y, Size, 8, 2, 52) - 0.5;
                 const Shade green = mix({206, 226, 196}, {190, 214, 188}, 0.5 + own);
                 const double lip = rim - down < 1.2 ? 14 : 0;
                 return lit(green, (down - 14) * 1.3 + 14 * moss + lip - across * 0.25);
@@ -248,7 +248,7 @@ Tile knitting() {
         const double lean = right ? 1 - across : across;
         const double down = std::fmod(bentY / High - lean * 0.7 + 8, 1.0);
         const double round = std::sin(Turn / 2 * across) * std::sin(Turn / 2 * down);
-        const double fuzz = clouds(x, y, Size, 20, 2, 63) - 0.5;
+        const double fuzz = clouds(x, y, Size, 10, 2, 63) - 0.5;
         return 0.3 + 0.42 * std::sqrt(round) + 0.18 * fuzz + (right ? -0.04 : 0.04);
     });
 }
