@@ -47,35 +47,26 @@ double facingOfLimbs(const Figure& figure) {
     return figure.turn < 0.5 ? 1 : facing(figure);
 }
 
-Point shoulder(const Figure& figure, std::size_t which) {
-    const double aside = (12 - 9.5 * figure.turn) * facingOfLimbs(figure);
-    return trunkOf(figure)(which == 0 ? -aside : aside, 0.16) - Point{0, figure.shoulderLift};
+std::vector<Point> coatFront(double lift) {
+    return {{0, -0.02},  {9, 0.02 - lift}, {14, 0.14 - lift},  {13.5, 0.5},
+            {15, 0.95},  {13, 1.12},       {0, 1.16},          {-13, 1.12},
+            {-15, 0.95}, {-13.5, 0.5},     {-14, 0.14 - lift}, {-9, 0.02 - lift}};
 }
 
-Point hip(const Figure& figure, std::size_t which) {
-    const double aside = (6.5 - 5.5 * figure.turn) * facingOfLimbs(figure);
-    return figure.pelvis + Point{which == 0 ? -aside : aside, -4};
+// Looking right: the chest is out, the small of the back is in.
+std::vector<Point> coatSide() {
+    return {{0, -0.04}, {6, 0.0},    {10.5, 0.16}, {12.2, 0.45}, {12, 0.9},    {11, 1.12},
+            {0, 1.15},  {-10, 1.12}, {-10, 0.9},   {-9, 0.55},   {-10.2, 0.2}, {-6, 0.0}};
 }
 
 std::vector<Outline> coatOutlines(const Figure& figure) {
     const Trunk at = trunkOf(figure);
-    const double slim = 1 - 0.22 * figure.turn;
-    const double lift = figure.shoulderLift / 40;
-    std::vector<Outline> outlines = {
-        blob({at(0, -0.02), at(9 * slim, 0.02 - lift), at(14 * slim, 0.14 - lift),
-              at(13.5 * slim, 0.5), at(15 * slim, 0.95), at(13 * slim, 1.12), at(0, 1.16),
-              at(-13 * slim, 1.12), at(-15 * slim, 0.95), at(-13.5 * slim, 0.5),
-              at(-14 * slim, 0.14 - lift), at(-9 * slim, 0.02 - lift)})};
-    if (figure.tails > 0) {
-        const double side = facing(figure);
-        const std::vector<Point> hang = {at(-7 * side, 0.7),
-                                         at((-10 - figure.tails * 0.3) * side, 1.0),
-                                         at((-9 - figure.tails) * side, 1.3)};
-        for (Outline& outline : tube(hang, 8, 4)) {
-            outlines.push_back(std::move(outline));
-        }
+    const double side = facing(figure);
+    std::vector<Point> points;
+    for (const Point& point : mix(coatFront(figure.shoulderLift / 40), coatSide(), figure.turn)) {
+        points.push_back(at(point.x * side, point.y));
     }
-    return outlines;
+    return {blob(points)};
 }
 
 // Takes away the line between sleeve and coat at the shoulder, where they are one piece of cloth.
@@ -102,25 +93,40 @@ void paintCuff(Picture& picture, Point elbow, Point wrist) {
     paintOutlined(picture, cuff, Line);
 }
 
-void paintArm(Picture& picture, const Figure& figure, std::size_t which) {
+Point elbow(const Figure& figure, std::size_t which) {
     const Arm& arm = figure.arms[which];
     const Point root = shoulder(figure, which);
     const double seen = distance(root, arm.wrist) * (1 + arm.slack) / (UpperArm + LowerArm);
     const double scale = std::min(seen, 1.0);
-    const Point elbow =
-        arm.elbow.value_or(joint(root, arm.wrist, UpperArm * scale, LowerArm * scale, arm.bend));
-    const Point end = mix(arm.wrist, elbow, 3 / std::max(distance(arm.wrist, elbow), 3.0));
-    const Part sleeve = {tube({root, elbow, end}, 5.4, 4.4), Coat, CoatShade, 2, CoatGlow};
-    const Mask cloth = paintOutlined(picture, sleeve, Line);
-    takeGlow(picture, figure, cloth);
+    return arm.elbow.value_or(joint(root, arm.wrist, UpperArm * scale, LowerArm * scale, arm.bend));
+}
+
+// In the side view the first arm and leg are on the far side, away from the light.
+bool isFar(const Figure& figure, std::size_t which) {
+    return which == 0 && figure.turn > 0.5;
+}
+
+void paintArm(Picture& picture, const Figure& figure, std::size_t which) {
+    const Arm& arm = figure.arms[which];
+    const Point root = shoulder(figure, which);
+    const Point bent = elbow(figure, which);
+    const Ink cloth = isFar(figure, which) ? CoatShade : Coat;
+    const Ink glow = isFar(figure, which) ? CoatShade : CoatGlow;
+    const Point end = mix(arm.wrist, bent, 3 / std::max(distance(arm.wrist, bent), 3.0));
+    const Part sleeve = {tube({root, bent, end}, 5.4 + 0.8 * figure.turn, 4.4), cloth, CoatShade, 2,
+                         glow};
+    const Mask mask = paintOutlined(picture, sleeve, Line);
+    if (figure.turn < 0.5) {
+        takeGlow(picture, figure, mask);
+    }
     if (figure.turn < 0.5 && !arm.behind) {
         joinSleeve(picture, figure, root);
     }
     paintHand(picture, arm.grip, arm.wrist, arm.angle, arm.thumb);
-    paintCuff(picture, elbow, arm.wrist);
+    paintCuff(picture, bent, arm.wrist);
 }
 
-void paintShoe(Picture& picture, const Leg& leg) {
+void paintShoe(Picture& picture, const Leg& leg, bool far) {
     const double side = leg.toe < 0 ? -1 : 1;
     const double length = std::fabs(leg.toe);
     Outline sole = {{-6.5, 1}, {-4.5, -3.5}, {1, -4.5}, {5, -2}, {10, -2.5},
@@ -128,7 +134,8 @@ void paintShoe(Picture& picture, const Leg& leg) {
     for (Point& point : sole) {
         point = leg.ankle + turned({point.x * side * length, point.y}, leg.angle * side);
     }
-    paintOutlined(picture, {{blob(sole)}, Leather, LeatherShade, 2}, Line);
+    const Ink lit = far ? Ink(Red, DarkRed) : Leather;
+    paintOutlined(picture, {{blob(sole)}, lit, LeatherShade, 2}, Line);
 }
 
 void paintLeg(Picture& picture, const Figure& figure, std::size_t which) {
@@ -137,12 +144,60 @@ void paintLeg(Picture& picture, const Figure& figure, std::size_t which) {
     const double seen = distance(root, leg.ankle) * (1 + leg.slack) / (Thigh + Shin);
     const double scale = std::min(seen, 1.0);
     const Point knee = joint(root, leg.ankle, Thigh * scale, Shin * scale, leg.bend);
-    paintShoe(picture, leg);
-    const bool far = which == 0 && figure.turn > 0.5;
+    const bool far = isFar(figure, which);
+    paintShoe(picture, leg, far);
     const Part trouser = {tube({root, knee, leg.ankle - Point{0, 1}}, 7, 4.6),
                           far ? TrousersShade : Trousers, TrousersShade, 2,
                           far ? TrousersShade : TrousersGlow};
     paintOutlined(picture, trouser, Line);
+}
+
+// The tails hang from the small of the back and fly out behind, their ends most.
+void paintTails(Picture& picture, const Figure& figure) {
+    const Trunk at = trunkOf(figure);
+    const double side = facing(figure);
+    const auto from = [&](Point start, double across, double down, double degrees) {
+        return start + turned({across * side, down}, degrees * side);
+    };
+    const Point top = at(-8.8 * side, 0.6);
+    const Point middle = from(top, 0, 13, figure.tails * 0.5 + 4);
+    const Point end = from(middle, 0, 13, figure.tails);
+    const Point inner = from(end, 9, 1.5, figure.tails);
+    const Part tails = {{blob({top, middle, end, from(end, 4, 2.5, figure.tails), inner,
+                               at(1 * side, 1.05), at(-2 * side, 0.6)})},
+                        Coat,
+                        CoatShade,
+                        2,
+                        CoatGlow};
+    paintOutlined(picture, tails, Line);
+}
+
+// Whether a sleeve before the coat hides a place on it.
+bool underSleeve(const Figure& figure, Point place) {
+    constexpr double SleeveRadius = 7.2;
+    for (std::size_t which = 0; which < 2; ++which) {
+        const Point bent = elbow(figure, which);
+        for (int i = 0; i <= 10 && !figure.arms[which].behind; ++i) {
+            const double share = i / 10.0;
+            if (distance(mix(shoulder(figure, which), bent, share), place) < SleeveRadius ||
+                distance(mix(bent, figure.arms[which].wrist, share), place) < SleeveRadius) {
+                return true;
+            }
+        }
+    }
+    return false;
+}
+
+void paintButtons(Picture& picture, const Figure& figure, double aside, const Mask& coat) {
+    for (const double down : {0.32, 0.56, 0.8}) {
+        const Point exact = trunkOf(figure)(aside, down);
+        // On the corner of four pixels it is round in every picture.
+        const Point place = {std::round(exact.x), std::round(exact.y)};
+        // Half a button that looks out from under a sleeve would be dirt.
+        if (figure.turn < 0.5 || !underSleeve(figure, place)) {
+            paintWithin(picture, {{ellipse(place, 2, 2)}, Brass, BrassShade, 1}, coat);
+        }
+    }
 }
 
 void paintCoat(Picture& picture, const Figure& figure) {
@@ -150,18 +205,31 @@ void paintCoat(Picture& picture, const Figure& figure) {
     const Mask coat =
         paintOutlined(picture, {coatOutlines(figure), Coat, CoatShade, 3, CoatGlow}, Line);
     const double seam = 8 * figure.turn * facing(figure);
-    const double buttons = seam + 3.2 * facingOfLimbs(figure);
+    // The buttons are on his left side, so the walk to the left shows them best.
+    const double buttons = seam + 3.2 - 1.9 * figure.turn;
     paintWithin(picture, {{bone(at(seam, 0), at(seam, 1.3), 0.55, 0.55)}, CoatShade, CoatShade, 0},
                 coat);
-    for (const double down : {0.32, 0.56, 0.8}) {
-        paintWithin(picture, {{ellipse(at(buttons, down), 1.7, 1.7)}, Brass, BrassShade, 1}, coat);
-    }
+    paintButtons(picture, figure, buttons, coat);
     const Point collar = at(1.5 * figure.turn * facing(figure), 0.02);
     paintOutlined(picture, {{ellipse(collar, 10 - 2 * figure.turn, 3.6)}, Linen, LinenShade, 1},
                   Line);
 }
 
 } // namespace
+
+Point shoulder(const Figure& figure, std::size_t which) {
+    double aside = (which == 0 ? -12 : 12) * (1 - figure.turn * figure.turn);
+    if (figure.turn > 0.5) {
+        // The chest is turned to us a little, so the far shoulder shows in front.
+        aside = (which == 0 ? 3 - figure.twist : -2.5 + figure.twist) * facing(figure);
+    }
+    return trunkOf(figure)(aside, figure.turn > 0.5 ? 0.19 : 0.16) - Point{0, figure.shoulderLift};
+}
+
+Point hip(const Figure& figure, std::size_t which) {
+    const double aside = (6.5 - 5.5 * figure.turn) * facingOfLimbs(figure);
+    return figure.pelvis + Point{which == 0 ? -aside : aside, -4};
+}
 
 Figure mirrored(const Figure& figure) {
     Figure other = figure;
@@ -198,8 +266,14 @@ Picture drawFigure(const Figure& figure) {
             paintArm(picture, figure, which);
         }
     }
-    paintLeg(picture, figure, 0);
-    paintLeg(picture, figure, 1);
+    // Half turned, the leg behind is the one on the side that he looks to.
+    const bool halfTurned = figure.turn > 0 && figure.turn < 0.5;
+    const std::size_t back = halfTurned && facing(figure) > 0 ? 1 : 0;
+    paintLeg(picture, figure, back);
+    paintLeg(picture, figure, 1 - back);
+    if (figure.tails > 0) {
+        paintTails(picture, figure);
+    }
     paintCoat(picture, figure);
     paintHead(picture, figure.head);
     for (std::size_t which = 0; which < 2; ++which) {

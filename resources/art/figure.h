@@ -6,6 +6,7 @@
 #include "resources/art/picture.h"
 
 #include <array>
+#include <cstddef>
 #include <optional>
 
 namespace art {
@@ -52,11 +53,17 @@ struct Figure {
     // 0 seen from the front, 1 from the side, looking right.
     double turn = 0;
     double shoulderLift = 0;
+    // From the side, how far the near shoulder is ahead of its place and the far one behind.
+    double twist = 0;
     std::array<Arm, 2> arms;
     std::array<Leg, 2> legs;
-    // How far the tails of the coat hang behind, in pixels.
+    // How far the tails of the coat fly out behind, in degrees. Without, they aren't seen.
     double tails = 0;
 };
+
+// Where an arm begins and a leg begins.
+Point shoulder(const Figure& figure, std::size_t which);
+Point hip(const Figure& figure, std::size_t which);
 
 // The figure turned to the other side, for a picture in the same light.
 Figure mirrored(const Figure& figure);

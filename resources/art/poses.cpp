@@ -107,6 +107,17 @@ void whisper(Figure& figure) {
     figure.legs = {planted(36, -0.9), Leg{{66, Ground - 6}, 0, 1, -1, 0.1}};
 }
 
+// An arm that hangs at ease, the hand as far from the shoulder as told.
+Arm hanging(const Figure& figure, std::size_t which, Point reach, double angle, int thumb) {
+    Arm arm;
+    arm.wrist = shoulder(figure, which) + reach;
+    arm.angle = angle;
+    arm.bend = which == 0 ? 1 : -1;
+    arm.thumb = thumb;
+    arm.slack = 0.02;
+    return arm;
+}
+
 } // namespace
 
 Figure pose(int number) {
@@ -132,6 +143,18 @@ Figure turningRight(int number) {
     head.capSwing = half ? 10 : 4;
     Figure figure = standing(head);
     figure.turn = half ? 0.45 : 0.2;
+    figure.neck.x -= half ? 3 : 1;
+    figure.pelvis.x = half ? 62 : 62.5;
+    figure.arms[0] = hanging(figure, 0, half ? Point{-4, 30} : Point{-5, 29.5}, 94, -1);
+    figure.arms[1] =
+        hanging(figure, 1, half ? Point{6, 28} : Point{5, 29.5}, half ? 74 : 86, half ? -1 : 1);
+    figure.arms[1].behind = half;
+    if (half) {
+        figure.legs = {planted(figure.pelvis.x - 11, 0.8), planted(figure.pelvis.x + 7, 0.9)};
+        figure.legs[1].ankle.y -= 1;
+    } else {
+        figure.legs = {planted(figure.pelvis.x - 8, -0.55), planted(figure.pelvis.x + 8, 0.85)};
+    }
     return figure;
 }
 

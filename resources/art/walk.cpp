@@ -1,103 +1,139 @@
 #include "resources/art/walk.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
+#include <cstddef>
 #include <numbers>
 
 namespace art {
 
 namespace {
 
-constexpr double LoopPictures = 7;
+constexpr std::size_t LoopPictures = 7;
 // How far he gets from one picture to the next.
 constexpr double Advance = 18;
-// A foot is on the ground for half of the loop and goes back as fast as he goes on.
-constexpr double Stride = Advance * LoopPictures / 2;
 constexpr double BodyX = 60;
-constexpr double BallForward = 7;
+// Where the ball of a foot is half-way through its time on the ground, counted from the body.
+constexpr double BallForward = 8.5;
 constexpr Point AnkleFromBall = {-13, -6};
 constexpr double HeelFromBall = 18;
+// Legs and arms keep their length, a pixel more or less, from picture to picture.
+constexpr double LegLength = 45.2;
+constexpr double UpperArmLength = 16;
+constexpr double LowerArmLength = 15;
 
-double wave(double phase) {
-    return std::sin(2 * std::numbers::pi * phase);
-}
+// A foot in one picture of the loop.
+struct Step {
+    // How far the ball of the foot is ahead of the middle of its way on the ground.
+    double along;
+    // How far the ball is above the ground.
+    double lift;
+    // How far the heel is turned up, in degrees; below 0 the toe is up.
+    double heelUp;
+};
 
-double smooth(double t) {
-    return t * t * (3 - 2 * t);
-}
+// One picture of the loop.
+struct Phase {
+    Step far;
+    Step near;
+    // How far the body is above its middle height.
+    double rise;
+    // Where the arms are, from -1 behind him to 1 before him.
+    double farArm;
+    double nearArm;
+    // How far the tip of the cap and the tails of the coat fly up, in degrees.
+    double cap;
+    double tails;
+};
 
-double fraction(double phase) {
-    return phase - std::floor(phase);
-}
+// A standing foot in its four pictures on the ground: it goes back as fast as he gets on.
+constexpr Step Contact = {1.5 * Advance, 0, -20};
+constexpr Step Flat = {0.5 * Advance, 0, 0};
+constexpr Step Behind = {-0.5 * Advance, 0, 8};
+constexpr Step PushOff = {-1.5 * Advance, 0, 44};
 
-// How far the heel is off the ground, as a turn of the shoe in degrees; below 0 the toe is up.
-double roll(double p) {
-    if (p < 0.07) {
-        return -18;
-    }
-    if (p < 0.3) {
-        return 0;
-    }
-    if (p < 0.5) {
-        return 42 * (p - 0.3) / 0.2;
-    }
-    const double air = (p - 0.5) * 2;
-    return 42 + 22 * std::sin(std::numbers::pi * std::min(1.0, air * 1.6)) - 64 * air;
-}
+// The near foot comes down in picture 2, the far one in picture 5. The body is lowest after a
+// foot has come down and highest when one leg passes the other; what is loose comes a picture
+// later.
+constexpr std::array<Phase, LoopPictures> Loop = {{
+    {{-28, 2, 58}, Contact, -1.5, 1, -1, 18, 14},
+    {{-9, 6, 46}, Flat, 1, 0.5, -0.5, 30, 30},
+    {{18, 5, -8}, Behind, 1.5, -0.5, 0.45, 14, 22},
+    {Contact, PushOff, -1, -0.9, 0.8, 10, 10},
+    {Flat, {-28, 2, 54}, -1, -1, 1, 24, 16},
+    {Behind, {5, 5, 26}, 1, -0.1, 0, 34, 32},
+    {PushOff, {19, 6, -8}, 1.5, 0.75, -0.9, 20, 18},
+}};
 
-// The foot is led by its ball, on which it stands until the toe leaves the ground.
-Leg stepping(double phase, double size) {
-    const double p = fraction(phase);
-    const double air = std::max(0.0, (p - 0.5) * 2);
-    const double along = p < 0.5 ? Stride / 2 - Stride * 2 * p : Stride * smooth(air) - Stride / 2;
-    const Point ball = {BodyX + BallForward + size * along,
-                        Ground - size * 8 * std::sin(std::numbers::pi * air)};
+Leg stepping(const Step& step, double size) {
     Leg leg;
-    leg.angle = size * roll(p);
-    leg.ankle = ball + turned(AnkleFromBall, leg.angle);
+    leg.angle = size * step.heelUp;
+    const Point ball = {BodyX + BallForward + size * step.along, Ground - size * step.lift};
+    // With the toe up he stands on the heel, otherwise on the ball.
+    const Point heel = ball - Point{HeelFromBall, 0};
+    leg.ankle = leg.angle < 0 ? heel + turned(AnkleFromBall + Point{HeelFromBall, 0}, leg.angle)
+                              : ball + turned(AnkleFromBall, leg.angle);
     if (leg.angle > 0) {
         // The round tip of the shoe would dip below the ground.
         leg.ankle.y -= 1.2 * std::sin(leg.angle * std::numbers::pi / 180);
     }
-    if (leg.angle < 0) {
-        // With the toe up the heel is lowest. It comes down to the ground, not below.
-        const double dip = HeelFromBall * std::sin(-leg.angle * std::numbers::pi / 180);
-        leg.ankle.y -= std::max(0.0, dip - (Ground - ball.y));
-    }
     leg.bend = -1;
-    leg.slack = 1;
     return leg;
 }
 
-Arm swinging(double phase, const Figure& figure, double size) {
-    const double swing = size * 42 * wave(phase + 0.25);
+// The arm bends more before him than behind.
+Arm swinging(Point shoulder, double swing) {
+    const double upper = 2 + (38 - 8 * swing) * swing;
+    const double lower = 20 + (45 - 7 * swing) * swing;
     Arm arm;
-    arm.wrist = figure.neck + Point{0, 7} + turned({0, 30}, -swing);
-    arm.angle = 80 - swing * 1.2;
+    arm.wrist =
+        shoulder + turned({0, UpperArmLength}, -upper) + turned({0, LowerArmLength}, -lower);
+    arm.angle = 90 - lower;
+    arm.slack = (UpperArmLength + LowerArmLength) / distance(shoulder, arm.wrist) - 1;
     arm.bend = 1;
     arm.thumb = -1;
     return arm;
 }
 
+void placeHead(Head& head, const Phase& phase, double rise) {
+    head.eyeCell = {BodyX + 1, std::round(17 - rise)};
+    head.mouthCell = {BodyX + 5, std::round(34 - rise)};
+    head.turn = 1.5;
+    head.capSwing = phase.cap;
+}
+
+Phase phaseOf(int number) {
+    if (number > 1) {
+        return Loop[static_cast<std::size_t>(number - 2)];
+    }
+    // The first step is so small that the far foot is still on the ground.
+    Phase phase = Loop[0];
+    phase.far = PushOff;
+    phase.rise = 0.5;
+    return phase;
+}
+
 } // namespace
 
 Figure walkingRight(int number) {
-    const double phase = (number - 2) / LoopPictures;
+    const Phase phase = phaseOf(number);
     const double size = number == 1 ? 0.5 : 1;
     Figure figure;
-    // Lowest just after a contact, highest when one leg passes the other.
-    const double rise = 1.4 * std::cos(4 * std::numbers::pi * (phase - 0.27));
     figure.turn = 1;
-    figure.pelvis = {BodyX, 82 - rise};
-    figure.neck = {BodyX + 3, 50 - rise};
-    figure.head.eyeCell = {BodyX + 1, std::round(17 - rise)};
-    figure.head.mouthCell = {BodyX + 5, std::round(34 - rise)};
-    figure.head.turn = 1.5;
-    figure.head.capSwing = 22 + 14 * wave(2 * phase - 0.1);
-    figure.tails = 6 + 4 * wave(2 * phase - 0.2);
-    figure.legs = {stepping(phase + 0.5, size), stepping(phase, size)};
-    figure.arms = {swinging(phase, figure, size), swinging(phase + 0.5, figure, size)};
+    figure.pelvis = {BodyX, 82 - phase.rise};
+    figure.neck = {BodyX + 4, 50 - phase.rise};
+    figure.twist = size * (phase.nearArm - phase.farArm);
+    figure.tails = phase.tails;
+    placeHead(figure.head, phase, phase.rise);
+    figure.legs = {stepping(phase.far, size), stepping(phase.near, size)};
+    figure.arms = {swinging(shoulder(figure, 0), size * phase.farArm),
+                   swinging(shoulder(figure, 1), size * phase.nearArm)};
     figure.arms[0].behind = true;
+    for (std::size_t which = 0; which < 2; ++which) {
+        Leg& leg = figure.legs[which];
+        leg.slack = std::max(0.004, LegLength / distance(hip(figure, which), leg.ankle) - 1);
+    }
     return figure;
 }
 

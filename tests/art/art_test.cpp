@@ -301,15 +301,31 @@ TEST(Art, FiguresHaveNoHolesAndStandOnOneLine) {
                                        [](std::uint32_t pixel) { return pixel != Black; });
         EXPECT_EQ((figure.pixels.rend() - last - 1) / 130, 127) << "the row of the soles";
     }
-    // In each of these pairs the same foot stands flat, and he gets on by 18 pixels.
-    const auto heel = [](const std::string& name) {
-        const Bitmap figure = load(name);
-        const auto sole = figure.pixels.begin() + 127 * 130;
-        const auto isHis = [](std::uint32_t pixel) { return pixel != Black; };
-        return static_cast<int>(std::find_if(sole, sole + 130, isHis) - sole);
+}
+
+TEST(Art, AFootThatStandsStaysWhereItIsWhileHeGetsOn) {
+    // Pairs of pictures in which the same foot stands, the second time as the hind one, and
+    // whether its heel or its toe is on the ground in both.
+    const std::tuple<int, int, bool> pairs[] = {{2, 3, false}, {3, 4, true}, {4, 5, true},
+                                                {5, 6, false}, {6, 7, true}, {7, 8, true}};
+    const auto sole = [](int number) {
+        const Bitmap figure = load("fdl2r" + std::to_string(number));
+        std::string row;
+        for (int x = 0; x < figure.width; ++x) {
+            row += figure.at(x, 127) == Black ? ' ' : '#';
+        }
+        return row;
     };
-    EXPECT_NEAR(heel("fdl2r3") - 18, heel("fdl2r4"), 1);
-    EXPECT_NEAR(heel("fdl2r6") - 18, heel("fdl2r7"), 1);
+    for (const auto& [number, next, toe] : pairs) {
+        SCOPED_TRACE(number);
+        const std::string before = sole(number);
+        const std::string after = sole(next);
+        const std::size_t last = before.rfind('#');
+        const std::size_t first = after.find('#');
+        const int from = static_cast<int>(toe ? last : before.rfind(' ', last) + 1);
+        const int to = static_cast<int>(toe ? after.find(' ', first) - 1 : first);
+        EXPECT_NEAR(from - 18, to, 2);
+    }
 }
 
 TEST(Art, HeWalksAndTurnsToTheLeftAsToTheRight) {
