@@ -44,6 +44,7 @@ const std::vector<Outline> ShadeRight = {
 
 Outline rim() {
     std::vector<Point> through;
+    through.reserve(Balloon.size());
     for (const Stroke& stroke : Balloon) {
         through.push_back(stroke.at);
     }
@@ -53,6 +54,7 @@ Outline rim() {
 // The rim moved outwards by the thickness of the line.
 Outline outerRim() {
     std::vector<Point> lines;
+    lines.reserve(Balloon.size());
     for (const Stroke& stroke : Balloon) {
         lines.push_back({stroke.line, 0});
     }

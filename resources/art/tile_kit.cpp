@@ -22,8 +22,9 @@ constexpr int Samples = 4;
 Shade sampled(const std::function<Shade(double x, double y)>& paint, int x, int y) {
     Shade sum;
     for (int i = 0; i < Samples * Samples; ++i) {
-        const Shade shade =
-            paint(x + (i % Samples + 0.5) / Samples, y + (i / Samples + 0.5) / Samples);
+        const int column = i % Samples;
+        const int row = i / Samples;
+        const Shade shade = paint(x + (column + 0.5) / Samples, y + (row + 0.5) / Samples);
         sum = {sum.red + shade.red, sum.green + shade.green, sum.blue + shade.blue};
     }
     return mix({}, sum, 1.0 / (Samples * Samples));
@@ -153,6 +154,7 @@ Tile paintedTile(int size, const std::function<Shade(double x, double y)>& paint
     // A screen or a film of 256 colours has to find room for the figure's beside them.
     constexpr std::size_t Painted = 224;
     std::vector<Shade> shades;
+    shades.reserve(static_cast<std::size_t>(size * size));
     for (int i = 0; i < size * size; ++i) {
         shades.push_back(sampled(paint, i % size, i / size));
     }
