@@ -2,12 +2,25 @@
 
 #include "resources/art/poses.h"
 
+#include <array>
+
 namespace art {
 
 namespace {
 
 constexpr int Columns = 5;
 constexpr int Pitch = CellSize + 1;
+
+// The two shapes of the mouth in which he talks in each pose, so that his mood lasts.
+constexpr std::array<std::array<Mouth, 2>, PoseCount> TalkingMouths = {
+    {{Mouth::Open, Mouth::Round},
+     {Mouth::Yell, Mouth::Peep},
+     {Mouth::Open, Mouth::Round},
+     {Mouth::Open, Mouth::Round},
+     {Mouth::Laugh, Mouth::Open},
+     {Mouth::Mumble, Mouth::Mutter},
+     {Mouth::Roar, Mouth::Grin},
+     {Mouth::Purse, Mouth::Hush}}};
 
 void copyCell(Picture& sheet, int column, int number, const Picture& figure, Point corner) {
     for (int y = 0; y < CellSize; ++y) {
@@ -33,12 +46,13 @@ void drawRow(Picture& sheet, int number) {
     const Point mouth = MouthCells[static_cast<std::size_t>(number)];
     const Figure figure = pose(number);
     const Picture plain = drawFigure(figure);
-    const Picture talking = drawFace(number, Eyes::Shut, Mouth::Open);
-    const Picture amazed = drawFace(number, figure.head.eyes, Mouth::Round);
+    const auto& mouths = TalkingMouths[static_cast<std::size_t>(number)];
+    const Picture talking = drawFace(number, Eyes::Shut, mouths[0]);
+    const Picture other = drawFace(number, figure.head.eyes, mouths[1]);
     copyCell(sheet, 0, number, talking, eyes);
     copyCell(sheet, 1, number, plain, eyes);
     copyCell(sheet, 2, number, talking, mouth);
-    copyCell(sheet, 3, number, amazed, mouth);
+    copyCell(sheet, 3, number, other, mouth);
     copyCell(sheet, 4, number, plain, mouth);
 }
 

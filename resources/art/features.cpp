@@ -4,7 +4,9 @@
 #include "resources/art/wardrobe.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
+#include <cstddef>
 #include <string>
 #include <utility>
 #include <vector>
@@ -74,27 +76,28 @@ Rows browRows(Brows brows) {
     return {};
 }
 
-Rows mouthRows(Mouth mouth) {
-    switch (mouth) {
-    case Mouth::Smile:
-        return {" b      b ", "  bb  bb  ", "    bb    "};
-    case Mouth::Open:
-        return {" bbbbbbbb ", "  brrrrb  ", "  brRRrb  ", "   bbbb   "};
-    case Mouth::Round:
-        return {"    bb    ", "   brrb   ", "   brrb   ", "   bRRb   ", "    bb    "};
-    case Mouth::Grin:
-        return {" bbbbbbbb ", " bWWWWWWb ", "  bWWWWb  ", "   bbbb   "};
-    case Mouth::Laugh:
-        return {" bbbbbbbb ", " bWWWWWWb ", " brrrrrrb ", "  brRRrb  ", "   bbbb   "};
-    case Mouth::Gasp:
-        return {"   bbbb   ", "  brrrrb  ", "  brrrrb  ", "  brRRrb  ", "   bbbb   "};
-    case Mouth::Whisper:
-        return {"          ", "    bbb   ", "   brrrb  ", "    bbb   "};
-    case Mouth::Musing:
-        return {"          ", "      bb  ", "  bbbb    "};
-    }
-    return {};
-}
+// The rows inside of the mouth's cell. Its rim stays free, and so do the first rows, where the nose
+// may reach in.
+using MouthRows = std::array<const char*, 6>;
+
+// In the order of the mouths.
+constexpr MouthRows Mouths[] = {
+    {"          ", " b      b ", "  bb  bb  ", "    bb    ", "          ", "          "}, // Smile
+    {"          ", " bbbbbbbb ", "  brrrrb  ", "  brRRrb  ", "   bbbb   ", "          "}, // Open
+    {"          ", "    bb    ", "   brrb   ", "   brrb   ", "   bRRb   ", "    bb    "}, // Round
+    {"          ", " bbbbbbbb ", " bWWWWWWb ", "  bWWWWb  ", "   bbbb   ", "          "}, // Grin
+    {"          ", " bbbbbbbb ", " bWWWWWWb ", " brrrrrrb ", "  brRRrb  ", "   bbbb   "}, // Laugh
+    {" bbbbbbbb ", " bWWWWWWb ", " brrrrrrb ", " brrrrrrb ", " brRRRRrb ", "  bbbbbb  "}, // Roar
+    {"          ", "   bbbb   ", "  brrrrb  ", "  brrrrb  ", "  brRRrb  ", "   bbbb   "}, // Gasp
+    {"   bbbb   ", "  brrrrb  ", " brrrrrrb ", " brrrrrrb ", "  brRRrb  ", "   bbbb   "}, // Yell
+    {"          ", "          ", "    bb    ", "   brrb   ", "   brrb   ", "    bb    "}, // Peep
+    {"          ", "          ", "    bbb   ", "   brrrb  ", "    bbb   ", "          "}, // Whisper
+    {"          ", "          ", "     bb   ", "    brrb  ", "    brrb  ", "     bb   "}, // Purse
+    {"          ", "          ", "          ", "    bbbb  ", "     bb   ", "          "}, // Hush
+    {"          ", "          ", "      bb  ", "  bbbb    ", "          ", "          "}, // Musing
+    {"          ", "          ", "     bbb  ", "  bbbrrb  ", "    bbb   ", "          "}, // Mumble
+    {"          ", "          ", "   bbb    ", "   brrbb  ", "    bb    ", "          "}, // Mutter
+};
 
 void stampFacing(Picture& picture, Point corner, double side, Rows rows) {
     for (std::string& row : rows) {
@@ -116,7 +119,8 @@ void paintFeatures(Picture& picture, const Head& head) {
     }
     stampFacing(picture, head.eyeCell + Point{0, 3}, side, std::move(eyes));
     stampFacing(picture, head.eyeCell, side, browRows(head.brows));
-    stampFacing(picture, head.mouthCell + Point{0, 4}, side, mouthRows(head.mouth));
+    const MouthRows& mouth = Mouths[static_cast<std::size_t>(head.mouth)];
+    stampFacing(picture, head.mouthCell + Point{0, 3}, side, Rows(mouth.begin(), mouth.end()));
 }
 
 } // namespace art

@@ -46,6 +46,10 @@ Glove glove(Grip grip) {
             {ellipse({5, 0}, 5.4, 5.4), bone({7, -3}, {12.5, -3.2}, 2.4, 2.2),
              bone({7, 0}, {14.5, 0}, 2.5, 2.3), bone({7, 3}, {12.5, 3.4}, 2.4, 2.2)},
             {crease({9, -1.6}, {13, -1.7}), crease({9, 1.6}, {13, 1.7}), crease({4, 3}, {7.5, 4})}};
+    case Grip::Screen:
+        return {{ellipse({5, 0}, 5.4, 4.6), bone({6, -1.6}, {15, -1}, 2.8, 2.4),
+                 bone({6, 1}, {13, 1.4}, 2.8, 2.2), bone({3.5, 2.5}, {7.5, 5.4}, 2.2, 1.9)},
+                {}};
     }
     return {};
 }
@@ -63,8 +67,10 @@ Outlines placed(Outlines outlines, Point at, double degrees, double flip) {
 
 void paintHand(Picture& picture, Grip grip, Point wrist, double angle, int thumb) {
     Glove hand = glove(grip);
+    // The shade of a broad hand would take all of a single finger.
+    const int shadow = grip == Grip::Pointing ? 1 : 2;
     const Part outside = {placed(std::move(hand.outside), wrist, angle, thumb), Linen, LinenShade,
-                          2};
+                          shadow};
     const Mask inside = paintOutlined(picture, outside, Line);
     if (!hand.creases.empty()) {
         const Part creases = {placed(std::move(hand.creases), wrist, angle, thumb), Line, Line, 0};

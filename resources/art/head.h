@@ -7,7 +7,23 @@
 namespace art {
 
 enum class Eyes { Open, Shut, Wide, Merry, Aside };
-enum class Mouth { Smile, Open, Round, Grin, Laugh, Gasp, Whisper, Musing };
+enum class Mouth {
+    Smile,
+    Open,
+    Round,
+    Grin,
+    Laugh,
+    Roar,
+    Gasp,
+    Yell,
+    Peep,
+    Whisper,
+    Purse,
+    Hush,
+    Musing,
+    Mumble,
+    Mutter
+};
 enum class Brows { Level, Raised, High, OneUp, Worried };
 
 constexpr int CellSize = 10;

@@ -37,11 +37,14 @@ void startle(Figure& figure) {
     figure.head.brows = Brows::High;
     figure.head.eyes = Eyes::Wide;
     figure.head.mouth = Mouth::Gasp;
-    figure.head.capSwing = 22;
+    figure.head.capSwing = 27;
     figure.shoulderLift = 4;
     figure.pelvis.x = 66;
-    figure.arms[0] = {{29, 43}, -112, Grip::Open, -1, 1, false, 0.35};
-    figure.arms[1] = {{104, 43}, -68, Grip::Open, 1, -1, false, 0.35};
+    // Higher than the bubble's tail and nearer than its body, which hides one of them otherwise.
+    figure.arms[0] = {{37, 36}, -97, Grip::Open, -1, 1};
+    figure.arms[0].elbow = {{32, 54}};
+    figure.arms[1] = {{93, 33}, -78, Grip::Open, 1, -1};
+    figure.arms[1].elbow = {{98, 52}};
     figure.legs = {Leg{{46, Ground - 6}, 0, -0.9, -1, 0.04},
                    Leg{{88, Ground - 6}, 0, 0.9, 1, 0.03}};
 }
@@ -64,8 +67,11 @@ void point(Figure& figure) {
 void embrace(Figure& figure) {
     figure.head.brows = Brows::Raised;
     figure.head.mouth = Mouth::Grin;
-    figure.arms[0] = {{24, 46}, 215, Grip::Open, -1, 1, false, 0.04};
-    figure.arms[1] = {{102, 46}, -35, Grip::Open, 1, -1, false, 0.04};
+    // Low enough that the bubble leaves both hands free.
+    figure.arms[0] = {{25, 86}, 176, Grip::Open, -1, 1};
+    figure.arms[0].elbow = {{37, 75}};
+    figure.arms[1] = {{100, 86}, 4, Grip::Open, 1, -1};
+    figure.arms[1].elbow = {{88, 75}};
     figure.legs = {planted(48, -0.8), planted(77, 0.8)};
 }
 
@@ -73,8 +79,8 @@ void think(Figure& figure) {
     figure.head.brows = Brows::OneUp;
     figure.head.mouth = Mouth::Musing;
     figure.pelvis.x = 64;
-    figure.arms[0] = {{53, 62}, -62, Grip::Pointing, 1, -1};
-    figure.arms[0].elbow = {{37, 76}};
+    figure.arms[0] = {{55, 58}, -66, Grip::Pointing, 1, -1};
+    figure.arms[0].elbow = {{37, 75}};
     figure.arms[1] = {{56, 82}, 190, Grip::Flat, -1, 1, false, 0.6};
     figure.arms[1].elbow = {{82, 78}};
     figure.legs = {planted(52, -0.9), planted(74, 0.7)};
@@ -95,16 +101,17 @@ void laugh(Figure& figure) {
     figure.legs = {Leg{{54, Ground - 6}, 0, -0.9, 1, 0.1}, Leg{{88, Ground - 6}, 0, 1, -1, 0.06}};
 }
 
+// He leans over to whoever listens on the left and screens his mouth from the others.
 void whisper(Figure& figure) {
-    figure.head.turn = 0.5;
+    figure.head.turn = -0.5;
     figure.head.brows = Brows::OneUp;
     figure.head.eyes = Eyes::Aside;
     figure.head.mouth = Mouth::Whisper;
-    figure.pelvis = {50, 85};
-    figure.arms[0] = {{51, 50}, -72, Grip::Flat, 1, -1};
-    figure.arms[0].elbow = {{34, 62}};
-    figure.arms[1] = {{66, 82}, 180, Grip::Relaxed, -1, 1, true, 0.3};
-    figure.legs = {planted(36, -0.9), Leg{{66, Ground - 6}, 0, 1, -1, 0.1}};
+    figure.pelvis = {82, 85};
+    figure.arms[0] = {{70, 82}, 20, Grip::Relaxed, 1, 1, true, 0.3};
+    figure.arms[1] = {{82, 50}, -106, Grip::Screen, -1, -1};
+    figure.arms[1].elbow = {{101, 64}};
+    figure.legs = {Leg{{68, Ground - 6}, 0, -1, 1, 0.1}, planted(96, 0.9)};
 }
 
 // An arm that hangs at ease, the hand as far from the shoulder as told.
