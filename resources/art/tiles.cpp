@@ -20,8 +20,8 @@ constexpr double Turn = 2 * std::numbers::pi;
 
 // Is the place, seen from the middle of a print that points to the right, on the sole or the heel?
 bool onPrint(Point place) {
-    const double sole = std::hypot((place.x - 1.9) / 3.7, place.y / (2.1 + 0.14 * place.x));
-    const double heel = std::hypot((place.x + 4.2) / 1.7, place.y / 1.8);
+    const double sole = std::hypot((place.x - 1.9) / 4.3, place.y / (2.4 + 0.14 * place.x));
+    const double heel = std::hypot((place.x + 5) / 2, place.y / 2.1);
     return std::min(sole, heel) < 1;
 }
 
@@ -32,7 +32,8 @@ void addPrint(Picture& picture, Point centre, double heading) {
             const Point gap = {shortestWay(centre.x, x + 0.5, size),
                                shortestWay(centre.y, y + 0.5, size)};
             if (onPrint(turned(gap, -heading))) {
-                picture.set(x, y, LightGrey);
+                // Every second pixel, so that the grey is as soft as the other tiles.
+                picture.set(x, y, (x + y) % 2 == 0 ? LightGrey : White);
             }
         }
     }
@@ -42,12 +43,14 @@ Tile footprints() {
     constexpr int Size = 135;
     constexpr int Steps = 8;
     Tile tile{Picture(Size, Size, White), {SixteenColours.begin(), SixteenColours.end()}};
+    // Up to the right and out at the top, where the next tile's trail goes on.
     for (int i = 0; i < Steps; ++i) {
-        const double phase = Turn * (i + 0.3) / Steps;
-        const double side = i % 2 == 0 ? 1 : -1;
-        const Point way = {Size * phase / Turn, 68 + 16 * std::sin(phase)};
-        const double heading = 37 * std::cos(phase);
-        addPrint(tile.picture, way + turned({0, 5 * side}, heading), heading + 7 * side);
+        const double share = (i + 0.5) / Steps;
+        const double heading = -45 + 20 * std::cos(Turn * share);
+        const double side = i % 2 == 0 ? 5 : -5;
+        const Point sway = turned({0, 11 * std::sin(Turn * share)}, -45);
+        const Point way = Point{share, 1.35 - share} * Size + sway;
+        addPrint(tile.picture, way + turned({0, side}, heading), heading + 1.4 * side);
     }
     return tile;
 }
@@ -64,10 +67,10 @@ double chipEdge(Point place, double radius, int sides, double turn) {
 
 Tile terrazzo() {
     constexpr int Size = 96;
-    constexpr int Chips = 90;
+    constexpr int Chips = 60;
     constexpr Shade Ground = {241, 236, 224};
     const std::array<Shade, 5> stones = {
-        {{224, 190, 172}, {190, 204, 210}, {232, 212, 168}, {196, 206, 182}, {250, 247, 240}}};
+        {{233, 212, 198}, {214, 221, 220}, {236, 221, 193}, {217, 222, 204}, {249, 246, 239}}};
     const auto middles = strewn(Size, Chips, 3);
     return paintedTile(Size, [=](double x, double y) {
         Shade shade = lit(Ground, 6 * (clouds(x, y, Size, 16, 2, 5) - 0.5));
@@ -96,7 +99,7 @@ Tile raindrops() {
         Shade shade = lit({198, 218, 238}, 6 * mist);
         for (int i = 0; i < Drops; ++i) {
             const auto& middle = middles[static_cast<std::size_t>(i)];
-            const double radius = i % 5 == 0 ? 4.2 - 0.06 * i : 1.4 + 1.2 * chance(i, 1, 23);
+            const double radius = 1.2 + 1.9 * chance(i, 1, 23);
             const Point own =
                 Point{shortestWay(middle[0], x, Size), shortestWay(middle[1], y, Size)} *
                 (1 / radius);
@@ -153,9 +156,9 @@ Tile shingles() {
                 const double own =
                     chance((column + Columns) % Columns, (row + Rows) % Rows, 51) - 0.5;
                 const double moss = clouds(x, y, Size, 8, 2, 52) - 0.5;
-                const Shade green = mix({206, 226, 196}, {190, 214, 188}, 0.5 + own);
-                const double lip = rim - down < 1.2 ? 14 : 0;
-                return lit(green, (down - 14) * 1.3 + 14 * moss + lip - across * 0.25);
+                const Shade green = mix({203, 224, 195}, {195, 218, 190}, 0.5 + 0.7 * own);
+                const double lip = rim - down < 1.2 ? 7 : 0;
+                return lit(green, (down - 14) * 0.9 + 9 * moss + lip - across * 0.25);
             }
         }
     });
@@ -166,7 +169,7 @@ Tile shingles() {
 Tile petals() {
     constexpr int Size = 96;
     constexpr int Petals = 26;
-    const std::array<Shade, 3> tints = {{{252, 237, 236}, {240, 199, 206}, {247, 208, 204}}};
+    const std::array<Shade, 3> tints = {{{249, 227, 228}, {240, 203, 209}, {246, 209, 207}}};
     const auto middles = strewn(Size, Petals, 41);
     return paintedTile(Size, [=](double x, double y) {
         Shade shade = lit({245, 217, 220}, 6 * (clouds(x, y, Size, 12, 2, 43) - 0.5));
