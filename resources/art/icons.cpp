@@ -15,10 +15,10 @@ namespace {
 Picture drawSmallest() {
     Picture picture(16, 16);
     stamp(picture, 0, 0,
-          {"    bbbbbbb     ", "  bbCCcccccbb   ", " bCCccccccccbb  ", "bCCcbbbbbbbbbbb ",
-           "bccbYYYYYYYYYYyb", "bbbbbbbbbbbbbbb ", "bRRbWWWbWWWb    ", "bRRbWWbbWWbb    ",
-           " bbsWWbbWWbbbb  ", "  bssbbsbbYYYYb ", "  bssssssbWWYYYb", "  bsRssssbYYYYRb",
-           "  bssbssssbRRRb ", "   bssbbbbbbbb  ", "   bsssssssbb   ", "    bbbbbbbb    "},
+          {"    bbbbbbb     ", "  bbCCCCcccbb   ", " bCCCCCCcccccb  ", "bCCCbbbbbbbbbbb ",
+           "bCcbYYYYYYYYYYyb", "bbbbbbbbbbbbbbb ", "bRRbWWWbWWWb    ", "bRRbWWbbWWbb    ",
+           " bbYWWbbWWbbbb  ", "  bYYbbYbbYYYYb ", "  bYYYYYYbWWYYYb", "  bYRYYYYbYYYYRb",
+           "  bYYbYYYbbRRRb ", "   bYYbbbbbbbb  ", "   bbYYYYYYbb   ", "     bbbbbb     "},
           Skin);
     return picture;
 }
