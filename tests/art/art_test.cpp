@@ -1,14 +1,13 @@
-// The pictures: what the program takes for granted about them, and that the drawing program still
-// draws them.
+// The pictures round him: what the program takes for granted about them, and that the drawing
+// program still draws all of its files.
 
 #include "resources/art/gallery.h"
 #include "resources/art/icons.h"
-#include "resources/art/poses.h"
+#include "tests/art/bitmap.h"
 
 #include <algorithm>
 #include <cstdint>
 #include <cstdlib>
-#include <fstream>
 #include <gtest/gtest.h>
 #include <iterator>
 #include <png.h>
@@ -19,110 +18,10 @@
 
 namespace {
 
-using Bytes = std::vector<std::uint8_t>;
-
-constexpr std::uint32_t Black = 0;
-constexpr std::uint32_t White = 0xFFFFFF;
-
-struct Bitmap {
-    std::string name;
-    int width = 0;
-    int height = 0;
-    std::uint32_t bits = 0;
-    std::vector<std::uint32_t> colours;
-    std::vector<std::uint32_t> pixels; // as colours
-
-    std::uint32_t at(int x, int y) const {
-        return pixels.at(static_cast<std::size_t>(y * width + x));
-    }
-};
-
-Bytes readFile(const std::string& name) {
-    std::ifstream file(DORBO_SOURCE_DIR "/resources/" + name, std::ios::binary);
-    return Bytes(std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>());
-}
-
-Bytes readBitmap(const std::string& name) {
-    return readFile("bitmaps/" + name + ".bmp");
-}
-
-std::uint32_t number(const Bytes& bytes, std::size_t at) {
-    return bytes.at(at) + bytes.at(at + 1) * 256U + bytes.at(at + 2) * 65536U;
-}
-
-Bitmap load(const std::string& name) {
-    const Bytes bytes = readBitmap(name);
-    Bitmap bitmap{name,
-                  static_cast<int>(number(bytes, 18)),
-                  static_cast<int>(number(bytes, 22)),
-                  bytes.at(28),
-                  {},
-                  {}};
-    const std::size_t start = number(bytes, 10);
-    for (std::size_t at = 54; at < start; at += 4) {
-        bitmap.colours.push_back(number(bytes, at));
-    }
-    const auto width = static_cast<std::uint32_t>(bitmap.width);
-    const std::uint32_t row = (width * bitmap.bits + 31) / 32 * 4;
-    for (int y = bitmap.height - 1; y >= 0; --y) {
-        for (std::uint32_t bit = 0; bit < width * bitmap.bits; bit += bitmap.bits) {
-            const int byte = bytes.at(start + static_cast<std::uint32_t>(y) * row + bit / 8);
-            const int nibble = bit % 8 == 0 ? byte / 16 : byte % 16;
-            const int index = bitmap.bits == 8 ? byte : nibble;
-            bitmap.pixels.push_back(bitmap.colours.at(static_cast<std::size_t>(index)));
-        }
-    }
-    return bitmap;
-}
-
-std::vector<Bitmap> series(const std::string& stem, int count) {
-    std::vector<Bitmap> bitmaps;
-    for (int i = 1; i <= count; ++i) {
-        bitmaps.push_back(load(stem + std::to_string(i)));
-    }
-    return bitmaps;
-}
-
-std::vector<Bitmap> figures() {
-    std::vector<Bitmap> all = series("pose0", art::PoseCount);
-    for (const auto& [stem, count] :
-         {std::pair{"fdl2r", 8}, {"fdr2l", 8}, {"fdltn", 2}, {"fdrtn", 2}}) {
-        std::ranges::move(series(stem, count), std::back_inserter(all));
-    }
-    return all;
-}
-
 std::vector<Bitmap> tiles() {
     std::vector<Bitmap> all = series("bg0", 9);
     all.push_back(load("bg10"));
     return all;
-}
-
-/// The size of the smallest black area that doesn't reach the picture's edge.
-std::size_t smallestHole(const Bitmap& bitmap) {
-    std::vector<std::uint32_t> left = bitmap.pixels;
-    std::size_t smallest = left.size();
-    for (int start = 0; start < std::ssize(left); ++start) {
-        std::vector<int> area = {start};
-        std::size_t found = 0;
-        bool open = false;
-        while (!area.empty()) {
-            const int at = area.back();
-            area.pop_back();
-            if (std::exchange(left[static_cast<std::size_t>(at)], White) == Black) {
-                const bool edges[] = {at % bitmap.width == 0, (at + 1) % bitmap.width == 0,
-                                      at < bitmap.width, at + bitmap.width >= std::ssize(left)};
-                const int steps[] = {-1, 1, -bitmap.width, bitmap.width};
-                for (std::size_t i = 0; i < std::size(steps); ++i) {
-                    open = open || edges[i];
-                    area.push_back(edges[i] ? at : at + steps[i]);
-                }
-                ++found;
-            }
-        }
-        smallest = found == 0 || open ? smallest : std::min(smallest, found);
-    }
-    return smallest;
 }
 
 /// An icon, with black for the pixels that aren't solid.
@@ -149,22 +48,6 @@ Bitmap loadIcon(int size) {
         }
     }
     return icon;
-}
-
-/// How many pixels of a face cell differ from the picture that it is stamped on: all, or those on
-/// the cell's rim.
-int differences(const Bitmap& sheet, int expression, int pose, const Bitmap& picture,
-                art::Point corner, bool rimOnly = false) {
-    int count = 0;
-    for (int i = 0; i < 100; ++i) {
-        const int x = i % 10;
-        const int y = i / 10;
-        const bool counts = !rimOnly || x == 0 || x == 9 || y == 0 || y == 9;
-        count += counts &&
-                 sheet.at((expression - 1) * 11 + x, pose * 11 + y) !=
-                     picture.at(static_cast<int>(corner.x) + x, static_cast<int>(corner.y) + y);
-    }
-    return count;
 }
 
 int brightness(std::uint32_t colour) {
@@ -294,77 +177,6 @@ TEST(Art, TargetIsARingAndADotThatShowsOnAnyGround) {
         row += white ? 'W' : clear ? '.' : 'B';
     }
     EXPECT_EQ(row, ".....WBBW.....WBBBW.....WBBW....");
-}
-
-TEST(Art, FiguresHaveNoHolesAndStandOnOneLine) {
-    for (const Bitmap& figure : figures()) {
-        SCOPED_TRACE(figure.name);
-        // Between an arm and the trunk the stage may show through, but nothing smaller.
-        EXPECT_GE(smallestHole(figure), 13U);
-        EXPECT_EQ(figure.at(0, 0) | figure.at(129, 0), Black);
-        const auto last = std::find_if(figure.pixels.rbegin(), figure.pixels.rend(),
-                                       [](std::uint32_t pixel) { return pixel != Black; });
-        EXPECT_EQ((figure.pixels.rend() - last - 1) / 130, 127) << "the row of the soles";
-    }
-}
-
-TEST(Art, AFootThatStandsStaysWhereItIsWhileHeGetsOn) {
-    // Pairs of pictures in which the same foot stands, the second time as the hind one, and
-    // whether its heel or its toe is on the ground in both.
-    const std::tuple<int, int, bool> pairs[] = {{2, 3, false}, {3, 4, true}, {4, 5, true},
-                                                {5, 6, false}, {6, 7, true}, {7, 8, true}};
-    const auto sole = [](int number) {
-        const Bitmap figure = load("fdl2r" + std::to_string(number));
-        std::string row;
-        for (int x = 0; x < figure.width; ++x) {
-            row += figure.at(x, 127) == Black ? ' ' : '#';
-        }
-        return row;
-    };
-    for (const auto& [number, next, toe] : pairs) {
-        SCOPED_TRACE(number);
-        const std::string before = sole(number);
-        const std::string after = sole(next);
-        const std::size_t last = before.rfind('#');
-        const std::size_t first = after.find('#');
-        const int from = static_cast<int>(toe ? last : before.rfind(' ', last) + 1);
-        const int to = static_cast<int>(toe ? after.find(' ', first) - 1 : first);
-        EXPECT_NEAR(from - 18, to, 2);
-    }
-}
-
-TEST(Art, HeWalksAndTurnsToTheLeftAsToTheRight) {
-    std::vector<Bitmap> rights = series("fdl2r", 8);
-    std::vector<Bitmap> lefts = series("fdr2l", 8);
-    std::ranges::move(series("fdltn", 2), std::back_inserter(rights));
-    std::ranges::move(series("fdrtn", 2), std::back_inserter(lefts));
-    for (std::size_t number = 0; number < rights.size(); ++number) {
-        int differing = 0;
-        for (int i = 0; i < 130 * 130; ++i) {
-            const bool his = rights[number].at(i % 130, i / 130) != Black;
-            differing += his != (lefts[number].at(129 - i % 130, i / 130) != Black);
-        }
-        EXPECT_LT(differing, 20) << "another outline in " << lefts[number].name;
-    }
-}
-
-TEST(Art, FacesFitThePoses) {
-    const Bitmap sheet = load("expresns");
-    for (int pose = 0; pose < art::PoseCount; ++pose) {
-        SCOPED_TRACE(pose);
-        const Bitmap picture = load("pose0" + std::to_string(pose + 1));
-        const art::Point eyes = art::EyeCells[static_cast<std::size_t>(pose)];
-        const art::Point mouth = art::MouthCells[static_cast<std::size_t>(pose)];
-        EXPECT_LE(differences(sheet, 2, pose, picture, eyes), 3);
-        EXPECT_LE(differences(sheet, 5, pose, picture, mouth), 3);
-        // Shut eyes cover all of the open ones; where he laughs, they are slits.
-        EXPECT_GE(differences(sheet, 1, pose, picture, eyes), 10);
-        for (const int expression : {3, 4}) {
-            EXPECT_GE(differences(sheet, expression, pose, picture, mouth), 4) << expression;
-            // No edge of a stamp shows on his face.
-            EXPECT_EQ(differences(sheet, expression, pose, picture, mouth, true), 0) << expression;
-        }
-    }
 }
 
 TEST(Art, BubblesAreWhiteForTheirTextAndHaveTheirTailsFiftyRowsDown) {
