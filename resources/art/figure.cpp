@@ -18,6 +18,7 @@ constexpr double UpperArm = 19;
 constexpr double LowerArm = 18;
 constexpr double Thigh = 24.5;
 constexpr double Shin = 23.5;
+constexpr double ThighRadius = 7;
 
 // Places on the trunk: `down` goes from 0 at the neck to 1 at the pelvis, `aside` is in pixels to
 // the right.
@@ -53,17 +54,51 @@ std::vector<Point> coatFront(double lift) {
             {-15, 0.95}, {-13.5, 0.5},     {-14, 0.14 - lift}, {-9, 0.02 - lift}};
 }
 
+Point knee(const Figure& figure, std::size_t which) {
+    const Leg& leg = figure.legs[which];
+    const Point root = hip(figure, which);
+    const double seen = distance(root, leg.ankle) * (1 + leg.slack) / (Thigh + Shin);
+    const double scale = std::min(seen, 1.0);
+    return joint(root, leg.ankle, Thigh * scale, Shin * scale, leg.bend);
+}
+
+// How far the coat's hem is from his middle on one side, so that it lies over the thighs.
+double hemAside(const Figure& figure, double side) {
+    const double down = figure.pelvis.y + 5;
+    double aside = 10;
+    for (std::size_t which = 0; which < 2; ++which) {
+        const Point root = hip(figure, which);
+        const Point bent = knee(figure, which);
+        const double share = (down - root.y) / std::max(bent.y - root.y, 1.0);
+        const Point middle = mix(root, bent, std::clamp(share, 0.0, 1.0));
+        aside = std::max(aside, (middle.x - figure.pelvis.x) * side + ThighRadius + 1);
+    }
+    return std::min(aside, 15.0);
+}
+
 // Looking right: the chest is out, the small of the back is in.
-std::vector<Point> coatSide() {
-    return {{0, -0.04}, {6, 0.0},    {10.5, 0.16}, {12.2, 0.45}, {12, 0.9},    {11, 1.12},
-            {0, 1.15},  {-10, 1.12}, {-10, 0.9},   {-9, 0.55},   {-10.2, 0.2}, {-6, 0.0}};
+std::vector<Point> coatSide(double front, double back) {
+    return {{0, -0.04},
+            {6, 0.0},
+            {10.5, 0.16},
+            {12.2, 0.45},
+            {(12 + front) / 2, 0.9},
+            {front, 1.14},
+            {0, 1.17},
+            {-back, 1.14},
+            {-(10 + back) / 2, 0.9},
+            {-9, 0.55},
+            {-10.2, 0.2},
+            {-6, 0.0}};
 }
 
 std::vector<Outline> coatOutlines(const Figure& figure) {
     const Trunk at = trunkOf(figure);
     const double side = facing(figure);
+    const double back = std::min(hemAside(figure, -side), 11.0);
+    const auto fromSide = coatSide(hemAside(figure, side), back);
     std::vector<Point> points;
-    for (const Point& point : mix(coatFront(figure.shoulderLift / 40), coatSide(), figure.turn)) {
+    for (const Point& point : mix(coatFront(figure.shoulderLift / 40), fromSide, figure.turn)) {
         points.push_back(at(point.x * side, point.y));
     }
     return {blob(points)};
@@ -140,36 +175,12 @@ void paintShoe(Picture& picture, const Leg& leg, bool far) {
 
 void paintLeg(Picture& picture, const Figure& figure, std::size_t which) {
     const Leg& leg = figure.legs[which];
-    const Point root = hip(figure, which);
-    const double seen = distance(root, leg.ankle) * (1 + leg.slack) / (Thigh + Shin);
-    const double scale = std::min(seen, 1.0);
-    const Point knee = joint(root, leg.ankle, Thigh * scale, Shin * scale, leg.bend);
     const bool far = isFar(figure, which);
     paintShoe(picture, leg, far);
-    const Part trouser = {tube({root, knee, leg.ankle - Point{0, 1}}, 7, 4.6),
-                          far ? TrousersShade : Trousers, TrousersShade, 2,
-                          far ? TrousersShade : TrousersGlow};
+    const Part trouser = {
+        tube({hip(figure, which), knee(figure, which), leg.ankle - Point{0, 1}}, ThighRadius, 4.6),
+        far ? TrousersShade : Trousers, TrousersShade, 2, far ? TrousersShade : TrousersGlow};
     paintOutlined(picture, trouser, Line);
-}
-
-// The tails hang from the small of the back and fly out behind, their ends most.
-void paintTails(Picture& picture, const Figure& figure) {
-    const Trunk at = trunkOf(figure);
-    const double side = facing(figure);
-    const auto from = [&](Point start, double across, double down, double degrees) {
-        return start + turned({across * side, down}, degrees * side);
-    };
-    const Point top = at(-8.8 * side, 0.6);
-    const Point middle = from(top, 0, 13, figure.tails * 0.5 + 4);
-    const Point end = from(middle, 0, 13, figure.tails);
-    const Point inner = from(end, 9, 1.5, figure.tails);
-    const Part tails = {{blob({top, middle, end, from(end, 4, 2.5, figure.tails), inner,
-                               at(1 * side, 1.05), at(-2 * side, 0.6)})},
-                        Coat,
-                        CoatShade,
-                        2,
-                        CoatGlow};
-    paintOutlined(picture, tails, Line);
 }
 
 // Whether a sleeve before the coat hides a place on it.
@@ -189,14 +200,19 @@ bool underSleeve(const Figure& figure, Point place) {
 }
 
 void paintButtons(Picture& picture, const Figure& figure, double aside, const Mask& coat) {
+    std::vector<Outline> buttons;
     for (const double down : {0.32, 0.56, 0.8}) {
         const Point exact = trunkOf(figure)(aside, down);
         // On the corner of four pixels it is round in every picture.
         const Point place = {std::round(exact.x), std::round(exact.y)};
         // Half a button that looks out from under a sleeve would be dirt.
         if (figure.turn < 0.5 || !underSleeve(figure, place)) {
-            paintWithin(picture, {{ellipse(place, 2, 2)}, Brass, BrassShade, 1}, coat);
+            buttons.push_back(ellipse(place, 2, 2));
         }
+    }
+    // A single one would be a spot, not a row of buttons.
+    if (buttons.size() > 1) {
+        paintWithin(picture, {std::move(buttons), Brass, BrassShade, 1}, coat);
     }
 }
 
@@ -210,8 +226,9 @@ void paintCoat(Picture& picture, const Figure& figure) {
     paintWithin(picture, {{bone(at(seam, 0), at(seam, 1.3), 0.55, 0.55)}, CoatShade, CoatShade, 0},
                 coat);
     paintButtons(picture, figure, buttons, coat);
-    const Point collar = at(1.5 * figure.turn * facing(figure), 0.02);
-    paintOutlined(picture, {{ellipse(collar, 10 - 2 * figure.turn, 3.6)}, Linen, LinenShade, 1},
+    // From the side the nape hides its other end.
+    const Point collar = at(4 * figure.turn * facing(figure), 0.02);
+    paintOutlined(picture, {{ellipse(collar, 10 - 4 * figure.turn, 3.6)}, Linen, LinenShade, 1},
                   Line);
 }
 
@@ -221,14 +238,14 @@ Point shoulder(const Figure& figure, std::size_t which) {
     double aside = (which == 0 ? -12 : 12) * (1 - figure.turn * figure.turn);
     if (figure.turn > 0.5) {
         // The chest is turned to us a little, so the far shoulder shows in front.
-        aside = (which == 0 ? 3 - figure.twist : -2.5 + figure.twist) * facing(figure);
+        aside = (which == 0 ? 3 - figure.twist : -4 + figure.twist) * facing(figure);
     }
     return trunkOf(figure)(aside, figure.turn > 0.5 ? 0.19 : 0.16) - Point{0, figure.shoulderLift};
 }
 
 Point hip(const Figure& figure, std::size_t which) {
     const double aside = (6.5 - 5.5 * figure.turn) * facingOfLimbs(figure);
-    return figure.pelvis + Point{which == 0 ? -aside : aside, -4};
+    return figure.pelvis + Point{which == 0 ? -aside : aside, -4 + 4 * figure.turn};
 }
 
 Figure mirrored(const Figure& figure) {
@@ -271,9 +288,6 @@ Picture drawFigure(const Figure& figure) {
     const std::size_t back = halfTurned && facing(figure) > 0 ? 1 : 0;
     paintLeg(picture, figure, back);
     paintLeg(picture, figure, 1 - back);
-    if (figure.tails > 0) {
-        paintTails(picture, figure);
-    }
     paintCoat(picture, figure);
     paintHead(picture, figure.head);
     for (std::size_t which = 0; which < 2; ++which) {

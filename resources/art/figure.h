@@ -57,8 +57,6 @@ struct Figure {
     double twist = 0;
     std::array<Arm, 2> arms;
     std::array<Leg, 2> legs;
-    // How far the tails of the coat fly out behind, in degrees. Without, they aren't seen.
-    double tails = 0;
 };
 
 // Where an arm begins and a leg begins.

@@ -114,6 +114,18 @@ void whisper(Figure& figure) {
     figure.legs = {Leg{{68, Ground - 6}, 0, -1, 1, 0.1}, planted(96, 0.9)};
 }
 
+// A foot that stands on its toes only: it is about to leave the ground.
+Leg leaving(const Figure& figure, std::size_t which, Leg leg, double heelUp) {
+    const double side = leg.toe < 0 ? -1 : 1;
+    // The round tip of the shoe would dip below the ground.
+    const Point ball = {leg.ankle.x + 10 * leg.toe, Ground - 1};
+    const double length = distance(hip(figure, which), leg.ankle) * (1 + leg.slack);
+    leg.ankle = ball + turned({-10 * leg.toe, -6}, heelUp * side);
+    leg.angle = heelUp;
+    leg.slack = length / distance(hip(figure, which), leg.ankle) - 1;
+    return leg;
+}
+
 // An arm that hangs at ease, the hand as far from the shoulder as told.
 Arm hanging(const Figure& figure, std::size_t which, Point reach, double angle, int thumb) {
     Arm arm;
@@ -145,8 +157,8 @@ Figure turningRight(int number) {
     const bool half = number == 1;
     Head head;
     head.eyeCell = {half ? 59.0 : 57.0, 17};
-    head.mouthCell = {half ? 63.0 : 59.0, 33};
-    head.turn = half ? 1 : 0.5;
+    head.mouthCell = {half ? 63.0 : 58.0, 33};
+    head.turn = half ? 1 : 0.25;
     head.capSwing = half ? 10 : 4;
     Figure figure = standing(head);
     figure.turn = half ? 0.45 : 0.2;
@@ -154,13 +166,16 @@ Figure turningRight(int number) {
     figure.pelvis.x = half ? 62 : 62.5;
     figure.arms[0] = hanging(figure, 0, half ? Point{-4, 30} : Point{-5, 29.5}, 94, -1);
     figure.arms[1] =
-        hanging(figure, 1, half ? Point{6, 28} : Point{5, 29.5}, half ? 74 : 86, half ? -1 : 1);
+        hanging(figure, 1, half ? Point{8, 29} : Point{5, 29.5}, half ? 70 : 86, half ? -1 : 1);
     figure.arms[1].behind = half;
+    // He gets on by a step between the two: the right foot leaves the ground in one, the left in
+    // the other.
     if (half) {
         figure.legs = {planted(figure.pelvis.x - 11, 0.8), planted(figure.pelvis.x + 7, 0.9)};
-        figure.legs[1].ankle.y -= 1;
+        figure.legs[0] = leaving(figure, 0, figure.legs[0], 22);
     } else {
         figure.legs = {planted(figure.pelvis.x - 8, -0.55), planted(figure.pelvis.x + 8, 0.85)};
+        figure.legs[1] = leaving(figure, 1, figure.legs[1], 20);
     }
     return figure;
 }

@@ -19,7 +19,7 @@ constexpr double BallForward = 8.5;
 constexpr Point AnkleFromBall = {-13, -6};
 constexpr double HeelFromBall = 18;
 // Legs and arms keep their length, a pixel more or less, from picture to picture.
-constexpr double LegLength = 45.2;
+constexpr double LegLength = 43.5;
 constexpr double UpperArmLength = 16;
 constexpr double LowerArmLength = 15;
 
@@ -37,33 +37,28 @@ struct Step {
 struct Phase {
     Step far;
     Step near;
-    // How far the body is above its middle height.
+    // How far the body is above its middle height. Only by even steps, so that the chequered skin
+    // stays the same from picture to picture.
     double rise;
     // Where the arms are, from -1 behind him to 1 before him.
     double farArm;
     double nearArm;
-    // How far the tip of the cap and the tails of the coat fly up, in degrees.
+    // How far the tip of the cap flies up, in degrees.
     double cap;
-    double tails;
 };
 
-// A standing foot in its four pictures on the ground: it goes back as fast as he gets on.
-constexpr Step Contact = {1.5 * Advance, 0, -20};
-constexpr Step Flat = {0.5 * Advance, 0, 0};
-constexpr Step Behind = {-0.5 * Advance, 0, 8};
-constexpr Step PushOff = {-1.5 * Advance, 0, 44};
-
-// The near foot comes down in picture 2, the far one in picture 5. The body is lowest after a
-// foot has come down and highest when one leg passes the other; what is loose comes a picture
-// later.
+// Seven pictures are three and a half for each step: the near foot comes down in picture 2, the
+// far one half-way from 5 to 6. A standing foot goes back as fast as he gets on. The body is lowest
+// after a foot has come down, on a bent knee, and highest before the next does; the bobble is
+// highest a picture after the head.
 constexpr std::array<Phase, LoopPictures> Loop = {{
-    {{-28, 2, 58}, Contact, -1.5, 1, -1, 18, 14},
-    {{-9, 6, 46}, Flat, 1, 0.5, -0.5, 30, 30},
-    {{18, 5, -8}, Behind, 1.5, -0.5, 0.45, 14, 22},
-    {Contact, PushOff, -1, -0.9, 0.8, 10, 10},
-    {Flat, {-28, 2, 54}, -1, -1, 1, 24, 16},
-    {Behind, {5, 5, 26}, 1, -0.1, 0, 34, 32},
-    {PushOff, {19, 6, -8}, 1.5, 0.75, -0.9, 20, 18},
+    {{-29, 5, 56}, {1.5 * Advance, 0, -20}, -1, 0.95, -1, 28},
+    {{-19, 8, 50}, {0.5 * Advance, 0, 0}, -3, 0.5, -0.65, 20},
+    {{10, 6, 2}, {-0.5 * Advance, 0, 6}, 1, -0.85, 0.25, 16},
+    {{34, 2, -20}, {-1.5 * Advance, 0, 40}, -1, -1, 0.85, 28},
+    {{1 * Advance, 0, 0}, {-33, 7, 60}, -3, -0.85, 0.9, 20},
+    {{0 * Advance, 0, 0}, {7, 5, 10}, 1, 0.45, -0.42, 10},
+    {{-1 * Advance, 0, 22}, {23, 5, -10}, 1, 0.85, -0.8, 20},
 }};
 
 Leg stepping(const Step& step, double size) {
@@ -109,8 +104,8 @@ Phase phaseOf(int number) {
     }
     // The first step is so small that the far foot is still on the ground.
     Phase phase = Loop[0];
-    phase.far = PushOff;
-    phase.rise = 0.5;
+    phase.far = {-1.5 * Advance, 0, 40};
+    phase.rise = 1;
     return phase;
 }
 
@@ -124,7 +119,6 @@ Figure walkingRight(int number) {
     figure.pelvis = {BodyX, 82 - phase.rise};
     figure.neck = {BodyX + 4, 50 - phase.rise};
     figure.twist = size * (phase.nearArm - phase.farArm);
-    figure.tails = phase.tails;
     placeHead(figure.head, phase, phase.rise);
     figure.legs = {stepping(phase.far, size), stepping(phase.near, size)};
     figure.arms = {swinging(shoulder(figure, 0), size * phase.farArm),
