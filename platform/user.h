@@ -192,6 +192,9 @@ inline HINSTANCE WindowInstance(HWND window) {
 constexpr int GCL_HCURSOR = -12;
 DWORD SetClassLongA(HWND window, int index, LONG value); ///< the value before
 
+/// Its place on the screen, for a window of the window manager's without the frame.
+BOOL GetWindowRect(HWND window, RECT* place);
+
 BOOL GetClientRect(HWND window, RECT* area); ///< left and top are 0; also of another's window
 
 /// Says which window takes the keys that reach its top-level window; gives the one that had them,
@@ -273,13 +276,6 @@ constexpr int IDNO = 7;
 /// and paints go on, and the pointer shows. A null caption is the platform's "Error". Bytes that
 /// are valid UTF-8, as in names of files, are shown as that. 0 if it can't be shown.
 int MessageBoxA(HWND owner, const char* text, const char* caption, UINT type);
-
-using DLGPROC = LRESULT (*)(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam);
-
-/// Runs a modal dialog of the resources and gives the value that it ends with; -1 if there is no
-/// such dialog.
-LRESULT DialogBoxParamA(HINSTANCE instance, ResourceName name, HWND owner, DLGPROC procedure,
-                        LPARAM parameter);
 
 /// Runs `body` and gives its result; on an exception that nobody caught runs `handler` and gives
 /// its result.

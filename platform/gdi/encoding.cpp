@@ -41,6 +41,14 @@ QString fromWindows1252(const char* text, std::size_t length) {
     return result;
 }
 
+std::string toWindows1252(const QString& text) {
+    std::string result;
+    for (const QChar character : text) {
+        result += byteOf(character).value_or('?');
+    }
+    return result;
+}
+
 std::string utf8FromWindows1252(std::string_view text) {
     return fromWindows1252(text.data(), text.size()).toStdString();
 }

@@ -37,6 +37,10 @@ QFont makeFontOfCell(bool serif, bool bold, int cell) {
 
 } // namespace
 
+QFont dialogFont(int pixels) {
+    return makeFont(false, false, pixels);
+}
+
 const FontFace& Font::face() const {
     if (!face_) {
         const bool bold = weight_ >= boldFrom;

@@ -10,6 +10,9 @@
 
 namespace seam {
 
+/// The font of dialogs and controls, `pixels` high.
+QFont dialogFont(int pixels);
+
 /// What the toolkit makes of a font. It needs the application object.
 struct FontFace {
     QFont font;

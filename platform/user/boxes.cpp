@@ -81,12 +81,6 @@ BOOL MessageBeep(UINT /*type*/) {
     return TRUE;
 }
 
-LRESULT DialogBoxParamA(HINSTANCE /*instance*/, ResourceName /*name*/, HWND /*owner*/,
-                        DLGPROC /*procedure*/, LPARAM /*parameter*/) {
-    // The resources hold no dialog yet.
-    return -1;
-}
-
 HMENU GetMenu(HWND /*window*/) {
     return {}; // no class of the program has a menu bar
 }

@@ -2,6 +2,8 @@
 
 #include <QFile>
 
+#include <map>
+
 namespace seam {
 
 namespace {
@@ -14,9 +16,7 @@ QString fileOf(WORD number, int size) {
     return QStringLiteral(":/icon/%1/%2.png").arg(number).arg(size);
 }
 
-} // namespace
-
-QIcon iconOf(HICON icon) {
+QIcon readIcon(HICON icon) {
     QIcon pictures;
     for (const int size : sizes) {
         const QString file = fileOf(static_cast<WORD>(icon.number), size);
@@ -25,6 +25,22 @@ QIcon iconOf(HICON icon) {
         }
     }
     return pictures;
+}
+
+} // namespace
+
+QIcon iconOf(HICON icon) {
+    // Each once: the toolkit keeps what it has drawn of an icon, and takes a second one for
+    // another. Never freed, like the application object.
+    static auto* const known = new std::map<DWORD, QIcon>;
+    const auto found = known->find(icon.number);
+    return found != known->end() ? found->second
+                                 : known->emplace(icon.number, readIcon(icon)).first->second;
+}
+
+QIcon programIcon() {
+    constexpr DWORD number = 100;
+    return iconOf(HICON{number});
 }
 
 } // namespace seam

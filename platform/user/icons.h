@@ -11,4 +11,7 @@ namespace seam {
 /// is up.
 QIcon iconOf(HICON icon);
 
+/// The one that stands for the program.
+QIcon programIcon();
+
 } // namespace seam

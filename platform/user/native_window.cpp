@@ -135,6 +135,10 @@ void NativeWindow::resizePicture(QSize size) {
 }
 
 bool NativeWindow::event(QEvent* event) {
+    if (inputIsBarred(owner_, *event)) {
+        event->ignore();
+        return true;
+    }
     if (event->type() == QEvent::Close) {
         // The window goes when its procedure says so.
         queuePosted({owner_, WM_CLOSE, 0, 0, 0});

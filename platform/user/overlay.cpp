@@ -65,9 +65,9 @@ int runOver(QDialog& dialog, HWND owner) {
     flushWindows();
     dialog.setWindowModality(Qt::ApplicationModal);
     const Window* over = findWindow(topLevelOf(owner));
-    if (over != nullptr && over->native) {
-        placeOver(dialog, *over->native);
-        QObject::connect(over->native.get(), &QObject::destroyed, &dialog, &QDialog::reject);
+    if (QWindow* under = over != nullptr ? toolkitWindow(*over) : nullptr) {
+        placeOver(dialog, *under);
+        QObject::connect(under, &QObject::destroyed, &dialog, &QDialog::reject);
     }
     dialog.winId();                       // makes its window
     bringForward(*dialog.windowHandle()); // before it is seen, to hear of that

@@ -1,6 +1,8 @@
 // Painting a window, and its own answers to messages.
 #include "platform/gdi/surface.h"
 #include "platform/harness.h"
+#include "platform/user/controls/control.h"
+#include "platform/user/dialog.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
 #include "platform/user/roster.h"
@@ -77,6 +79,10 @@ static LRESULT eraseBackground(const Window& window, HDC dc) {
 
 static LRESULT setTitle(Window& window, const char* title) {
     window.title = title == nullptr ? "" : title;
+    if (window.dialog) {
+        window.dialog->setWindowTitle(shownText(window.title));
+        return TRUE;
+    }
     window.native->setTitle(shownText(window.title));
     if (!window.parent) {
         leaveRoster(window.handle);

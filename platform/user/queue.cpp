@@ -76,7 +76,7 @@ bool takeFrom(std::deque<MSG>& queue, const Filter& filter, bool remove, MSG& me
 }
 
 bool takeQuit(const Filter& filter, bool remove, MSG& message) {
-    if (!quitAsked || !filter.takes(WM_QUIT)) {
+    if (!quitAsked || !filter.takes(WM_QUIT) || filter.except == WM_QUIT) {
         return false;
     }
     message = {HWND{}, WM_QUIT, static_cast<WPARAM>(quitCode), 0, messageTime()};
@@ -136,6 +136,16 @@ void waitForMore() {
     }
     armWaker(deadline);
     QCoreApplication::processEvents(QEventLoop::WaitForMoreEvents);
+}
+
+void waitFor(const Filter& filter, MSG& message) {
+    for (;;) {
+        pump();
+        if (take(filter, true, message)) {
+            return;
+        }
+        waitForMore();
+    }
 }
 
 /// What the toolkit's own loop can't do for us: posted messages, paints and timers. Input waits
@@ -244,6 +254,12 @@ void flushWindows() {
     });
 }
 
+void waitForMessage(MSG& message) {
+    Filter withoutQuit;
+    withoutQuit.except = WM_QUIT;
+    waitFor(withoutQuit, message);
+}
+
 bool runUntil(std::int64_t milliseconds) {
     MSG message{};
     for (;;) {
@@ -273,13 +289,8 @@ BOOL GetMessageA(MSG* message, HWND window, UINT lowest, UINT highest) {
         return FALSE;
     }
     endWindowsAtExit();
-    for (;;) {
-        pump();
-        if (take({}, true, *message)) {
-            return message->message != WM_QUIT ? TRUE : FALSE;
-        }
-        waitForMore();
-    }
+    waitFor({}, *message);
+    return message->message != WM_QUIT ? TRUE : FALSE;
 }
 
 BOOL PeekMessageA(MSG* message, HWND window, UINT lowest, UINT highest, UINT remove) {

@@ -10,6 +10,9 @@ namespace seam {
 void queuePosted(const MSG& message);
 void queueInput(const MSG& message);
 
+/// Waits for the next message of any window and takes it, but no quit.
+void waitForMessage(MSG& message);
+
 /// Drops what is queued for a window that goes.
 void forgetMessagesOf(HWND window);
 

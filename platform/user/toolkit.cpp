@@ -6,8 +6,8 @@
 
 #include <QApplication>
 #include <QPalette>
+#include <QProxyStyle>
 #include <QScreen>
-#include <QStyleFactory>
 
 #include <cstdio>
 #include <memory>
@@ -36,6 +36,21 @@ Probe probeDisplay() {
     }
     return {xcb_connect(nullptr, nullptr), &xcb_disconnect};
 }
+
+/// The toolkit's classic look, but for the room between a check box and its text: texts are cut to
+/// the dialog units that they have.
+class ClassicStyle : public QProxyStyle {
+  public:
+    ClassicStyle() : QProxyStyle(QStringLiteral("windows")) {}
+
+    int pixelMetric(PixelMetric metric, const QStyleOption* option,
+                    const QWidget* widget) const override {
+        constexpr int spacing = 3;
+        return metric == PM_CheckBoxLabelSpacing || metric == PM_RadioButtonLabelSpacing
+                   ? spacing
+                   : QProxyStyle::pixelMetric(metric, option, widget);
+    }
+};
 
 /// Grey dialogs with blue selections, whatever the desktop's theme.
 QPalette classicPalette() {
@@ -79,7 +94,8 @@ bool makeToolkit() {
          {"QT_SCALE_FACTOR", "QT_SCREEN_SCALE_FACTORS", "QT_USE_PHYSICAL_DPI"}) {
         qunsetenv(variable);
     }
-    QApplication::setStyle(QStringLiteral("windows"));
+    qputenv("QT_FONT_DPI", "96"); // and so is the style's
+    QApplication::setStyle(new ClassicStyle);
     QApplication::setPalette(classicPalette());
     // It lives as long as the process: windows may be destroyed by handlers of static objects.
     new QApplication(argumentCount, static_cast<char**>(arguments));

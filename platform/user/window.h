@@ -5,12 +5,19 @@
 #include "platform/user.h"
 #include "platform/user/input_contexts.h"
 
+#include <QPoint>
+
 #include <functional>
 #include <memory>
 #include <string>
 
+class QEvent;
+class QWindow;
+
 namespace seam {
 
+class Control;
+class DialogWindow;
 class NativeWindow;
 
 struct WindowClass {
@@ -26,7 +33,10 @@ struct WindowClass {
 struct Window {
     HWND handle;
     WindowClass* windowClass = nullptr;
+    HINSTANCE instance;
     HWND parent; // of a child; may be another program's window
+    HWND owner;  // with which a top-level window goes
+    int id = 0;  // of a control
     DWORD style = 0;
     bool topmost = false;
     std::string title;
@@ -37,7 +47,14 @@ struct Window {
     bool eraseNeeded = false;
     HIMC inputContext = defaultInputContext;
     RECT update{0, 0, 0, 0}; // bounds of what WM_PAINT has to paint
+    bool enabled = true;
+    // One of the three stands behind it.
     std::unique_ptr<NativeWindow> native;
+    std::unique_ptr<DialogWindow> dialog;
+    std::unique_ptr<Control> control;
+
+    Window();
+    ~Window();
 
     int width() const {
         return place.right - place.left;
@@ -50,6 +67,18 @@ struct Window {
 
 /// The record of a window of this program; null for any other number.
 Window* findWindow(HWND window);
+
+/// Takes a window in and gives its handle, which is written into it; null if there are too many.
+HWND addWindow(std::unique_ptr<Window> window);
+
+/// The toolkit's window that it is, or lies in; null while there is none.
+QWindow* toolkitWindow(const Window& window);
+
+/// Whether the event is input to a window that EnableWindow has shut.
+bool inputIsBarred(HWND window, const QEvent& event);
+
+/// Shows a window that isn't shown yet.
+void showWindow(HWND window);
 
 /// Calls visit for each window of this program, in the order of their slots.
 void forEachWindow(const std::function<void(Window&)>& visit);

@@ -4,7 +4,9 @@
 #include "platform/gdi/surface.h"
 #include "platform/harness.h"
 #include "platform/trace.h"
+#include "platform/user/controls/control.h"
 #include "platform/user/cursors.h"
+#include "platform/user/dialog.h"
 #include "platform/user/foreign.h"
 #include "platform/user/icons.h"
 #include "platform/user/native_window.h"
@@ -55,27 +57,12 @@ std::unique_ptr<NativeWindow> makeNative(const Window& window) {
     return native;
 }
 
-void show(HWND handle) {
-    SendMessageA(handle, WM_SHOWWINDOW, TRUE, 0);
-    Window* window = findWindow(handle); // its handler may have destroyed it
-    if (window == nullptr || window->visible) {
-        return;
-    }
-    window->visible = true;
-    invalidate(*window, {0, 0, window->width(), window->height()}, true);
-    applyCursor(*window->native);
-    if (fillsScreen(*window)) {
-        takeScreens(*window);
-    }
-    window->native->show();
-}
-
 /// Everything that lies in the window or is owned by it, the innermost last.
 std::vector<HWND> withChildren(HWND window) {
     std::vector<HWND> found{window};
     for (std::size_t i = 0; i < found.size(); ++i) {
         forEachWindow([&](const Window& other) {
-            if (other.parent == found[i]) {
+            if (other.parent == found[i] || other.owner == found[i]) {
                 found.push_back(other.handle);
             }
         });
@@ -93,6 +80,11 @@ HWND firstNotDying(HWND window) {
         }
     }
     return {};
+}
+
+/// Of a dialog or a control.
+QWidget& widgetOf(const Window& window) {
+    return window.dialog ? static_cast<QWidget&>(*window.dialog) : window.control->widget();
 }
 
 void sendSizeAndPlace(const Window& window) {
@@ -118,7 +110,26 @@ bool bringUp(HWND handle, CREATESTRUCTA& creation) {
     return findWindow(handle) != nullptr;
 }
 
+/// The keyboard goes back to what the window stood in front of; without a window manager nobody
+/// else sees to that.
+void passActivationOn(const Window& window) {
+    const QWindow* native = toolkitWindow(window);
+    if (window.parent || native == nullptr || !native->isActive()) {
+        return;
+    }
+    QWindow* next = nullptr;
+    forEachWindow([&](const Window& other) {
+        if (!other.parent && other.visible && !other.dying && other.enabled) {
+            next = toolkitWindow(other);
+        }
+    });
+    if (next != nullptr) {
+        next->requestActivate();
+    }
+}
+
 void removeWindow(HWND handle) {
+    passActivationOn(*findWindow(handle));
     killTimersOf(handle);
     forgetMessagesOf(handle);
     if (focus == handle) {
@@ -132,8 +143,68 @@ void removeWindow(HWND handle) {
 
 } // namespace
 
+Window::Window() = default;
+Window::~Window() = default;
+
 Window* findWindow(HWND window) {
     return table().find(window.number);
+}
+
+HWND addWindow(std::unique_ptr<Window> window) {
+    Window& added = *window;
+    const HWND handle{table().add(std::move(window))};
+    if (handle) {
+        added.handle = handle;
+    }
+    return handle;
+}
+
+QWindow* toolkitWindow(const Window& window) {
+    if (window.control) {
+        return window.control->widget().window()->windowHandle();
+    }
+    return window.dialog ? window.dialog->windowHandle() : window.native.get();
+}
+
+bool inputIsBarred(HWND window, const QEvent& event) {
+    const Window* found = findWindow(window);
+    if (found == nullptr || found->enabled) {
+        return false;
+    }
+    switch (event.type()) {
+    case QEvent::KeyPress:
+    case QEvent::KeyRelease:
+    case QEvent::ShortcutOverride:
+    case QEvent::MouseButtonPress:
+    case QEvent::MouseButtonRelease:
+    case QEvent::MouseButtonDblClick:
+    case QEvent::MouseMove:
+    case QEvent::Wheel:
+    case QEvent::Close:
+        return true;
+    default:
+        return false;
+    }
+}
+
+void showWindow(HWND handle) {
+    SendMessageA(handle, WM_SHOWWINDOW, TRUE, 0);
+    Window* window = findWindow(handle); // its handler may have destroyed it
+    if (window == nullptr || window->visible) {
+        return;
+    }
+    window->visible = true;
+    if (window->dialog) {
+        window->dialog->show();
+        window->dialog->activateWindow();
+        return;
+    }
+    invalidate(*window, {0, 0, window->width(), window->height()}, true);
+    applyCursor(*window->native);
+    if (fillsScreen(*window)) {
+        takeScreens(*window);
+    }
+    window->native->show();
 }
 
 void forEachWindow(const std::function<void(Window&)>& visit) {
@@ -235,16 +306,17 @@ HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DW
     auto made = std::make_unique<Window>();
     Window& window = *made;
     window.windowClass = &windowClass->second;
+    window.instance = windowClass->second.instance;
     window.parent = child ? parent : HWND{};
+    window.owner = !child && findWindow(parent) != nullptr ? topLevelOf(parent) : HWND{};
     window.style = style;
     window.topmost = (exStyle & WS_EX_TOPMOST) != 0;
     window.title = title == nullptr ? "" : title;
     window.place = {x, y, x + std::max(width, 1), y + std::max(height, 1)};
-    const HWND handle{table().add(std::move(made))};
+    const HWND handle = addWindow(std::move(made));
     if (!handle) {
         return {};
     }
-    window.handle = handle;
     window.native = makeNative(window);
     if (mayBeForeign(window.parent)) {
         followHost(window.parent, handle);
@@ -258,7 +330,7 @@ HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DW
         return {};
     }
     if ((style & WS_VISIBLE) != 0) {
-        show(handle);
+        showWindow(handle);
     }
     return findWindow(handle) != nullptr ? handle : HWND{};
 }
@@ -283,11 +355,12 @@ BOOL IsWindow(HWND window) {
 }
 
 BOOL IsIconic(HWND window) {
-    const Window* found = findWindow(topLevelOf(window));
-    return found != nullptr && found->native &&
-                   (found->native->windowStates() & Qt::WindowMinimized) != 0
-               ? TRUE
-               : FALSE;
+    const Window* found = findWindow(window);
+    const QWindow* native = found != nullptr ? toolkitWindow(*found) : nullptr;
+    while (native != nullptr && native->parent() != nullptr) {
+        native = native->parent();
+    }
+    return native != nullptr && (native->windowStates() & Qt::WindowMinimized) != 0 ? TRUE : FALSE;
 }
 
 HWND GetParent(HWND window) {
@@ -306,6 +379,14 @@ HWND FindWindowA(const char* className, const char* title) {
     return result || title == nullptr ? result : findRemote(className, title);
 }
 
+static void hide(Window& window) {
+    if (window.native) {
+        window.native->hide();
+    } else {
+        widgetOf(window).hide();
+    }
+}
+
 BOOL ShowWindow(HWND window, int command) {
     Window* found = findWindow(window);
     if (found == nullptr) {
@@ -313,10 +394,10 @@ BOOL ShowWindow(HWND window, int command) {
     }
     const bool before = found->visible;
     if (command != SW_HIDE && !before) {
-        show(window);
+        showWindow(window);
     } else if (command == SW_HIDE && before) {
         found->visible = false;
-        found->native->hide();
+        hide(*found);
     }
     return before ? TRUE : FALSE;
 }
@@ -333,6 +414,10 @@ BOOL MoveWindow(HWND window, int x, int y, int width, int height, BOOL repaint) 
     const bool moved = x != found->place.left || y != found->place.top;
     found->place = {x, y, x + width, y + height};
     const QRect place(QPoint(x, y) + originOf(*found), QSize(found->width(), found->height()));
+    if (!found->native) {
+        widgetOf(*found).setGeometry(place);
+        return TRUE;
+    }
     if (sized) {
         found->native->resizePicture(place.size());
     }
@@ -352,7 +437,7 @@ BOOL SetWindowPos(HWND window, HWND after, int x, int y, int width, int height, 
         return FALSE;
     }
     if ((flags & SWP_NOZORDER) == 0) {
-        found->native->raise();
+        toolkitWindow(*found)->raise();
     }
     const RECT place = found->place;
     const bool keepsPlace = (flags & SWP_NOMOVE) != 0;
@@ -364,9 +449,8 @@ BOOL SetWindowPos(HWND window, HWND after, int x, int y, int width, int height, 
 
 LONG GetWindowLongA(HWND window, int index) {
     const Window* found = findWindow(window);
-    return found == nullptr || index != GWL_HINSTANCE
-               ? 0
-               : static_cast<LONG>(found->windowClass->instance.number);
+    return found == nullptr || index != GWL_HINSTANCE ? 0
+                                                      : static_cast<LONG>(found->instance.number);
 }
 
 DWORD SetClassLongA(HWND window, int index, LONG value) {
@@ -377,6 +461,22 @@ DWORD SetClassLongA(HWND window, int index, LONG value) {
     const DWORD before = found->windowClass->cursor.number;
     found->windowClass->cursor = HCURSOR{static_cast<DWORD>(value)};
     return before;
+}
+
+BOOL GetWindowRect(HWND window, RECT* place) {
+    const Window* found = findWindow(window);
+    if (found == nullptr) {
+        return FALSE;
+    }
+    *place = found->place;
+    for (const Window* outer = findWindow(found->parent); outer != nullptr;
+         outer = findWindow(outer->parent)) {
+        place->left += outer->place.left;
+        place->right += outer->place.left;
+        place->top += outer->place.top;
+        place->bottom += outer->place.top;
+    }
+    return TRUE;
 }
 
 BOOL GetClientRect(HWND window, RECT* area) {
@@ -394,14 +494,19 @@ BOOL GetClientRect(HWND window, RECT* area) {
 
 HWND SetFocus(HWND window) {
     const HWND before = focus;
-    focus = findWindow(window) != nullptr ? window : HWND{};
+    const Window* found = findWindow(window);
+    focus = found != nullptr && found->native ? window : HWND{};
+    if (found != nullptr && found->control) {
+        found->control->widget().setFocus();
+    }
     return before;
 }
 
 HWND GetForegroundWindow() {
     HWND result;
     forEachWindow([&](const Window& window) {
-        if (window.native && window.native->isActive() && !window.parent) {
+        const QWindow* native = toolkitWindow(window);
+        if (native != nullptr && native->isActive() && !window.parent) {
             result = window.handle;
         }
     });
@@ -412,10 +517,11 @@ BOOL SetForegroundWindow(HWND window) {
     if (isRemote(window)) {
         return raiseRemote(window) ? TRUE : FALSE;
     }
-    Window* found = findWindow(window);
-    if (found == nullptr || !found->native) {
+    const Window* found = findWindow(window);
+    QWindow* native = found != nullptr ? toolkitWindow(*found) : nullptr;
+    if (native == nullptr) {
         return FALSE;
     }
-    raiseInFront(*found->native);
+    raiseInFront(*native);
     return TRUE;
 }

@@ -62,7 +62,8 @@ inline HWND makeWindow(int width = 40, int height = 30, DWORD style = WS_POPUP |
 /// Takes and dispatches what waits now, timers left out.
 inline void handleWaiting() {
     MSG message{};
-    while (PeekMessageA(&message, nullptr, 0, WM_TIMER - 1, PM_REMOVE)) {
+    while (PeekMessageA(&message, nullptr, 0, WM_TIMER - 1, PM_REMOVE) ||
+           PeekMessageA(&message, nullptr, WM_TIMER + 1, 0xFFFF, PM_REMOVE)) {
         DispatchMessageA(&message);
     }
 }

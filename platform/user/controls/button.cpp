@@ -1,0 +1,104 @@
+// Push buttons, check boxes and radio buttons.
+#include "platform/user/controls/control.h"
+
+#include "platform/gdi/encoding.h"
+#include "platform/user/controls/item_painter.h"
+#include "platform/user/text.h"
+
+#include <QButtonGroup>
+#include <QCheckBox>
+#include <QPainter>
+#include <QPushButton>
+#include <QRadioButton>
+
+namespace seam {
+
+namespace {
+
+/// A button of whose looks the program draws everything.
+class DrawnButton : public QPushButton {
+  public:
+    DrawnButton(HWND handle, QWidget* dialog) : QPushButton(dialog), handle_(handle) {}
+
+  protected:
+    void paintEvent(QPaintEvent* /*event*/) override {
+        QPainter painter(this);
+        const UINT state = (isDown() ? ODS_SELECTED : 0U) | (isEnabled() ? 0U : ODS_DISABLED) |
+                           (hasFocus() ? ODS_FOCUS : 0U);
+        paintItem(painter, rect(), palette().color(QPalette::Button),
+                  {handle_, ODT_BUTTON, 0, state, 0});
+    }
+
+  private:
+    HWND handle_;
+};
+
+QAbstractButton* makeWidget(DWORD style, HWND handle, QWidget& dialog) {
+    switch (style & BS_TYPEMASK) {
+    case BS_OWNERDRAW:
+        return new DrawnButton(handle, &dialog);
+    case BS_AUTOCHECKBOX:
+        return new QCheckBox(&dialog);
+    case BS_AUTORADIOBUTTON:
+        return new QRadioButton(&dialog);
+    default:
+        auto* button = new QPushButton(&dialog);
+        button->setDefault((style & BS_TYPEMASK) == BS_DEFPUSHBUTTON);
+        return button;
+    }
+}
+
+class Button : public Control {
+  public:
+    Button(const ControlTemplate& made, HWND handle, QWidget& dialog)
+        : button_(makeWidget(made.style, handle, dialog)) {
+        Button::setText(made.text);
+        QObject::connect(button_, &QAbstractButton::clicked, button_,
+                         [handle] { notify(handle, BN_CLICKED); });
+    }
+
+    QWidget& widget() override {
+        return *button_;
+    }
+
+    /// The text of a check box or a radio button is never cut: nothing stands beside it.
+    int leastWidth() const override {
+        return qobject_cast<QPushButton*>(button_) == nullptr ? button_->sizeHint().width() : 0;
+    }
+
+    std::string text() const override {
+        return toWindows1252(button_->text());
+    }
+
+    void setText(const std::string& text) override {
+        button_->setText(shownText(text));
+    }
+
+    bool checked() const override {
+        return button_->isChecked();
+    }
+
+    /// Of radio buttons each is checked and unchecked for itself.
+    void check(bool on) override {
+        QButtonGroup* group = button_->group();
+        const bool exclusive = group != nullptr && group->exclusive();
+        if (exclusive) {
+            group->setExclusive(false);
+        }
+        button_->setChecked(on);
+        if (exclusive) {
+            group->setExclusive(true);
+        }
+    }
+
+  private:
+    QAbstractButton* button_;
+};
+
+} // namespace
+
+std::unique_ptr<Control> makeButton(const ControlTemplate& made, HWND handle, QWidget& dialog) {
+    return std::make_unique<Button>(made, handle, dialog);
+}
+
+} // namespace seam

@@ -1,0 +1,298 @@
+#include "platform/user/dialog.h"
+
+#include "platform/gdi/font.h"
+#include "platform/kernel.h"
+#include "platform/user/controls/control.h"
+#include "platform/user/ending.h"
+#include "platform/user/foreign.h"
+#include "platform/user/icons.h"
+#include "platform/user/native_window.h"
+#include "platform/user/queue.h"
+#include "platform/user/text.h"
+#include "platform/user/toolkit.h"
+#include "platform/user/window.h"
+
+#include <QButtonGroup>
+#include <QCloseEvent>
+#include <QKeyEvent>
+#include <QPushButton>
+#include <QRadioButton>
+#include <QWindow>
+
+namespace seam {
+
+namespace {
+
+LRESULT dialogProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
+LRESULT controlProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
+
+WindowClass& dialogClass() {
+    static WindowClass windowClass{"dialog", 0, dialogProcedure, {}, {}, {}, {}};
+    return windowClass;
+}
+
+WindowClass& controlClass() {
+    static WindowClass windowClass{"control", 0, controlProcedure, {}, {}, {}, {}};
+    return windowClass;
+}
+
+/// What a dialog does with a message that its procedure leaves to it.
+LRESULT dialogsOwnAnswer(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam) {
+    switch (message) {
+    case WM_CLOSE:
+        return SendMessageA(dialog, WM_COMMAND, IDCANCEL, 0);
+    case WM_ENDSESSION:
+        return EndDialog(dialog, -1);
+    default:
+        return DefWindowProcA(dialog, message, wParam, lParam);
+    }
+}
+
+LRESULT dialogProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
+    const Window* dialog = findWindow(window);
+    const LRESULT result = dialog->dialog->procedure()(window, message, wParam, lParam);
+    return result != 0 || message == WM_INITDIALOG
+               ? result
+               : dialogsOwnAnswer(window, message, wParam, lParam);
+}
+
+LRESULT controlProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
+    Control& control = *findWindow(window)->control;
+    if (message == WM_SETTEXT) {
+        const auto* text = reinterpret_cast<const char*>(lParam);
+        control.setText(text == nullptr ? "" : text);
+        return TRUE;
+    }
+    return control.answer(message, wParam, lParam).value_or(0);
+}
+
+std::optional<DialogTemplate> loadTemplate(HINSTANCE instance, ResourceName name) {
+    const HRSRC found = FindResourceA(instance, name, RT_DIALOG);
+    const HGLOBAL block = found ? LoadResource(instance, found) : HGLOBAL{};
+    const auto* text = static_cast<const char*>(LockResource(block));
+    if (text == nullptr) {
+        return std::nullopt;
+    }
+    auto made = parseDialogTemplate({text, SizeofResource(instance, found)});
+    FreeResource(block);
+    return made;
+}
+
+/// Radio buttons go together from one WS_GROUP to the next.
+void groupButtons(DialogWindow& dialog, const DialogTemplate& made,
+                  const std::vector<QWidget*>& widgets) {
+    QButtonGroup* group = nullptr;
+    for (std::size_t i = 0; i < widgets.size(); ++i) {
+        if (group == nullptr || (made.controls[i].style & WS_GROUP) != 0) {
+            group = new QButtonGroup(&dialog);
+        }
+        if (auto* radio = qobject_cast<QRadioButton*>(widgets[i])) {
+            group->addButton(radio);
+        }
+    }
+}
+
+/// The first control of the template is the first to have the focus.
+void orderTabs(const std::vector<QWidget*>& widgets) {
+    for (std::size_t i = 1; i < widgets.size(); ++i) {
+        QWidget::setTabOrder(widgets[i - 1], widgets[i]);
+    }
+}
+
+/// Makes the controls; false if there are too many windows.
+bool addControls(const Window& owner, const DialogTemplate& made) {
+    DialogWindow& dialog = *owner.dialog;
+    const HWND parent = owner.handle;
+    std::vector<QWidget*> widgets;
+    for (const ControlTemplate& control : made.controls) {
+        auto record = std::make_unique<Window>();
+        Window& window = *record;
+        window.windowClass = &controlClass();
+        window.instance = owner.instance;
+        window.parent = parent;
+        window.style = control.style;
+        window.id = control.id;
+        window.visible = true;
+        const HWND handle = addWindow(std::move(record));
+        if (!handle) {
+            return false;
+        }
+        window.control = makeControl(control, handle, dialog);
+        if (!window.control) {
+            DestroyWindow(handle);
+            continue;
+        }
+        const QRect place = window.control->widget().geometry();
+        window.place = {place.left(), place.top(), place.right() + 1, place.bottom() + 1};
+        widgets.push_back(&window.control->widget());
+    }
+    groupButtons(dialog, made, widgets);
+    orderTabs(widgets);
+    return true;
+}
+
+/// In front of its owner, also where that is another program's.
+void tieToOwner(QWindow& dialog, HWND owner) {
+    const Window* ours = findWindow(topLevelOf(owner));
+    QWindow* over = ours != nullptr ? toolkitWindow(*ours) : nullptr;
+    if (over == nullptr && mayBeForeign(owner) && foreignExists(owner)) {
+        over = QWindow::fromWinId(owner.number);
+        QObject::connect(&dialog, &QObject::destroyed, over, &QObject::deleteLater);
+    }
+    dialog.setTransientParent(over);
+}
+
+/// Makes a dialog that isn't shown yet, with all that is in it.
+HWND makeDialog(HINSTANCE instance, ResourceName name, HWND owner, DLGPROC procedure,
+                LPARAM parameter) {
+    const auto made = toolkit() ? loadTemplate(instance, name) : std::nullopt;
+    if (!made) {
+        return {};
+    }
+    auto record = std::make_unique<Window>();
+    Window& window = *record;
+    window.windowClass = &dialogClass();
+    window.instance = instance;
+    window.owner = findWindow(owner) != nullptr ? topLevelOf(owner) : HWND{};
+    window.style = made->style;
+    window.title = made->title;
+    const Place& place = made->place;
+    window.place = {place.left, place.top, place.left + place.width, place.top + place.height};
+    const HWND handle = addWindow(std::move(record));
+    if (!handle) {
+        return {};
+    }
+    window.dialog = std::make_unique<DialogWindow>(handle, *made, procedure);
+    tieToOwner(*window.dialog->windowHandle(), owner);
+    if (!addControls(window, *made)) {
+        DestroyWindow(handle);
+        return {};
+    }
+    const bool focus = SendMessageA(handle, WM_INITDIALOG, 0, parameter) != 0;
+    const Window* still = findWindow(handle);
+    if (still != nullptr && focus) {
+        still->dialog->focusFirst();
+    }
+    return still != nullptr ? handle : HWND{};
+}
+
+/// Runs a dialog's loop until it has been ended or destroyed.
+LRESULT runDialog(HWND dialog) {
+    for (;;) {
+        const Window* window = findWindow(dialog);
+        if (window == nullptr) {
+            return -1;
+        }
+        if (window->dialog->result) {
+            return *window->dialog->result;
+        }
+        MSG message{};
+        waitForMessage(message);
+        DispatchMessageA(&message);
+    }
+}
+
+} // namespace
+
+DialogWindow::DialogWindow(HWND handle, const DialogTemplate& made, DLGPROC answering)
+    : handle_(handle), procedure_(answering) {
+    setWindowFlags(Qt::Dialog | Qt::CustomizeWindowHint | Qt::WindowTitleHint |
+                   Qt::WindowSystemMenuHint | Qt::WindowCloseButtonHint);
+    setWindowTitle(shownText(made.title));
+    setWindowIcon(programIcon());
+    setFont(dialogFont(made.fontHeight));
+    setFixedSize(made.place.width, made.place.height);
+    winId(); // makes its window
+    windowHandle()->installEventFilter(this);
+}
+
+void DialogWindow::focusFirst() {
+    QWidget* next = nextInFocusChain();
+    while (next != this && ((next->focusPolicy() & Qt::TabFocus) == 0 || !next->isEnabled())) {
+        next = next->nextInFocusChain();
+    }
+    next->setFocus();
+}
+
+void DialogWindow::command(int id) {
+    const HWND button = GetDlgItem(handle_, id);
+    if (!button || IsWindowEnabled(button) != FALSE) {
+        queueInput({handle_, WM_COMMAND, static_cast<WPARAM>(id), LPARAM{button.number}, 0});
+    }
+}
+
+void DialogWindow::reject() {
+    command(IDCANCEL);
+}
+
+bool DialogWindow::eventFilter(QObject* /*watched*/, QEvent* event) {
+    return inputIsBarred(handle_, *event);
+}
+
+void DialogWindow::closeEvent(QCloseEvent* event) {
+    event->ignore(); // it goes when the program says so
+    queuePosted({handle_, WM_CLOSE, 0, 0, 0});
+}
+
+bool DialogWindow::hasDefaultButton() const {
+    const auto buttons = findChildren<QPushButton*>();
+    return std::any_of(buttons.begin(), buttons.end(),
+                       [](const QPushButton* button) { return button->isDefault(); });
+}
+
+void DialogWindow::keyPressEvent(QKeyEvent* event) {
+    const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+    if (enter && !hasDefaultButton()) {
+        command(IDOK);
+        return;
+    }
+    QDialog::keyPressEvent(event);
+}
+
+} // namespace seam
+
+using namespace seam;
+
+HWND CreateDialogParamA(HINSTANCE instance, ResourceName name, HWND owner, DLGPROC procedure,
+                        LPARAM parameter) {
+    const HWND dialog = makeDialog(instance, name, owner, procedure, parameter);
+    const Window* window = findWindow(dialog);
+    if (window != nullptr && (window->style & WS_VISIBLE) != 0) {
+        showWindow(dialog);
+    }
+    return dialog;
+}
+
+LRESULT DialogBoxParamA(HINSTANCE instance, ResourceName name, HWND owner, DLGPROC procedure,
+                        LPARAM parameter) {
+    const HWND over = findWindow(owner) != nullptr ? topLevelOf(owner) : HWND{};
+    const HWND dialog = makeDialog(instance, name, owner, procedure, parameter);
+    const Window* window = findWindow(dialog);
+    if (window == nullptr) {
+        return -1;
+    }
+    endWindowsAtExit();
+    const bool enabled = EnableWindow(over, FALSE) == FALSE;
+    if (!window->dialog->result) {
+        showWindow(dialog);
+    }
+    const LRESULT result = runDialog(dialog);
+    if (enabled) {
+        EnableWindow(over, TRUE); // before the dialog goes, for it to get the keyboard
+    }
+    DestroyWindow(dialog);
+    return result;
+}
+
+BOOL EndDialog(HWND dialog, LPARAM result) {
+    const Window* window = findWindow(dialog);
+    if (window == nullptr || !window->dialog) {
+        return FALSE;
+    }
+    window->dialog->result = result;
+    return TRUE;
+}
+
+BOOL IsDialogMessageA(HWND /*dialog*/, const MSG* /*message*/) {
+    return FALSE;
+}

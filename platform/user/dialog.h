@@ -1,0 +1,44 @@
+// The toolkit's window behind a dialog's handle.
+#pragma once
+
+#include "platform/dialogs.h"
+#include "platform/user/dialog_template.h"
+
+#include <QDialog>
+
+#include <optional>
+
+namespace seam {
+
+/// Its keys are the toolkit's: Tab, the underlined letters and the arrows. Enter presses the
+/// default button and Escape stands for IDCANCEL; closing it is WM_CLOSE.
+class DialogWindow : public QDialog {
+  public:
+    DialogWindow(HWND handle, const DialogTemplate& made, DLGPROC answering);
+
+    DLGPROC procedure() const {
+        return procedure_;
+    }
+
+    /// Gives the focus to the first tab stop.
+    void focusFirst();
+
+    /// What EndDialog has been given.
+    std::optional<LRESULT> result;
+
+    void reject() override;
+
+  protected:
+    bool eventFilter(QObject* watched, QEvent* event) override;
+    void closeEvent(QCloseEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+
+  private:
+    bool hasDefaultButton() const;
+    void command(int id);
+
+    HWND handle_;
+    DLGPROC procedure_;
+};
+
+} // namespace seam

@@ -1,0 +1,52 @@
+// Templates of dialogs, as the resources hold them: text, one control on each line.
+#pragma once
+
+#include "platform/types.h"
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace seam {
+
+/// A place in pixels, made from dialog units.
+struct Place {
+    int left = 0;
+    int top = 0;
+    int width = 0;
+    int height = 0;
+};
+
+struct ControlTemplate {
+    int id = -1;
+    std::string kind; // "button", "static", "listbox", "edit", "combobox" or "scrollbar"
+    std::string text;
+    Place place;
+    DWORD style = 0;
+    std::string spokenName; // for who can't see what stands beside it
+};
+
+struct DialogTemplate {
+    std::string title;
+    Place place;
+    DWORD style = 0;
+    int fontHeight = 0; // in pixels
+    int menu = 0;
+    std::vector<ControlTemplate> controls;
+};
+
+/// Reads a template:
+///
+///     # a remark
+///     dialog "title" LEFT TOP WIDTH HEIGHT STYLE..
+///     font POINTS "face"
+///     menu ID
+///     ID KIND "text" LEFT TOP WIDTH HEIGHT STYLE.. named "spoken name"
+///
+/// Places are in dialog units. In a text \r stands for a carriage return, \" and \\ for themselves.
+/// Styles are the platform's in lower case without what stands before the underscore. Nothing if a
+/// line can't be read.
+std::optional<DialogTemplate> parseDialogTemplate(std::string_view text);
+
+} // namespace seam
