@@ -3,6 +3,7 @@
 #include "platform/kernel.h"
 #include "saver/saver_guard.h"
 #include "saver/setup_dialog.h"
+#include "saver/window_loop.h"
 #include "stage/stage.h"
 
 HINSTANCE SaverInstance;
@@ -152,20 +153,6 @@ static HWND CreateSaverWindow(HWND parent) {
                            parent, nullptr, SaverInstance, nullptr);
 }
 
-/// Runs until the window has gone. A quit that finds it alive was meant for a loop that ended
-/// another way, and is passed over; one that its end has posted doesn't outlive the loop.
-static int RunLoop(HWND window) {
-    MSG message{};
-    while (IsWindow(window)) {
-        if (GetMessageA(&message, nullptr, 0, 0)) {
-            TranslateMessage(&message);
-            DispatchMessageA(&message);
-        }
-    }
-    PeekMessageA(&message, nullptr, WM_QUIT, WM_QUIT, PM_REMOVE);
-    return message.message == WM_QUIT ? static_cast<int>(message.wParam) : 0;
-}
-
 int RunSaver(HWND parent) {
     if (parent) {
         PreviewMode = 1;
@@ -186,7 +173,7 @@ int RunSaver(HWND parent) {
         if (PreviewMode == 0) {
             SetForegroundWindow(SaverWindow);
         }
-        result = RunLoop(SaverWindow);
+        result = RunWindowLoop(SaverWindow);
     }
     UnloadPasswordModule();
     return result;

@@ -1,6 +1,8 @@
 // Runs of the real program: exit codes, modes, what ends it and what it leaves behind.
 #include "tests/program/run.h"
 
+#include <csignal>
+
 namespace {
 
 using ground::Run;
@@ -12,11 +14,8 @@ TEST_F(Run, CommandLineChoosesModeAndExitCode) {
         std::vector<std::string> arguments;
         int code;
     } cases[] = {
-        {{"X"}, refused},      {{"-\tS"}, refused},
-        {{}, refused},         {{"-", "--", "/"}, refused},
-        {{"/c:123"}, refused}, {{"P"}, refused},
-        {{"P", "0"}, refused}, {{"P", "77"}, refused},
-        {{"/P:1"}, refused},   {{"l", "-5"}, refused},
+        {{"X"}, refused},       {{"-\tS"}, refused}, {{"P"}, refused},       {{"P", "0"}, refused},
+        {{"P", "77"}, refused}, {{"/P:1"}, refused}, {{"l", "-5"}, refused},
     };
 
     for (const auto& one : cases) {
@@ -24,6 +23,23 @@ TEST_F(Run, CommandLineChoosesModeAndExitCode) {
             << testing::PrintToString(one.arguments);
     }
     EXPECT_TRUE(ground.grab() == bare);
+}
+
+TEST_F(Run, SetupIsShownAndSavesTheSettings) {
+    const std::vector<std::string> lines[] = {{}, {"-", "--", "/"}, {"/c:123"}};
+    for (const auto& arguments : lines) {
+        std::filesystem::remove(ground.settings());
+        auto setup = ground.start(arguments);
+        ground.typeInto("Fenky Dorbo's Rematch", ""); // Return: OK
+        EXPECT_EQ(setup.exitCode(), 1) << testing::PrintToString(arguments);
+        EXPECT_EQ(setting("Walking Style"), "1");
+    }
+    auto ended = ground.start({});
+    const QImage empty = ground.grab();
+    ASSERT_TRUE(ground::waitFor([&] { return ground.grab() != empty; }));
+    ended.signal(SIGTERM);
+    EXPECT_EQ(ended.exitCode(), 255);
+    EXPECT_TRUE(ground::waitFor([&] { return ground.grab() == bare; }));
 }
 
 TEST_F(Run, KeyEndsTheSaverAndTheOdometerIsKept) {

@@ -1,0 +1,14 @@
+#include "saver/window_loop.h"
+
+int RunWindowLoop(HWND window) {
+    MSG message{};
+    while (IsWindow(window)) {
+        if (GetMessageA(&message, nullptr, 0, 0)) {
+            TranslateMessage(&message);
+            DispatchMessageA(&message);
+        }
+    }
+    // The quit that its end has posted doesn't outlive the loop.
+    PeekMessageA(&message, nullptr, WM_QUIT, WM_QUIT, PM_REMOVE);
+    return message.message == WM_QUIT ? static_cast<int>(message.wParam) : 0;
+}
