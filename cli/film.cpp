@@ -29,8 +29,8 @@ struct FilmArguments {
 
 std::string readFilmArguments(const std::vector<std::string>& line, FilmArguments& film) {
     StageArguments arguments;
-    std::string wrong =
-        ReadArguments(line, {optionSize, optionSeed, optionStill, optionWalkAbout}, arguments);
+    std::string wrong = ReadArguments(
+        line, {optionSize, optionSeed, optionMode, optionStill, optionWalkAbout}, arguments);
     if (!wrong.empty()) {
         return wrong;
     }

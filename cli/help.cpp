@@ -56,12 +56,13 @@ constexpr Help helps[] = {
      "\n"
      "  toon check *.zkt\n"
      "  toon check --json *.zkt | jq '.[] | select(.findings != [])'\n"},
-    {"film", "FILE.zkt OUT | --walk-about OUT [--size WxH] [--seed N] [--still MS]",
+    {"film", "FILE.zkt OUT | --walk-about OUT [--size WxH] [--seed N] [--mode WHO] [--still MS]",
      "acts a Toon out and films it, without a screen",
      "\n"
      "  OUT           .gif, .png (animated), or a directory for numbered pictures\n"
      "  --size WxH    the stage in pixels; 1024x768 if not told\n"
      "  --seed N      of the random numbers; the same film for the same seed\n"
+     "  --mode WHO    who shows it: saver (if not told) or player\n"
      "  --walk-about  films a walk about, in the place of a Toon\n"
      "  --still MS    the one picture that stands MS milliseconds after the start\n"
      "\n"
@@ -69,12 +70,12 @@ constexpr Help helps[] = {
      "  toon film intro.zkt intro.png --size 640x480\n"
      "  toon film intro.zkt title.png --still 1000\n"},
     {"trace",
-     "FILE.zkt... | --walk-about [--size WxH] [--seed N] [--mode saver] [--shows N] [--paces N]",
+     "FILE.zkt... | --walk-about [--size WxH] [--seed N] [--mode WHO] [--shows N] [--paces N]",
      "prints what happens in a show, to the millisecond",
      "\n"
      "  --size WxH    the stage in pixels; 1024x768 if not told\n"
      "  --seed N      of the random numbers; the same show for the same seed\n"
-     "  --mode saver  who shows it: the saver\n"
+     "  --mode WHO    who shows it: saver (if not told) or player\n"
      "  --walk-about  traces walks about, in the place of Toons\n"
      "  --shows N     after how many shows the stage closes; 1 if not told\n"
      "  --paces N     the odometer at the start\n"

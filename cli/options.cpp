@@ -47,8 +47,10 @@ bool readStill(const std::string& value, StageArguments& arguments) {
     return readNumber(value, std::int64_t{0}, longest, arguments.still.emplace());
 }
 
-bool readMode(const std::string& value, StageArguments& /*arguments*/) {
-    return value == "saver";
+bool readMode(const std::string& value, StageArguments& arguments) {
+    const bool player = value == "player";
+    arguments.stage.mode = player ? ReplayMode::player : ReplayMode::saver;
+    return player || value == "saver";
 }
 
 bool readWalkAbout(const std::string& /*value*/, StageArguments& arguments) {
@@ -91,7 +93,7 @@ const Option optionSeed = {"--seed", "a number of 0 to 4294967295", readSeed};
 const Option optionShows = {"--shows", "a number from 1 on", readShows};
 const Option optionPaces = {"--paces", "a number of 0 to 4294967295", readPaces};
 const Option optionStill = {"--still", "a moment in milliseconds from 0 on", readStill};
-const Option optionMode = {"--mode", "saver", readMode};
+const Option optionMode = {"--mode", "saver or player", readMode};
 const Option optionWalkAbout = {"--walk-about", nullptr, readWalkAbout};
 
 std::string ReadArguments(const std::vector<std::string>& line, const std::vector<Option>& options,

@@ -22,7 +22,7 @@ struct Option {
     bool (*read)(const std::string& value, StageArguments& arguments); // false: not such a value
 };
 
-// --size WxH, --seed N, --shows N, --paces N, --still MS, --mode saver, --walk-about
+// --size WxH, --seed N, --shows N, --paces N, --still MS, --mode WHO, --walk-about
 extern const Option optionSize;
 extern const Option optionSeed;
 extern const Option optionShows;

@@ -5,6 +5,7 @@
 #include "saver/saver_guard.h"
 #include "saver/saver_main.h"
 #include "saver/show_cycle.h"
+#include "saver/toon_player.h"
 #include "stage/face.h"
 #include "stage/player.h"
 #include "stage/random_walk.h"
@@ -25,23 +26,27 @@ namespace fs = std::filesystem;
 constexpr const char* replayClass = "ReplayClass";
 
 const ReplayHooks* hooked = nullptr; // those of the replay under way
+ReplayMode mode = ReplayMode::saver;
 int showsLeft = 0;
 int showsDone = 0;
 
 constexpr const char* homeVariable = "XDG_CONFIG_HOME";
 constexpr const char* runtimeVariable = "XDG_RUNTIME_DIR";
 
-/// The saver's procedure, but that the stage closes at the end of the last show. The first walk
-/// about tells of its end twice; it is over when the second message comes.
+/// The procedure of who shows it, but that the stage closes at the end of the last show. The first
+/// walk about tells of its end twice: to the saver it is over when the second message comes, to the
+/// player at once.
 LRESULT replayProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
-    if (message == TM_SHOWDONE && RandomWalkActive == 0) {
+    const bool plays = mode == ReplayMode::player;
+    if (message == TM_SHOWDONE && (RandomWalkActive == 0 || plays)) {
         ++showsDone;
         if (--showsLeft <= 0) {
             DestroyWindow(window);
             return 0;
         }
     }
-    return SaverGuardProc(window, message, wParam, lParam);
+    return plays ? PlayerProc(window, message, wParam, lParam)
+                 : SaverGuardProc(window, message, wParam, lParam);
 }
 
 HWND createStage(const ReplayOptions& options) {
@@ -52,6 +57,13 @@ HWND createStage(const ReplayOptions& options) {
     RegisterClassA(&windowClass); // refused, and none the worse, from the second replay on
     return CreateWindowExA(0, replayClass, "", WS_POPUP | WS_VISIBLE, 0, 0, options.width,
                            options.height, nullptr, nullptr, windowClass.hInstance, nullptr);
+}
+
+/// The player is told what to play once its window stands.
+void chooseToon(const std::vector<std::string>& names) {
+    if (mode == ReplayMode::player && !names.empty()) {
+        CopyText(NextToonFile, names.front().c_str(), NEXT_TOON_SIZE);
+    }
 }
 
 void setStartSettings(const ReplayOptions& options) {
@@ -128,7 +140,10 @@ fs::path playedName(const fs::path& toon) {
     return found ? toon.filename() : "toon.zkt";
 }
 
-void copyToons(const ReplayOptions& options, const fs::path& before, const fs::path& target) {
+/// Gives the names that the copies have.
+std::vector<std::string> copyToons(const ReplayOptions& options, const fs::path& before,
+                                   const fs::path& target) {
+    std::vector<std::string> names;
     for (const std::string& toon : options.toons) {
         std::error_code error;
         const fs::path copy =
@@ -142,7 +157,9 @@ void copyToons(const ReplayOptions& options, const fs::path& before, const fs::p
         }
         // The saver would refuse one that it may not write, and wait with a box.
         fs::permissions(copy, fs::perms::owner_read | fs::perms::owner_write, error);
+        names.push_back(copy.filename());
     }
+    return names;
 }
 
 /// A stage whose shows are told of, up to its end, however that comes.
@@ -209,9 +226,10 @@ ReplayEnd Replay(const ReplayOptions& options, const ReplayHooks& hooks) {
     setenv("QT_QPA_PLATFORM", "offscreen", 1); // whatever the user's desktop is
     const fs::path before = fs::current_path();
     const ReplayGround ground;
-    copyToons(options, before, ground.toons());
+    const std::vector<std::string> names = copyToons(options, before, ground.toons());
     ForgetEarlierStages();
     setStartSettings(options);
+    mode = options.mode;
     showsLeft = options.shows;
     showsDone = 0;
     seam::useManualClock(options.seed);
@@ -221,6 +239,7 @@ ReplayEnd Replay(const ReplayOptions& options, const ReplayHooks& hooks) {
     if (!stage.stands()) {
         throw std::runtime_error("there is no room for a stage of this size");
     }
+    chooseToon(names);
     act(options, hooks);
     stage.close();
     Trace("end odometer=%u shows=%d", PacesWalked, showsDone);

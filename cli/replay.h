@@ -1,5 +1,6 @@
 // Acts shows out on a clock moved by hand, without a screen, and keeps the record of what happened:
-// the saver's own road from its window's creation on, the same each time for the same seed.
+// the saver's or the player's own road from its window's creation on, the same each time for the
+// same seed.
 #pragma once
 
 #include "platform/harness.h"
@@ -40,7 +41,11 @@ class ReplayGround {
 /// its start and seeds the second. For the time between two stages only.
 void ForgetEarlierStages();
 
+/// Who shows it: the saver, or the player of a single Toon, which knows one show only.
+enum class ReplayMode { saver, player };
+
 struct ReplayOptions {
+    ReplayMode mode = ReplayMode::saver;
     std::vector<std::string>
         toons;        // files; copied into a directory of their own. None: walks about
     int width = 1024; // of the stage, in pixels
@@ -74,9 +79,9 @@ struct ReplayEnd {
     std::string message;     // what the first message box said; empty if none came up
 };
 
-/// Acts shows out as the saver does. A stage that stands still for good, as after a Toon that
-/// doesn't load, is closed; message boxes are answered with OK. The settings are those of a fresh
-/// user and lie in a directory that goes at the end. What a hook throws closes the stage and is
-/// passed on, but for `line`, which must not throw. Throws a std::exception that tells why if the
-/// files can't be copied or there is no room for the stage.
+/// Acts shows out as the saver or the player does. A stage that stands still for good, as after a
+/// Toon that doesn't load, is closed; message boxes are answered with OK. The settings are those of
+/// a fresh user and lie in a directory that goes at the end. What a hook throws closes the stage
+/// and is passed on, but for `line`, which must not throw. Throws a std::exception that tells why
+/// if the files can't be copied or there is no room for the stage.
 ReplayEnd Replay(const ReplayOptions& options, const ReplayHooks& hooks);

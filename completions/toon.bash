@@ -13,7 +13,7 @@ _toon() {
         return
         ;;
     --mode)
-        COMPREPLY=($(compgen -W "saver" -- "$word"))
+        COMPREPLY=($(compgen -W "saver player" -- "$word"))
         return
         ;;
     --seed | --still | --shows | --paces) return ;;
@@ -27,7 +27,7 @@ _toon() {
         ;;
     check) words="--json --help" ;;
     film)
-        words="--size --seed --walk-about --still --help"
+        words="--size --seed --mode --walk-about --still --help"
         [ "$COMP_CWORD" -le 2 ] || files='*'
         ;;
     trace) words="--size --seed --mode --walk-about --shows --paces --help" ;;

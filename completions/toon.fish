@@ -19,6 +19,6 @@ complete -c toon -n "$stage" -l seed -x -d 'of the random numbers'
 complete -c toon -n "$stage" -l walk-about -d 'a walk about in the place of a Toon'
 complete -c toon -n '__fish_seen_subcommand_from film' -F
 complete -c toon -n '__fish_seen_subcommand_from film' -l still -x -d 'the picture at a millisecond'
-complete -c toon -n '__fish_seen_subcommand_from trace' -l mode -x -a saver -d 'who shows it'
+complete -c toon -n "$stage" -l mode -x -a 'saver player' -d 'who shows it'
 complete -c toon -n '__fish_seen_subcommand_from trace' -l shows -x -d 'after how many the stage closes'
 complete -c toon -n '__fish_seen_subcommand_from trace' -l paces -x -d 'the odometer at the start'

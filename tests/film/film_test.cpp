@@ -192,7 +192,7 @@ TEST_F(Program, SaysWhatIsWrongAndLeavesNothing) {
         {"film short.zkt a.gif --seed", 2, "toon film: --seed takes a number of 0 to 4294967295\n"},
         {"film short.zkt a.gif --seed 4294967296", 2, ", not 4294967296\n"},
         {"film short.zkt a.gif --still 1s", 2, "--still takes a moment in milliseconds"},
-        {"trace short.zkt --mode editor", 2, "toon trace: --mode takes saver, not editor\n"},
+        {"trace short.zkt --mode editor", 2, "toon trace: --mode takes saver or player, not editor\n"},
         {"trace", 2, "toon trace: it takes a Toon, or --walk-about\n"},
         {"film missing.zkt a.gif", 1, "toon film: missing.zkt: it can't be read: No such file"},
         {"film no-toon.zkt a.gif", 1,

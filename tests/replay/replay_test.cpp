@@ -113,6 +113,16 @@ TEST(Cycle, RunsAsRecorded) {
     holdAgainstRecord(options, "cycle-of-three");
 }
 
+TEST(Player, PlaysOneToonOrWalksAboutOnceAsRecorded) {
+    ReplayOptions options;
+    options.mode = ReplayMode::player;
+    options.shows = 3; // there is never a second one
+    options.statements = false;
+    holdAgainstRecord(options, "player-walk-about");
+    options.toons = {toonFile("one-frame")};
+    holdAgainstRecord(options, "player-one-frame");
+}
+
 /// The lines with these words, without their times.
 Lines linesWith(const Lines& lines, const std::string& words) {
     Lines found;
