@@ -78,7 +78,7 @@ QWindow* toolkitWindow(const Window& window);
 bool inputIsBarred(HWND window, const QEvent& event);
 
 /// Shows a window that isn't shown yet.
-void showWindow(HWND window);
+void showWindow(HWND handle);
 
 /// Calls visit for each window of this program, in the order of their slots.
 void forEachWindow(const std::function<void(Window&)>& visit);
