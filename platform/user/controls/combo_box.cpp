@@ -7,7 +7,7 @@
 
 #include <QAbstractItemView>
 #include <QComboBox>
-#include <QEvent>
+#include <QFocusEvent>
 #include <QPainter>
 #include <QStyleOptionComboBox>
 #include <QStylePainter>
@@ -90,12 +90,16 @@ class DropDown : public QComboBox {
 
     void focusInEvent(QFocusEvent* event) override {
         QComboBox::focusInEvent(event);
-        notify(handle_, CBN_SETFOCUS);
+        if (event->reason() != Qt::PopupFocusReason) { // its own list is a part of it
+            notify(handle_, CBN_SETFOCUS);
+        }
     }
 
     void focusOutEvent(QFocusEvent* event) override {
         QComboBox::focusOutEvent(event);
-        notify(handle_, CBN_KILLFOCUS);
+        if (event->reason() != Qt::PopupFocusReason) {
+            notify(handle_, CBN_KILLFOCUS);
+        }
     }
 
   private:
@@ -205,7 +209,7 @@ class ComboBox : public Control {
             ODT_COMBOBOX, static_cast<UINT>(window->id), item, 0, static_cast<UINT>(line), 0};
         SendMessageA(window->parent, WM_MEASUREITEM, static_cast<WPARAM>(window->id),
                      reinterpret_cast<LPARAM>(&measured));
-        return static_cast<int>(measured.itemHeight);
+        return std::max(static_cast<int>(measured.itemHeight), 1);
     }
 
     HWND handle_;
