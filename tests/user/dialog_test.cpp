@@ -179,10 +179,14 @@ TEST_F(Dialogs, HoldWhatIsTypedToItsLimitAndGiveItAsBytes) {
                         "a?b");
     SetDlgItemTextA(dialog, 10, "longer"); // the program may
     EXPECT_EQ(text(10), "longer");
+    SendDlgItemMessageA(dialog, 10, EM_LIMITTEXT, 4, 0); // what stands there is not cut
+    EXPECT_EQ(text(10), "longer");
 
     SendDlgItemMessageA(dialog, 11, EM_LIMITTEXT, 5, 0);
     type(child<QPlainTextEdit>(), QStringLiteral("ab\ncdef"));
     EXPECT_EQ(text(11), "ab\rcd");
+    SetDlgItemTextA(dialog, 11, "a\xA0\x62\r\r"); // a hard blank stays one
+    EXPECT_EQ(text(11), "a\xA0\x62\r\r");
     SetDlgItemTextA(dialog, 11, "\xC3\xA9\rx"); // two letters, not one of UTF-8
     EXPECT_EQ(child<QPlainTextEdit>().toPlainText(), QStringLiteral("\u00C3\u00A9\nx"));
     EXPECT_EQ(text(11), "\xC3\xA9\rx");
@@ -298,8 +302,52 @@ TEST_F(Dialogs, RunUntilTheyAreEndedWhileTheirOwnerTakesNoInput) {
     EXPECT_EQ(test::runLoop(), 7U);
 }
 
+TEST_F(Dialogs, AreRedrawnHiddenAndShownWithoutAPaintOfTheProgram) {
+    const HWND item = GetDlgItem(dialog, 19);
+    for (const HWND one : {dialog, item}) {
+        InvalidateRect(one, nullptr, TRUE);
+        MSG message{};
+        EXPECT_FALSE(PeekMessageA(&message, nullptr, WM_PAINT, WM_PAINT, PM_REMOVE));
+        ShowWindow(one, SW_HIDE);
+        ShowWindow(one, SW_SHOWNORMAL);
+    }
+    EXPECT_TRUE(widget->isVisible());
+    EXPECT_TRUE(button("").isVisible());
+}
+
+TEST_F(Dialogs, ShutTheWindowsInTheirOwnerToo) {
+    test::makeWindow(10, 10, WS_CHILD | WS_VISIBLE, window);
+    QWindow* child = nullptr;
+    for (QWindow* one : QGuiApplication::allWindows()) {
+        child = one->parent() != nullptr ? one : child;
+    }
+    ASSERT_NE(child, nullptr);
+    for (const BOOL enabled : {FALSE, TRUE}) {
+        EnableWindow(window, enabled);
+        test::seen.clear();
+        test::press(child, Qt::Key_A);
+        test::handleWaiting();
+        EXPECT_EQ(test::seenAmong({WM_KEYDOWN}).size(), enabled != FALSE ? 1U : 0U);
+        // An underlined letter must not be looked for where the key itself won't arrive.
+        QKeyEvent before(QEvent::ShortcutOverride, Qt::Key_O, Qt::AltModifier);
+        EnableWindow(dialog, enabled);
+        QCoreApplication::sendEvent(widget->windowHandle(), &before);
+        EXPECT_EQ(before.isAccepted(), enabled == FALSE);
+    }
+}
+
 TEST_F(Dialogs, GoWithTheirOwner) {
     PostMessageA(window, WM_CLOSE, 0, 0);
     EXPECT_EQ(DialogBoxParamA(nullptr, "controls", window, dialogProc, 0), -1);
+    EXPECT_FALSE(IsWindow(dialog));
+}
+
+TEST_F(Dialogs, MayTakeTheirOwnerWithThem) {
+    const HWND other = test::makeWindow(10, 10, WS_POPUP, window);
+    test::handlers[WM_DESTROY] = [&](HWND dying, WPARAM, LPARAM) {
+        return dying == other ? DestroyWindow(window) : 0;
+    };
+    EXPECT_TRUE(DestroyWindow(other));
+    EXPECT_FALSE(IsWindow(window));
     EXPECT_FALSE(IsWindow(dialog));
 }

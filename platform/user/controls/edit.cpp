@@ -38,7 +38,9 @@ class LineEdit : public Control {
         if (message != EM_LIMITTEXT) {
             return std::nullopt;
         }
-        edit_->setMaxLength(static_cast<int>(wParam));
+        constexpr WPARAM most = 32767; // what 0 stands for, too
+        const int limit = static_cast<int>(wParam == 0 ? most : std::min(wParam, most));
+        edit_->setMaxLength(std::max(limit, static_cast<int>(edit_->text().size())));
         return 0;
     }
 
@@ -65,7 +67,12 @@ class TextEdit : public Control {
     }
 
     std::string text() const override {
-        return toWindows1252(edit_->toPlainText().replace(QLatin1Char('\n'), QLatin1Char('\r')));
+        QString whole = edit_->document()->toRawText(); // the plain one has no hard blanks
+        for (const QChar lineBreak :
+             {QChar(QChar::ParagraphSeparator), QChar(QChar::LineSeparator)}) {
+            whole.replace(lineBreak, QLatin1Char('\r'));
+        }
+        return toWindows1252(whole);
     }
 
     void setText(const std::string& text) override {
