@@ -136,7 +136,6 @@ void NativeWindow::resizePicture(QSize size) {
 
 bool NativeWindow::event(QEvent* event) {
     if (inputIsBarred(owner_, *event)) {
-        event->ignore();
         return true;
     }
     if (event->type() == QEvent::Close) {

@@ -74,8 +74,9 @@ HWND addWindow(std::unique_ptr<Window> window);
 /// The toolkit's window that it is, or lies in; null while there is none.
 QWindow* toolkitWindow(const Window& window);
 
-/// Whether the event is input to a window that EnableWindow has shut.
-bool inputIsBarred(HWND window, const QEvent& event);
+/// Whether the event is input to a window that EnableWindow has shut, or to one in such a window.
+/// It is then dealt with.
+bool inputIsBarred(HWND window, QEvent& event);
 
 /// Shows a window that isn't shown yet.
 void showWindow(HWND handle);

@@ -110,17 +110,19 @@ bool bringUp(HWND handle, CREATESTRUCTA& creation) {
     return findWindow(handle) != nullptr;
 }
 
-/// The keyboard goes back to what the window stood in front of; without a window manager nobody
-/// else sees to that.
+/// The keyboard goes back to the owner, or else to any other window; without a window manager
+/// nobody else sees to that.
 void passActivationOn(const Window& window) {
     const QWindow* native = toolkitWindow(window);
     if (window.parent || native == nullptr || !native->isActive()) {
         return;
     }
     QWindow* next = nullptr;
+    bool ownerFound = false;
     forEachWindow([&](const Window& other) {
-        if (!other.parent && other.visible && !other.dying && other.enabled) {
+        if (!ownerFound && !other.parent && other.visible && !other.dying && other.enabled) {
             next = toolkitWindow(other);
+            ownerFound = other.handle == window.owner;
         }
     });
     if (next != nullptr) {
@@ -129,7 +131,11 @@ void passActivationOn(const Window& window) {
 }
 
 void removeWindow(HWND handle) {
-    passActivationOn(*findWindow(handle));
+    const Window* window = findWindow(handle);
+    if (window == nullptr) {
+        return; // a handler of its end has taken its owner away, and it with it
+    }
+    passActivationOn(*window);
     killTimersOf(handle);
     forgetMessagesOf(handle);
     if (focus == handle) {
@@ -166,21 +172,33 @@ QWindow* toolkitWindow(const Window& window) {
     return window.dialog ? window.dialog->windowHandle() : window.native.get();
 }
 
-bool inputIsBarred(HWND window, const QEvent& event) {
+namespace {
+
+/// Whether the window or what it lies in is disabled.
+bool isDisabled(HWND window) {
     const Window* found = findWindow(window);
-    if (found == nullptr || found->enabled) {
+    return found != nullptr && (!found->enabled || isDisabled(found->parent));
+}
+
+} // namespace
+
+bool inputIsBarred(HWND window, QEvent& event) {
+    if (!isDisabled(window)) {
         return false;
     }
     switch (event.type()) {
+    case QEvent::ShortcutOverride:
+        event.accept(); // else an underlined letter would be found before its key is pressed
+        return true;
     case QEvent::KeyPress:
     case QEvent::KeyRelease:
-    case QEvent::ShortcutOverride:
     case QEvent::MouseButtonPress:
     case QEvent::MouseButtonRelease:
     case QEvent::MouseButtonDblClick:
     case QEvent::MouseMove:
     case QEvent::Wheel:
     case QEvent::Close:
+        event.ignore();
         return true;
     default:
         return false;
@@ -194,9 +212,11 @@ void showWindow(HWND handle) {
         return;
     }
     window->visible = true;
-    if (window->dialog) {
-        window->dialog->show();
-        window->dialog->activateWindow();
+    if (!window->native) {
+        widgetOf(*window).show();
+        if (window->dialog) {
+            window->dialog->activateWindow();
+        }
         return;
     }
     invalidate(*window, {0, 0, window->width(), window->height()}, true);
@@ -205,6 +225,9 @@ void showWindow(HWND handle) {
         takeScreens(*window);
     }
     window->native->show();
+    if (!window->parent && !window->topmost) {
+        window->native->requestActivate(); // without a window manager nobody else sees to that
+    }
 }
 
 void forEachWindow(const std::function<void(Window&)>& visit) {
@@ -225,6 +248,10 @@ void invalidate(Window& window, RECT area, bool erase) {
     area = {std::max(area.left, 0), std::max(area.top, 0), std::min(area.right, window.width()),
             std::min(area.bottom, window.height())};
     if (area.left >= area.right || area.top >= area.bottom) {
+        return;
+    }
+    if (!window.native) {
+        widgetOf(window).update(); // it paints itself: a WM_PAINT would never be answered
         return;
     }
     const RECT& old = window.update;
