@@ -40,6 +40,9 @@ int CreatePlayerWindow(HINSTANCE instance, HWND parent) {
 }
 
 int RunPlayer(HINSTANCE instance, HWND parent, const char* name) {
+    if (IsWindow(PlayerWindow)) {
+        return 0; // there is one stage: a double-click that comes late opens no second player
+    }
     if (!PlayerClassInstance && !PlayerClassSetup(instance)) {
         return 0;
     }

@@ -10,7 +10,7 @@ extern HINSTANCE PlayerClassInstance; // for which the class was set up; null un
 extern HWND PlayerWindow;             // null until one has been made
 
 /// Shows the Toon of that bare name in the current directory, or walks about once for an empty
-/// name, until it is over. 0, also if the window can't be made.
+/// name, until it is over. 0, also if the window can't be made or there is one already.
 int RunPlayer(HINSTANCE instance, HWND parent, const char* name);
 
 BOOL PlayerClassSetup(HINSTANCE instance); ///< nonzero on success

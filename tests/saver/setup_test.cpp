@@ -275,6 +275,23 @@ TEST_F(Setup, AHundredOpeningsAndPlaysLeaveNothingBehind) {
     EXPECT_LE(mallinfo2().uordblks, heap + slack);
 }
 
+TEST_F(Setup, ADoubleClickThatComesLateOpensNoSecondPlayer) {
+    ToonFrame frame{};
+    frame.pause = 1;
+    putToon("one.zkt", "One", {frame});
+    open();
+    pressKeyAt = "timer_set timer=PAUSE";
+    // What the second and third press of a held space bar leave in the queue.
+    for (int i = 0; i < 2; ++i) {
+        PostMessageA(dialog, WM_COMMAND, static_cast<WPARAM>(MAKELONG(1043, LBN_DBLCLK)), 0);
+    }
+    record.clear();
+    openEntry("one.zkt");
+    pressKeyAt = "";
+    EXPECT_FALSE(IsWindow(PlayerWindow));
+    EXPECT_EQ(RecordedStage::count("timer_set timer=SHOWSTART"), 1U);
+}
+
 TEST_F(Setup, PlayerIgnoresThePointerAndTheOtherButtons) {
     open();
     std::vector<bool> alive;
