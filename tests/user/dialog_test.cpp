@@ -247,6 +247,13 @@ TEST_F(Dialogs, LeaveTheDrawingOfItemsAndTheThumbToTheProgram) {
 
 TEST_F(Dialogs, KeepTheirKeysAndTheOrderOfTheirTabs) {
     EXPECT_EQ(widget->focusWidget(), &child<QLineEdit>());
+    button("&Left").setFocus();
+    button("&Left").click();
+    test::press(&button("&Left"), Qt::Key_Right); // the arrows go from one to the other
+    EXPECT_EQ(IsDlgButtonChecked(dialog, 16), 1U);
+    test::handleWaiting();
+    commands.clear();
+    child<QLineEdit>().setFocus();
     std::vector<QString> reached;
     for (int i = 0; i < 11; ++i) {
         QKeyEvent tab(QEvent::KeyPress, Qt::Key_Tab, Qt::NoModifier);

@@ -33,6 +33,19 @@ class DrawnButton : public QPushButton {
     HWND handle_;
 };
 
+/// The toolkit makes the one of a group that has the focus a tab stop: only the template does.
+class RadioButton : public QRadioButton {
+  public:
+    using QRadioButton::QRadioButton;
+
+  protected:
+    void focusInEvent(QFocusEvent* event) override {
+        const Qt::FocusPolicy policy = focusPolicy();
+        QRadioButton::focusInEvent(event);
+        setFocusPolicy(policy);
+    }
+};
+
 QAbstractButton* makeWidget(DWORD style, HWND handle, QWidget& dialog) {
     switch (style & BS_TYPEMASK) {
     case BS_OWNERDRAW:
@@ -40,7 +53,7 @@ QAbstractButton* makeWidget(DWORD style, HWND handle, QWidget& dialog) {
     case BS_AUTOCHECKBOX:
         return new QCheckBox(&dialog);
     case BS_AUTORADIOBUTTON:
-        return new QRadioButton(&dialog);
+        return new RadioButton(&dialog);
     default:
         auto* button = new QPushButton(&dialog);
         button->setDefault((style & BS_TYPEMASK) == BS_DEFPUSHBUTTON);
