@@ -496,6 +496,11 @@ BOOL GetWindowRect(HWND window, RECT* place) {
         return FALSE;
     }
     *place = found->place;
+    if (found->dialog) { // the user may have moved it
+        const QRect now = found->dialog->geometry().translated(-screenOrigin());
+        *place = {now.left(), now.top(), now.right() + 1, now.bottom() + 1};
+        return TRUE;
+    }
     for (const Window* outer = findWindow(found->parent); outer != nullptr;
          outer = findWindow(outer->parent)) {
         place->left += outer->place.left;

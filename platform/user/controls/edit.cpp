@@ -30,7 +30,7 @@ class LineEdit : public Control {
     /// What the program writes may be longer than what can be typed.
     void setText(const std::string& text) override {
         const QString shown = fromWindows1252(text.data(), text.size());
-        edit_->setMaxLength(std::max(edit_->maxLength(), static_cast<int>(shown.size())));
+        edit_->setMaxLength(std::max(limit_, static_cast<int>(shown.size())));
         edit_->setText(shown);
     }
 
@@ -38,14 +38,16 @@ class LineEdit : public Control {
         if (message != EM_LIMITTEXT) {
             return std::nullopt;
         }
-        constexpr WPARAM most = 32767; // what 0 stands for, too
-        const int limit = static_cast<int>(wParam == 0 ? most : std::min(wParam, most));
-        edit_->setMaxLength(std::max(limit, static_cast<int>(edit_->text().size())));
+        limit_ = static_cast<int>(wParam == 0 ? most : std::min(wParam, WPARAM{most}));
+        edit_->setMaxLength(std::max(limit_, static_cast<int>(edit_->text().size())));
         return 0;
     }
 
   private:
+    static constexpr int most = 32767; // what a limit of 0 stands for, too
+
     QLineEdit* edit_;
+    int limit_ = most;
 };
 
 class TextEdit : public Control {
@@ -78,6 +80,7 @@ class TextEdit : public Control {
     void setText(const std::string& text) override {
         const QSignalBlocker quiet(edit_);
         edit_->setPlainText(fromWindows1252(text.data(), text.size())
+                                .replace(QLatin1String("\r\n"), QLatin1String("\r"))
                                 .replace(QLatin1Char('\r'), QLatin1Char('\n')));
         accepted_ = edit_->toPlainText();
     }
