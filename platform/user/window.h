@@ -12,6 +12,7 @@
 #include <string>
 
 class QEvent;
+class QWidget;
 class QWindow;
 
 namespace seam {
@@ -74,6 +75,9 @@ HWND addWindow(std::unique_ptr<Window> window);
 /// The toolkit's window that it is, or lies in; null while there is none.
 QWindow* toolkitWindow(const Window& window);
 
+/// The widget of a dialog or a control.
+QWidget& widgetOf(const Window& window);
+
 /// Whether the event is input to a window that EnableWindow has shut, or to one in such a window.
 /// It is then dealt with.
 bool inputIsBarred(HWND window, QEvent& event);
@@ -90,6 +94,15 @@ HWND topLevelOf(HWND window);
 /// Which window takes the keys that reach this one: the one that SetFocus named, if both lie in the
 /// same top-level window.
 HWND keyTarget(HWND window);
+
+/// The window no longer has the keys of its top-level window.
+void forgetFocus(HWND window);
+
+/// What its place is counted from: the screen's corner, or its parent's.
+QPoint originOf(const Window& window);
+
+/// Sends WM_SIZE and WM_MOVE with its size and place.
+void sendSizeAndPlace(const Window& window);
 
 /// Adds to what has to be painted; the area is clipped to the window.
 void invalidate(Window& window, RECT area, bool erase);
