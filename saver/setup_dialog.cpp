@@ -94,25 +94,22 @@ static BOOL MakeDirectory(char* result, const char* directory, std::size_t lengt
     return TRUE;
 }
 
-/// The length of the directory without its last element and the backslash before it; 0 if it has
-/// none to take off.
-static std::size_t ParentLength(const char* directory) {
+/// Takes the last element off a directory, which ends in a backslash; FALSE if it has none.
+static BOOL MakeParent(char* directory) {
     std::size_t length = std::strlen(directory);
-    while (length > 0 && directory[length - 1] == '\\') {
-        --length;
+    for (length -= length > 0 ? 1 : 0; length > 0; --length) {
+        if (directory[length - 1] == '\\') {
+            return MakeDirectory(directory, directory, length - 1, "", 0);
+        }
     }
-    while (length > 0 && directory[length - 1] != '\\') {
-        --length;
-    }
-    return length > 0 ? length - 1 : 0;
+    return FALSE;
 }
 
 EntryStep StepDirectory(char* directory, const char* entry) {
     const std::size_t length = std::strlen(directory);
     BOOL fits = FALSE;
     if (std::strncmp(entry, "[..]", 4) == 0) {
-        const std::size_t parent = ParentLength(directory);
-        fits = parent > 0 && MakeDirectory(directory, directory, parent, "", 0);
+        fits = MakeParent(directory);
     } else if (std::strncmp(entry, "[-", 2) == 0 && entry[2] != '\0') {
         const char drive[] = {entry[2], ':'};
         fits = MakeDirectory(directory, "", 0, drive, sizeof drive);

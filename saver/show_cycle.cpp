@@ -270,7 +270,7 @@ static LRESULT OnCreate(HWND window, HINSTANCE instance) {
     return 0;
 }
 
-static LRESULT OnTimer(HWND window, HINSTANCE instance, UINT_PTR timer) {
+LRESULT ShowTimer(HWND window, HINSTANCE instance, UINT_PTR timer) {
     if (timer == TIMER_SHOWSTART) {
         KillTimer(window, TIMER_SHOWSTART);
         StartNextShow(window, instance);
@@ -280,8 +280,7 @@ static LRESULT OnTimer(HWND window, HINSTANCE instance, UINT_PTR timer) {
     return 0;
 }
 
-/// The stage has another size: its picture is made anew, and a walk under way goes on.
-static LRESULT OnSize(HWND window, HINSTANCE instance, DWORD size) {
+LRESULT ShowResize(HWND window, HINSTANCE instance, DWORD size) {
     if (size != StageSize) {
         StageSize = size;
         RebuildBackdrop(window, instance);
@@ -308,14 +307,14 @@ LRESULT ShowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
         PostQuitMessage(0);
         return 0;
     case WM_SIZE:
-        return OnSize(window, instance, static_cast<DWORD>(lParam));
+        return ShowResize(window, instance, static_cast<DWORD>(lParam));
     case WM_PAINT:
         PaintStage(window, &StageRepaintFlag);
         return 0;
     case WM_ERASEBKGND:
         return 1;
     case WM_TIMER:
-        return OnTimer(window, instance, wParam);
+        return ShowTimer(window, instance, wParam);
     case TM_SHOWDONE:
         return OnShowDone(window, instance);
     case TM_WALKDONE:

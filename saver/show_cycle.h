@@ -34,6 +34,13 @@ void ShowSetup(HWND window, HINSTANCE instance);
 /// Ends it: frees all that, and saves the settings.
 void ShowTeardown(HWND window);
 
+/// Answers WM_TIMER of a stage: the show starts, or the stage's own timers go on. Gives 0.
+LRESULT ShowTimer(HWND window, HINSTANCE instance, UINT_PTR timer);
+
+/// Answers WM_SIZE of a stage: at another size its picture is made anew, and a walk under way goes
+/// on. `size` is the width and, in the high word, the height. Gives 0.
+LRESULT ShowResize(HWND window, HINSTANCE instance, DWORD size);
+
 /// Clears the counters between two shows and parks the character.
 void ShowReset(HWND window);
 

@@ -53,21 +53,6 @@ int RunPlayer(HINSTANCE instance, HWND parent, const char* name) {
     return RunWindowLoop(PlayerWindow);
 }
 
-static LRESULT ToTheTop(HWND window) {
-    SetWindowPos(window, HWND_TOP, 0, 0, 0, 0, SWP_NOSIZE);
-    return 0;
-}
-
-static LRESULT PlayerTimer(HWND window, HINSTANCE instance, UINT_PTR timer) {
-    if (timer == TIMER_SHOWSTART) {
-        KillTimer(window, timer);
-        StartNextShow(window, instance);
-    } else {
-        StageTimerDispatch(window, timer);
-    }
-    return 0;
-}
-
 LRESULT PlayerProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
     const HINSTANCE instance = WindowInstance(window);
     switch (message) {
@@ -79,7 +64,8 @@ LRESULT PlayerProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
         PostQuitMessage(0);
         return 0;
     case WM_SIZE:
-        return ToTheTop(window);
+        SetWindowPos(window, HWND_TOP, 0, 0, 0, 0, SWP_NOSIZE);
+        return ShowResize(window, instance, static_cast<DWORD>(lParam));
     case WM_ACTIVATE:
         StageRepaintFlag = 1;
         return 0;
@@ -96,7 +82,7 @@ LRESULT PlayerProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
         SendMessageA(window, WM_CLOSE, 0, 0);
         return 1;
     case WM_TIMER:
-        return PlayerTimer(window, instance, wParam);
+        return ShowTimer(window, instance, wParam);
     case TM_WALKDONE:
         WalkDoneDispatch(window);
         return 0;

@@ -138,6 +138,7 @@ TEST(SetupSteps, ChangeTheDirectoryAsTheEntrySays) {
         {"c:\\games\\toons\\", "[..]", EntryStep::moved, "c:\\games\\"},
         {"c:\\games\\", "[..]", EntryStep::moved, "c:\\"},
         {"c:\\", "[..]", EntryStep::refused, "c:\\"}, // what is left has no backslash
+        {"\\tmp\\", "[..]", EntryStep::moved, "\\"},  // no drive: the root of the present one
         {"\\", "[..]", EntryStep::refused, "\\"},
         {"toons\\", "[..]", EntryStep::refused, "toons\\"},
         {"", "[..]", EntryStep::refused, ""},
@@ -292,17 +293,21 @@ TEST_F(Setup, ADoubleClickThatComesLateOpensNoSecondPlayer) {
     EXPECT_EQ(RecordedStage::count("timer_set timer=SHOWSTART"), 1U);
 }
 
-TEST_F(Setup, PlayerIgnoresThePointerAndTheOtherButtons) {
+TEST_F(Setup, PlayerIgnoresThePointerAndFollowsItsSize) {
     open();
     std::vector<bool> alive;
+    DWORD stageSize = 0;
     QTimer::singleShot(0, [&] {
         for (const UINT message : {WM_MOUSEMOVE, WM_RBUTTONDOWN, WM_MBUTTONDOWN, WM_KEYUP}) {
             SendMessageA(PlayerWindow, message, 0, 0);
             alive.push_back(IsWindow(PlayerWindow) != FALSE);
         }
+        MoveWindow(PlayerWindow, 5, 5, 300, 200, FALSE);
+        stageSize = StageSize;
         SendMessageA(PlayerWindow, WM_SYSKEYDOWN, 0x12, 0);
         alive.push_back(IsWindow(PlayerWindow) != FALSE);
     });
     EXPECT_EQ(RunPlayer(GetModuleHandleA(nullptr), nullptr, ""), 0);
     EXPECT_THAT(alive, ElementsAre(true, true, true, true, false));
+    EXPECT_EQ(stageSize, MAKELONG(300, 200)) << "the stage follows its window";
 }
