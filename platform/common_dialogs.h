@@ -1,4 +1,4 @@
-// The record that the dialogs for choosing a file work on.
+// The dialogs for choosing a file.
 #pragma once
 
 #include "platform/types.h"
@@ -27,3 +27,11 @@ struct OPENFILENAME {
     LRESULT (*lpfnHook)(HWND, UINT, WPARAM, LPARAM);
     const char* lpTemplateName;
 };
+
+/// Lets the user choose a file to open or to write to, over hwndOwner, and writes its path to
+/// lpstrFile; FALSE if it was cancelled, and then lpstrFile stays. Any name may be typed, of a file
+/// that exists or not; it is taken as typed, and nobody asks about overwriting. A path that
+/// lpstrFile can't hold is refused with a message and the dialog stays. The current directory stays
+/// as it is. Timers and paints go on meanwhile.
+BOOL GetOpenFileNameA(OPENFILENAME* dialog);
+BOOL GetSaveFileNameA(OPENFILENAME* dialog);

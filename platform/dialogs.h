@@ -64,7 +64,6 @@ BOOL IsWindowEnabled(HWND window);
 // ---- Styles of controls
 // ----------------------------------------------------------------------------
 
-constexpr DWORD WS_BORDER = 0x00800000;
 constexpr DWORD WS_CAPTION = 0x00C00000;
 constexpr DWORD WS_SYSMENU = 0x00080000;
 constexpr DWORD WS_VSCROLL = 0x00200000;
@@ -110,6 +109,8 @@ constexpr WORD CBN_SETFOCUS = 3;
 constexpr WORD CBN_KILLFOCUS = 4;
 constexpr WORD CBN_DROPDOWN = 7;
 constexpr WORD CBN_CLOSEUP = 8;
+
+constexpr UINT WM_SETFONT = 0x0030; // wParam: the font of its text
 
 constexpr UINT EM_LIMITTEXT = 0x00C5; // the most bytes that can be typed
 

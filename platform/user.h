@@ -29,6 +29,8 @@ constexpr UINT WM_SETCURSOR = 0x0020;
 constexpr UINT WM_HELP = 0x0053;
 constexpr UINT WM_CONTEXTMENU = 0x007B;
 constexpr UINT WM_NCDESTROY = 0x0082;
+constexpr UINT WM_NCHITTEST = 0x0084;     // lParam: a point of the screen; what lies there?
+constexpr UINT WM_NCLBUTTONDOWN = 0x00A1; // wParam: what WM_NCHITTEST gave
 constexpr UINT WM_KEYDOWN = 0x0100;
 constexpr UINT WM_KEYUP = 0x0101;
 constexpr UINT WM_SYSKEYDOWN = 0x0104;
@@ -50,6 +52,16 @@ constexpr WPARAM SC_NEXTWINDOW = 0xF040;
 constexpr WPARAM SC_PREVWINDOW = 0xF050;
 constexpr WPARAM SC_CLOSE = 0xF060;
 constexpr WPARAM SC_SCREENSAVE = 0xF140;
+
+// The answers to WM_NCHITTEST. The mouse's messages reach a window where it gives HTCLIENT.
+constexpr LRESULT HTNOWHERE = 0; // nothing comes of it
+constexpr LRESULT HTCLIENT = 1;
+constexpr LRESULT HTCAPTION = 2; // the left button drags the window
+
+// wParam of WM_ACTIVATE. Its high word is other than 0 for a minimised window.
+constexpr WPARAM WA_INACTIVE = 0;
+constexpr WPARAM WA_ACTIVE = 1;
+constexpr WPARAM WA_CLICKACTIVE = 2;
 
 struct MSG {
     HWND hwnd;
@@ -123,7 +135,10 @@ constexpr DWORD WS_POPUP = 0x80000000;
 constexpr DWORD WS_CHILD = 0x40000000;
 constexpr DWORD WS_VISIBLE = 0x10000000;
 constexpr DWORD WS_CLIPSIBLINGS = 0x04000000;
-constexpr DWORD WS_CLIPCHILDREN = 0x02000000;
+constexpr DWORD WS_CLIPCHILDREN =
+    0x02000000; // what is invalidated in it doesn't reach its children
+constexpr DWORD WS_BORDER =
+    0x00800000; // a black line round it; of a child of a native window: none
 constexpr DWORD WS_EX_TOPMOST = 0x00000008;
 
 struct CREATESTRUCTA {
@@ -143,10 +158,11 @@ struct CREATESTRUCTA {
 
 /// Makes a window and runs its WM_CREATE, WM_SIZE and WM_MOVE before it returns, and shows it if
 /// WS_VISIBLE stands. With WS_CHILD it lies in `parent`, a window of this program or, by its id,
-/// of another. A WS_EX_TOPMOST window that fills the primary monitor goes on filling it when that
-/// changes, stays above windows that appear later, and turns the other monitors black; input there
-/// is input to it. Null if the class is unknown, the parent is no window, WM_CREATE gave -1, or
-/// there is no display.
+/// of another. A top-level window with WS_BORDER gives a pixel on each side to that line, and can
+/// hold children of the class "button", which are controls (platform/dialogs.h). A WS_EX_TOPMOST
+/// window that fills the primary monitor goes on filling it when that changes, stays above windows
+/// that appear later, and turns the other monitors black; input there is input to it. Null if the
+/// class is unknown, the parent is no window, WM_CREATE gave -1, or there is no display.
 HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DWORD style, int x,
                      int y, int width, int height, HWND parent, HMENU menu, HINSTANCE instance,
                      void* parameter);
@@ -157,8 +173,9 @@ BOOL DestroyWindow(HWND window);
 
 /// The platform's own answer: WM_CLOSE destroys the window and so does WM_ENDSESSION, which the
 /// signals that ask a process to end bring; the SC_CLOSE of WM_SYSCOMMAND sends WM_CLOSE. WM_PAINT
-/// validates, WM_ERASEBKGND fills with the class's brush, WM_SETCURSOR sets the class's cursor,
-/// WM_SETTEXT the title.
+/// validates, WM_ERASEBKGND fills with the class's brush, WM_SETCURSOR sets the class's cursor over
+/// the client area and else the arrow, WM_SETTEXT the title. WM_NCHITTEST is HTCLIENT, and
+/// WM_NCLBUTTONDOWN on HTCAPTION lets the user drag a top-level window.
 LRESULT DefWindowProcA(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
 
 BOOL IsWindow(HWND window); ///< also true of a window of another program on the same display
@@ -171,6 +188,7 @@ HWND FindWindowA(const char* className, const char* title);
 
 constexpr int SW_HIDE = 0;
 constexpr int SW_SHOWNORMAL = 1;
+constexpr int SW_MINIMIZE = 6; // nothing where no window manager could bring the window back
 BOOL ShowWindow(HWND window, int command); ///< whether it was visible before
 
 BOOL MoveWindow(HWND window, int x, int y, int width, int height, BOOL repaint);
@@ -196,6 +214,9 @@ DWORD SetClassLongA(HWND window, int index, LONG value); ///< the value before
 BOOL GetWindowRect(HWND window, RECT* place);
 
 BOOL GetClientRect(HWND window, RECT* area); ///< left and top are 0; also of another's window
+
+BOOL ScreenToClient(HWND window, POINT* point);     ///< from the screen's pixels to the window's
+BOOL SetWindowTextA(HWND window, const char* text); ///< sends WM_SETTEXT
 
 /// Says which window takes the keys that reach its top-level window; gives the one that had them,
 /// null if none of this program.
@@ -241,26 +262,26 @@ using TIMERPROC = void (*)(HWND window, UINT message, UINT_PTR timer, DWORD time
 UINT_PTR SetTimer(HWND window, UINT_PTR timer, UINT milliseconds, TIMERPROC procedure);
 BOOL KillTimer(HWND window, UINT_PTR timer); ///< TRUE if it ran; a tick that waits is dropped
 
-// ---- Pointer, screen, menu, boxes
+// ---- Pointer, screen, boxes
 // ------------------------------------------------------------------------
 
 constexpr ResourceName IDC_ARROW{32512};
 constexpr ResourceName IDC_WAIT{32514};
 HCURSOR LoadCursorA(HINSTANCE instance, ResourceName name); ///< null instance: the system's own
-HICON LoadIconA(HINSTANCE instance, ResourceName name);     ///< of the program; null if none
-HCURSOR SetCursor(HCURSOR cursor);                          ///< null: none; gives the one before
+BOOL DestroyCursor(HCURSOR cursor); ///< TRUE if there is such a cursor; it lasts with the program
+HICON LoadIconA(HINSTANCE instance, ResourceName name); ///< of the program; null if none
+HCURSOR SetCursor(HCURSOR cursor);                      ///< null: none; gives the one before
 int ShowCursor(BOOL show); ///< the display count after it; the pointer shows from 0 up
 BOOL GetCursorPos(POINT* point);
+/// Also the window that lies there is asked for its cursor anew, by a WM_MOUSEMOVE.
 BOOL SetCursorPos(int x, int y);
 
-constexpr int SM_CXSCREEN = 0;
+constexpr int SM_CXSCREEN = 0; // of the primary monitor, in pixels
 constexpr int SM_CYSCREEN = 1;
-int GetSystemMetrics(int index); ///< of the primary monitor, in pixels; 0 for any other index
+constexpr int SM_CXBORDER = 5; // of the line that WS_BORDER draws
+constexpr int SM_CYBORDER = 6;
+int GetSystemMetrics(int index); ///< 0 for any other index
 
-constexpr UINT MF_ENABLED = 0;
-constexpr UINT MF_GRAYED = 1;
-HMENU GetMenu(HWND window);                              ///< null for a window without a menu
-BOOL EnableMenuItem(HMENU menu, UINT item, UINT enable); ///< -1 if there is no such item
 BOOL MessageBeep(UINT type);
 
 constexpr UINT MB_OK = 0x00;

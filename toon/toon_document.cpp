@@ -1,5 +1,6 @@
 #include "toon/toon_document.h"
 
+#include "platform/menus.h"
 #include "platform/trace.h"
 
 #include <algorithm>

@@ -1,6 +1,7 @@
 // Message boxes, dialogs, menus and the guard against exceptions.
 #include "platform/harness.h"
 #include "platform/kernel.h"
+#include "platform/menus.h"
 #include "platform/trace.h"
 #include "platform/user/overlay.h"
 #include "platform/user/text.h"
