@@ -24,15 +24,9 @@ namespace seam {
 namespace {
 
 LRESULT dialogProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
-LRESULT controlProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
 
 WindowClass& dialogClass() {
     static WindowClass windowClass{"dialog", 0, dialogProcedure, {}, {}, {}, {}};
-    return windowClass;
-}
-
-WindowClass& controlClass() {
-    static WindowClass windowClass{"control", 0, controlProcedure, {}, {}, {}, {}};
     return windowClass;
 }
 
@@ -54,16 +48,6 @@ LRESULT dialogProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam)
     return result != 0 || message == WM_INITDIALOG
                ? result
                : dialogsOwnAnswer(window, message, wParam, lParam);
-}
-
-LRESULT controlProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
-    Control& control = *findWindow(window)->control;
-    if (message == WM_SETTEXT) {
-        const auto* text = reinterpret_cast<const char*>(lParam);
-        control.setText(text == nullptr ? "" : text);
-        return TRUE;
-    }
-    return control.answer(message, wParam, lParam).value_or(0);
 }
 
 std::optional<DialogTemplate> loadTemplate(HINSTANCE instance, ResourceName name) {
@@ -99,32 +83,16 @@ void orderTabs(const std::vector<QWidget*>& widgets) {
     }
 }
 
-/// Makes the controls; false if there are too many windows.
+/// Makes the controls; false if one of them can't be made.
 bool addControls(const Window& owner, const DialogTemplate& made) {
     DialogWindow& dialog = *owner.dialog;
-    const HWND parent = owner.handle;
     std::vector<QWidget*> widgets;
     for (const ControlTemplate& control : made.controls) {
-        auto record = std::make_unique<Window>();
-        Window& window = *record;
-        window.windowClass = &controlClass();
-        window.instance = owner.instance;
-        window.parent = parent;
-        window.style = control.style;
-        window.id = control.id;
-        window.visible = true;
-        const HWND handle = addWindow(std::move(record));
+        const HWND handle = addControl(control, owner.handle, owner.instance, dialog);
         if (!handle) {
             return false;
         }
-        window.control = makeControl(control, handle, dialog);
-        if (!window.control) {
-            DestroyWindow(handle);
-            continue;
-        }
-        const QRect place = window.control->widget().geometry();
-        window.place = {place.left(), place.top(), place.right() + 1, place.bottom() + 1};
-        widgets.push_back(&window.control->widget());
+        widgets.push_back(&widgetOf(*findWindow(handle)));
     }
     groupButtons(dialog, made, widgets);
     orderTabs(widgets);

@@ -9,6 +9,7 @@
 #include <QGuiApplication>
 
 #include <cstdlib>
+#include <cstring>
 #include <memory>
 #include <vector>
 #include <xcb/xcb.h>
@@ -118,6 +119,31 @@ bool foreignSize(HWND window, SIZE& size) {
     }
     size = {geometry->width, geometry->height};
     return true;
+}
+
+bool windowsAreManaged() {
+    xcb_connection_t* connection = xConnection();
+    if (connection == nullptr) {
+        return true;
+    }
+    // A window manager tells of itself by a property of the root window, which outlives it: the id
+    // of a window that doesn't.
+    constexpr std::string_view name = "_NET_SUPPORTING_WM_CHECK";
+    const auto atom = own(xcb_intern_atom_reply(
+        connection, xcb_intern_atom(connection, 1, name.size(), name.data()), nullptr));
+    if (atom == nullptr || atom->atom == XCB_ATOM_NONE) {
+        return false;
+    }
+    const xcb_window_t root = xcb_setup_roots_iterator(xcb_get_setup(connection)).data->root;
+    const auto property = own(xcb_get_property_reply(
+        connection, xcb_get_property(connection, 0, root, atom->atom, XCB_ATOM_WINDOW, 0, 1),
+        nullptr));
+    if (property == nullptr || xcb_get_property_value_length(property.get()) != 4) {
+        return false;
+    }
+    xcb_window_t check = 0;
+    std::memcpy(&check, xcb_get_property_value(property.get()), sizeof check);
+    return foreignExists(HWND{check});
 }
 
 HWND foreignFocus() {

@@ -23,6 +23,10 @@ void followHost(HWND parent, HWND child);
 /// Ends that.
 void leaveHost(HWND child);
 
+/// Whether a window manager is at work, so that a minimised window can be brought back. Said to be
+/// so where the platform of the toolkit is another one than X11.
+bool windowsAreManaged();
+
 /// The window with the keyboard, by the X server's word.
 HWND foreignFocus();
 

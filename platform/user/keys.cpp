@@ -1,8 +1,11 @@
 #include "platform/user/keys.h"
 
 #include "platform/user/queue.h"
+#include "platform/user/toolkit.h"
 
 #include <QKeyEvent>
+#include <QMouseEvent>
+#include <QWheelEvent>
 
 #include <algorithm>
 #include <array>
@@ -45,6 +48,13 @@ WPARAM codeOf(int key) {
     return found == keyCodes.end() ? 0xFF : found->code; // 0xFF: a key without a code
 }
 
+/// The wParam of mouse messages: which buttons are down.
+WPARAM buttonsOf(Qt::MouseButtons buttons) {
+    return ((buttons & Qt::LeftButton) != 0 ? 1U : 0U) |
+           ((buttons & Qt::RightButton) != 0 ? 2U : 0U) |
+           ((buttons & Qt::MiddleButton) != 0 ? 16U : 0U);
+}
+
 } // namespace
 
 void queueKey(HWND window, const QKeyEvent& event, bool down) {
@@ -56,6 +66,18 @@ void queueKey(HWND window, const QKeyEvent& event, bool down) {
     queueInput({window, message, codeOf(event.key()), repeated | 1, 0});
 }
 
+void queueMouse(HWND window, UINT message, const QMouseEvent& event, QPoint corner) {
+    const QPoint at = event.position().toPoint() - corner;
+    queueInput({window, message, buttonsOf(event.buttons()),
+                static_cast<LPARAM>(MAKELONG(at.x(), at.y())), 0});
+}
+
+void queueWheel(HWND window, const QWheelEvent& event) {
+    const QPoint at = event.globalPosition().toPoint() - screenOrigin();
+    queueInput({window, WM_MOUSEWHEEL, static_cast<WPARAM>(MAKELONG(0, event.angleDelta().y())),
+                static_cast<LPARAM>(MAKELONG(at.x(), at.y())), 0});
+}
+
 UINT buttonMessage(Qt::MouseButton button, bool down) {
     switch (button) {
     case Qt::LeftButton:
@@ -65,12 +87,6 @@ UINT buttonMessage(Qt::MouseButton button, bool down) {
     default:
         return down ? WM_MBUTTONDOWN : WM_MBUTTONUP;
     }
-}
-
-WPARAM buttonsOf(Qt::MouseButtons buttons) {
-    return ((buttons & Qt::LeftButton) != 0 ? 1U : 0U) |
-           ((buttons & Qt::RightButton) != 0 ? 2U : 0U) |
-           ((buttons & Qt::MiddleButton) != 0 ? 16U : 0U);
 }
 
 } // namespace seam

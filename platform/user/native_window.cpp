@@ -15,11 +15,6 @@
 #include <QMouseEvent>
 #include <QPaintEvent>
 #include <QPainter>
-#include <QWheelEvent>
-
-#include <algorithm>
-#include <cstring>
-#include <utility>
 
 namespace seam {
 
@@ -30,7 +25,16 @@ namespace {
 /// longer can show a step half drawn; asking it at each step would cost twice the wake-ups.
 constexpr std::int64_t fetchTime = 50;
 
-PictureWatcher pictureWatcher;
+/// Without a window manager nobody else gives a window the keyboard that is clicked in.
+void activateHost(const QWindow& child) {
+    QWindow* host = child.parent();
+    while (host->parent() != nullptr) {
+        host = host->parent();
+    }
+    if (!host->isActive()) {
+        host->requestActivate();
+    }
+}
 
 QRect toQt(const RECT& area) {
     return {area.left, area.top, area.right - area.left, area.bottom - area.top};
@@ -38,12 +42,8 @@ QRect toQt(const RECT& area) {
 
 } // namespace
 
-void watchPictures(PictureWatcher watcher) {
-    pictureWatcher = std::move(watcher);
-}
-
 NativeWindow::NativeWindow(HWND owner, const QRect& place, bool topmost, QWindow* parent)
-    : QWindow(parent), owner_(owner), store_(this) {
+    : QWindow(parent), WindowPicture(owner), store_(this) {
     setSurfaceType(QSurface::RasterSurface);
     if (parent == nullptr) {
         Qt::WindowFlags flags = Qt::Window | Qt::FramelessWindowHint;
@@ -51,14 +51,12 @@ NativeWindow::NativeWindow(HWND owner, const QRect& place, bool topmost, QWindow
             flags |= Qt::WindowStaysOnTopHint | Qt::X11BypassWindowManagerHint;
         }
         setFlags(flags);
+    } else if (parent->type() != Qt::ForeignWindow) {
+        setFlag(Qt::WindowDoesNotAcceptFocus); // the keyboard stays with the top-level window
     }
     setGeometry(place);
     create();
     resizePicture(place.size());
-}
-
-NativeWindow::~NativeWindow() {
-    dropSurface(*this);
 }
 
 QImage* NativeWindow::storeImage() {
@@ -81,19 +79,7 @@ void NativeWindow::touch(const RECT& area) {
         store_.beginPaint(rectangle);
         store_.endPaint();
     }
-    dirty_ |= rectangle;
-    if (pictureWatcher) {
-        untold_ |= rectangle;
-    }
-}
-
-void NativeWindow::tellWatcher() {
-    const QRect drawn = std::exchange(untold_, QRect());
-    if (pictureWatcher && !drawn.isEmpty()) {
-        const RECT area{drawn.x(), drawn.y(), drawn.x() + drawn.width(),
-                        drawn.y() + drawn.height()};
-        pictureWatcher(owner_, area, pixels());
-    }
+    WindowPicture::touch(area);
 }
 
 void NativeWindow::flush() {
@@ -112,12 +98,7 @@ void NativeWindow::flush() {
 }
 
 void NativeWindow::resizePicture(QSize size) {
-    const PixelView old = pixels();
-    const QImage kept = old.bits == nullptr
-                            ? QImage()
-                            : QImage(reinterpret_cast<const uchar*>(old.bits), old.width,
-                                     old.height, old.stride * 4, QImage::Format_RGB32)
-                                  .copy();
+    const QImage kept = copyPicture();
     shadow_ = QImage();
     store_.resize(size);
     const QImage* image = storeImage();
@@ -127,11 +108,7 @@ void NativeWindow::resizePicture(QSize size) {
         shadow_ = QImage(size, QImage::Format_RGB32);
         shadow_.fill(Qt::black);
     }
-    const PixelView now = pixels();
-    for (int y = 0; y < std::min(now.height, kept.height()); ++y) {
-        std::memcpy(now.bits + static_cast<std::ptrdiff_t>(y) * now.stride, kept.constScanLine(y),
-                    static_cast<std::size_t>(std::min(now.width, kept.width())) * 4);
-    }
+    pastePicture(kept);
 }
 
 bool NativeWindow::event(QEvent* event) {
@@ -178,27 +155,23 @@ void NativeWindow::keyReleaseEvent(QKeyEvent* event) {
     queueKey(keyTarget(owner_), *event, false);
 }
 
-void NativeWindow::queueMouse(UINT message, const QMouseEvent& event, WPARAM wParam) {
-    const QPoint at = event.position().toPoint();
-    queueInput({owner_, message, wParam, static_cast<LPARAM>(MAKELONG(at.x(), at.y())), 0});
-}
-
 void NativeWindow::mouseMoveEvent(QMouseEvent* event) {
-    queueMouse(WM_MOUSEMOVE, *event, buttonsOf(event->buttons()));
+    queueMouse(owner_, WM_MOUSEMOVE, *event);
 }
 
 void NativeWindow::mousePressEvent(QMouseEvent* event) {
-    queueMouse(buttonMessage(event->button(), true), *event, buttonsOf(event->buttons()));
+    if ((flags() & Qt::WindowDoesNotAcceptFocus) != 0) {
+        activateHost(*this);
+    }
+    queueMouse(owner_, buttonMessage(event->button(), true), *event);
 }
 
 void NativeWindow::mouseReleaseEvent(QMouseEvent* event) {
-    queueMouse(buttonMessage(event->button(), false), *event, buttonsOf(event->buttons()));
+    queueMouse(owner_, buttonMessage(event->button(), false), *event);
 }
 
 void NativeWindow::wheelEvent(QWheelEvent* event) {
-    const QPoint at = event->globalPosition().toPoint() - screenOrigin();
-    queueInput({owner_, WM_MOUSEWHEEL, static_cast<WPARAM>(MAKELONG(0, event->angleDelta().y())),
-                static_cast<LPARAM>(MAKELONG(at.x(), at.y())), 0});
+    queueWheel(owner_, *event);
 }
 
 void NativeWindow::focusInEvent(QFocusEvent* /*event*/) {

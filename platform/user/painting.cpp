@@ -3,6 +3,7 @@
 #include "platform/harness.h"
 #include "platform/user/controls/control.h"
 #include "platform/user/dialog.h"
+#include "platform/user/frame_window.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
 #include "platform/user/roster.h"
@@ -17,9 +18,9 @@ static RECT clientOf(const Window& window) {
 
 HDC GetDC(HWND window) {
     Window* found = findWindow(window);
-    return found == nullptr || !found->native
+    return found == nullptr || found->picture() == nullptr
                ? HDC{}
-               : makeSurfaceContext(*found->native, clientOf(*found));
+               : makeSurfaceContext(*found->picture(), clientOf(*found));
 }
 
 int ReleaseDC(HWND /*window*/, HDC dc) {
@@ -28,7 +29,7 @@ int ReleaseDC(HWND /*window*/, HDC dc) {
 
 HDC BeginPaint(HWND window, PAINTSTRUCT* paint) {
     Window* found = findWindow(window);
-    if (found == nullptr || !found->native) {
+    if (found == nullptr || found->picture() == nullptr) {
         *paint = {};
         return {};
     }
@@ -36,7 +37,7 @@ HDC BeginPaint(HWND window, PAINTSTRUCT* paint) {
     paint->rcPaint = found->paintNeeded ? found->update : RECT{0, 0, 0, 0};
     found->paintNeeded = false;
     found->eraseNeeded = false;
-    paint->hdc = makeSurfaceContext(*found->native, paint->rcPaint);
+    paint->hdc = makeSurfaceContext(*found->picture(), paint->rcPaint);
     paint->fErase =
         erase && SendMessageA(window, WM_ERASEBKGND, paint->hdc.number, 0) == 0 ? TRUE : FALSE;
     return paint->hdc;
@@ -79,16 +80,23 @@ static LRESULT eraseBackground(const Window& window, HDC dc) {
 
 static LRESULT setTitle(Window& window, const char* title) {
     window.title = title == nullptr ? "" : title;
-    if (window.dialog) {
-        window.dialog->setWindowTitle(shownText(window.title));
-        return TRUE;
+    toolkitWindow(window)->setTitle(shownText(window.title));
+    if (window.dialog || window.frame) {
+        widgetOf(window).setWindowTitle(shownText(window.title));
     }
-    window.native->setTitle(shownText(window.title));
-    if (!window.parent) {
+    if (!window.parent && !window.dialog) {
         leaveRoster(window.handle);
         joinRoster(window);
     }
     return TRUE;
+}
+
+static void setOwnCursor(const Window& window, LRESULT hit) {
+    if (hit != HTCLIENT) {
+        SetCursor(LoadCursorA(nullptr, IDC_ARROW));
+    } else if (window.windowClass->cursor) {
+        SetCursor(window.windowClass->cursor);
+    }
 }
 
 LRESULT DefWindowProcA(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
@@ -111,10 +119,15 @@ LRESULT DefWindowProcA(HWND window, UINT message, WPARAM wParam, LPARAM lParam) 
     }
     case WM_ERASEBKGND:
         return eraseBackground(*found, HDC{static_cast<DWORD>(wParam)});
-    case WM_SETCURSOR:
-        if (found->windowClass->cursor) {
-            SetCursor(found->windowClass->cursor);
+    case WM_NCHITTEST:
+        return HTCLIENT;
+    case WM_NCLBUTTONDOWN:
+        if (wParam == HTCAPTION && found->frame) {
+            found->frame->drag();
         }
+        return 0;
+    case WM_SETCURSOR:
+        setOwnCursor(*found, LOWORD(static_cast<DWORD>(lParam)));
         return 0;
     case WM_SETTEXT:
         return setTitle(*found, reinterpret_cast<const char*>(lParam));

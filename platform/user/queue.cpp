@@ -3,12 +3,12 @@
 #include "platform/harness.h"
 #include "platform/user/clock.h"
 #include "platform/user/ending.h"
-#include "platform/user/native_window.h"
 #include "platform/user/overlay.h"
 #include "platform/user/timers.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/waker.h"
 #include "platform/user/window.h"
+#include "platform/user/window_picture.h"
 
 #include <QCoreApplication>
 #include <QThread>
@@ -247,9 +247,9 @@ void wake() {
 
 void flushWindows() {
     forEachWindow([](Window& window) {
-        if (window.native) {
-            window.native->tellWatcher();
-            window.native->flush();
+        if (WindowPicture* picture = window.picture()) {
+            picture->tellWatcher();
+            picture->flush();
         }
     });
 }
@@ -309,6 +309,21 @@ static bool isMouseMessage(UINT message) {
     return message >= WM_MOUSEMOVE && message <= WM_MBUTTONUP;
 }
 
+/// What the window says of the place where the mouse is; it also sets the pointer's shape there.
+static LRESULT hitTest(const MSG& message) {
+    POINT corner{0, 0};
+    ScreenToClient(message.hwnd, &corner);
+    const auto at = static_cast<DWORD>(message.lParam);
+    const auto x = static_cast<std::int16_t>(LOWORD(at)) - corner.x;
+    const auto y = static_cast<std::int16_t>(HIWORD(at)) - corner.y;
+    const LRESULT hit =
+        SendMessageA(message.hwnd, WM_NCHITTEST, 0, static_cast<LPARAM>(MAKELONG(x, y)));
+    SendMessageA(
+        message.hwnd, WM_SETCURSOR, message.hwnd.number,
+        static_cast<LPARAM>(MAKELONG(static_cast<LONG>(hit), static_cast<LONG>(message.message))));
+    return hit;
+}
+
 LRESULT DispatchMessageA(const MSG* message) {
     if (findWindow(message->hwnd) == nullptr) {
         return 0;
@@ -316,10 +331,12 @@ LRESULT DispatchMessageA(const MSG* message) {
     if (message->message == WM_TIMER) {
         traceTick(message->wParam);
     } else if (isMouseMessage(message->message)) {
-        constexpr LONG overClient = 1;
-        SendMessageA(
-            message->hwnd, WM_SETCURSOR, message->hwnd.number,
-            static_cast<LPARAM>(MAKELONG(overClient, static_cast<LONG>(message->message))));
+        const LRESULT hit = hitTest(*message);
+        if (hit != HTCLIENT) {
+            return hit == HTCAPTION && message->message == WM_LBUTTONDOWN
+                       ? SendMessageA(message->hwnd, WM_NCLBUTTONDOWN, HTCAPTION, 0)
+                       : 0;
+        }
     }
     return SendMessageA(message->hwnd, message->message, message->wParam, message->lParam);
 }

@@ -19,7 +19,9 @@ namespace seam {
 
 class Control;
 class DialogWindow;
+class FrameWindow;
 class NativeWindow;
+class WindowPicture;
 
 struct WindowClass {
     std::string name;
@@ -41,7 +43,8 @@ struct Window {
     DWORD style = 0;
     bool topmost = false;
     std::string title;
-    RECT place{0, 0, 0, 0}; // in the parent, or on the screen
+    RECT place{0, 0, 0, 0}; // in the parent's client area, or on the screen
+    int border = 0;         // on each side, around its client area
     bool visible = false;
     bool dying = false; // WM_DESTROY has been sent
     bool paintNeeded = false;
@@ -49,21 +52,26 @@ struct Window {
     HIMC inputContext = defaultInputContext;
     RECT update{0, 0, 0, 0}; // bounds of what WM_PAINT has to paint
     bool enabled = true;
-    // One of the three stands behind it.
+    // One of the four stands behind it.
     std::unique_ptr<NativeWindow> native;
+    std::unique_ptr<FrameWindow> frame;
     std::unique_ptr<DialogWindow> dialog;
     std::unique_ptr<Control> control;
 
     Window();
     ~Window();
 
+    /// Of its client area.
     int width() const {
-        return place.right - place.left;
+        return place.right - place.left - 2 * border;
     }
 
     int height() const {
-        return place.bottom - place.top;
+        return place.bottom - place.top - 2 * border;
     }
+
+    /// What the program draws on; null for a dialog or a control.
+    WindowPicture* picture() const;
 };
 
 /// The record of a window of this program; null for any other number.
@@ -75,7 +83,7 @@ HWND addWindow(std::unique_ptr<Window> window);
 /// The toolkit's window that it is, or lies in; null while there is none.
 QWindow* toolkitWindow(const Window& window);
 
-/// The widget of a dialog or a control.
+/// The widget of a framed window, a dialog or a control.
 QWidget& widgetOf(const Window& window);
 
 /// Whether the event is input to a window that EnableWindow has shut, or to one in such a window.
@@ -98,17 +106,18 @@ HWND keyTarget(HWND window);
 /// The window no longer has the keys of its top-level window.
 void forgetFocus(HWND window);
 
-/// What its place is counted from: the screen's corner, or its parent's.
+/// What its place is counted from: the screen's corner, or that of its parent's client area.
 QPoint originOf(const Window& window);
 
 /// Sends WM_SIZE and WM_MOVE with its size and place.
 void sendSizeAndPlace(const Window& window);
 
-/// Adds to what has to be painted; the area is clipped to the window.
+/// Adds to what has to be painted, in the window and, unless it has WS_CLIPCHILDREN, in windows
+/// that lie in it; the area is clipped to the window.
 void invalidate(Window& window, RECT area, bool erase);
 
-/// The window's native size has changed: keeps the new size, asks for a full repaint and posts
-/// WM_SIZE.
+/// The size of the window's client area has changed: keeps the new size, asks for a full repaint
+/// and posts WM_SIZE.
 void windowResized(Window& window, int width, int height);
 
 } // namespace seam

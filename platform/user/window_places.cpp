@@ -5,11 +5,13 @@
 #include "platform/user/cursors.h"
 #include "platform/user/dialog.h"
 #include "platform/user/foreign.h"
+#include "platform/user/frame_window.h"
 #include "platform/user/native_window.h"
 #include "platform/user/roster.h"
 #include "platform/user/screens.h"
 #include "platform/user/toolkit.h"
 
+#include <QApplication>
 #include <QEvent>
 
 #include <algorithm>
@@ -29,11 +31,18 @@ bool isDisabled(HWND window) {
 } // namespace
 
 QWidget& widgetOf(const Window& window) {
+    if (window.frame) {
+        return *window.frame;
+    }
     return window.dialog ? static_cast<QWidget&>(*window.dialog) : window.control->widget();
 }
 
 QPoint originOf(const Window& window) {
-    return window.parent ? QPoint() : screenOrigin();
+    if (!window.parent) {
+        return screenOrigin();
+    }
+    const Window* parent = findWindow(window.parent);
+    return parent != nullptr ? QPoint(parent->border, parent->border) : QPoint();
 }
 
 void sendSizeAndPlace(const Window& window) {
@@ -77,9 +86,11 @@ void showWindow(HWND handle) {
     }
     window->visible = true;
     if (!window->native) {
-        widgetOf(*window).show();
-        if (window->dialog) {
-            window->dialog->activateWindow();
+        QWidget& widget = widgetOf(*window);
+        invalidate(*window, {0, 0, window->width(), window->height()}, true);
+        widget.show();
+        if (!window->control) {
+            widget.activateWindow();
         }
         return;
     }
@@ -125,14 +136,26 @@ static void hide(Window& window) {
     }
 }
 
+/// Only a window manager can bring a window back.
+static void minimise(const Window& window) {
+    QWindow* native = toolkitWindow(window);
+    if (window.visible && !window.parent && native != nullptr && windowsAreManaged()) {
+        native->showMinimized();
+    }
+}
+
 BOOL ShowWindow(HWND window, int command) {
     Window* found = findWindow(window);
     if (found == nullptr) {
         return FALSE;
     }
     const bool before = found->visible;
-    if (command != SW_HIDE && !before) {
+    if (command == SW_MINIMIZE) {
+        minimise(*found);
+    } else if (command != SW_HIDE && !before) {
         showWindow(window);
+    } else if (command == SW_SHOWNORMAL && IsIconic(window) != FALSE) {
+        toolkitWindow(*found)->showNormal();
     } else if (command == SW_HIDE && before) {
         found->visible = false;
         hide(*found);
@@ -145,21 +168,29 @@ BOOL MoveWindow(HWND window, int x, int y, int width, int height, BOOL repaint) 
     if (found == nullptr) {
         return FALSE;
     }
-    width = std::max(width, 1);
-    height = std::max(height, 1);
-    const bool grown = width > found->width() || height > found->height();
-    const bool sized = width != found->width() || height != found->height();
+    const int least = 1 + 2 * found->border;
+    width = std::max(width, least);
+    height = std::max(height, least);
+    const RECT before = found->place;
+    const int oldWidth = before.right - before.left;
+    const int oldHeight = before.bottom - before.top;
+    const bool grown = width > oldWidth || height > oldHeight;
+    const bool sized = width != oldWidth || height != oldHeight;
     const bool moved = x != found->place.left || y != found->place.top;
     found->place = {x, y, x + width, y + height};
-    const QRect place(QPoint(x, y) + originOf(*found), QSize(found->width(), found->height()));
-    if (!found->native) {
+    const QRect place(QPoint(x, y) + originOf(*found), QSize(width, height));
+    if (found->picture() == nullptr) {
         widgetOf(*found).setGeometry(place);
         return TRUE;
     }
-    if (sized) {
-        found->native->resizePicture(place.size());
+    if (found->frame) {
+        found->frame->moveTo(place);
+    } else {
+        if (sized) {
+            found->native->resizePicture(place.size());
+        }
+        found->native->setGeometry(place);
     }
-    found->native->setGeometry(place);
     if (repaint != FALSE || grown) {
         invalidate(*found, {0, 0, found->width(), found->height()}, true);
     }
@@ -181,8 +212,8 @@ BOOL SetWindowPos(HWND window, HWND after, int x, int y, int width, int height, 
     const bool keepsPlace = (flags & SWP_NOMOVE) != 0;
     const bool keepsSize = (flags & SWP_NOSIZE) != 0;
     return MoveWindow(window, keepsPlace ? place.left : x, keepsPlace ? place.top : y,
-                      keepsSize ? found->width() : width, keepsSize ? found->height() : height,
-                      FALSE);
+                      keepsSize ? place.right - place.left : width,
+                      keepsSize ? place.bottom - place.top : height, FALSE);
 }
 
 BOOL GetWindowRect(HWND window, RECT* place) {
@@ -198,11 +229,22 @@ BOOL GetWindowRect(HWND window, RECT* place) {
     }
     for (const Window* outer = findWindow(found->parent); outer != nullptr;
          outer = findWindow(outer->parent)) {
-        place->left += outer->place.left;
-        place->right += outer->place.left;
-        place->top += outer->place.top;
-        place->bottom += outer->place.top;
+        place->left += outer->place.left + outer->border;
+        place->right += outer->place.left + outer->border;
+        place->top += outer->place.top + outer->border;
+        place->bottom += outer->place.top + outer->border;
     }
+    return TRUE;
+}
+
+BOOL ScreenToClient(HWND window, POINT* point) {
+    const Window* found = findWindow(window);
+    RECT place{};
+    if (found == nullptr || GetWindowRect(window, &place) == FALSE) {
+        return FALSE;
+    }
+    point->x -= place.left + found->border;
+    point->y -= place.top + found->border;
     return TRUE;
 }
 
@@ -219,12 +261,27 @@ BOOL GetClientRect(HWND window, RECT* area) {
     return TRUE;
 }
 
+/// The control that takes the keys; null if none of this program does.
+static HWND focusedControl() {
+    HWND result;
+    const QWidget* widget = QApplication::focusWidget();
+    forEachWindow([&](Window& window) {
+        result = widget != nullptr && window.control && &window.control->widget() == widget
+                     ? window.handle
+                     : result;
+    });
+    return result;
+}
+
 HWND SetFocus(HWND window) {
-    const HWND before = focus;
+    const HWND control = focusedControl();
+    const HWND before = control ? control : focus;
     const Window* found = findWindow(window);
-    focus = found != nullptr && found->native ? window : HWND{};
+    focus = found != nullptr && found->picture() != nullptr ? window : HWND{};
     if (found != nullptr && found->control) {
         found->control->widget().setFocus();
+    } else if (focus && topLevelOf(control) == topLevelOf(focus)) {
+        widgetOf(*findWindow(control)).clearFocus();
     }
     return before;
 }

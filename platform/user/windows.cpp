@@ -7,6 +7,7 @@
 #include "platform/user/controls/control.h"
 #include "platform/user/dialog.h"
 #include "platform/user/foreign.h"
+#include "platform/user/frame_window.h"
 #include "platform/user/icons.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
@@ -18,6 +19,7 @@
 
 #include <algorithm>
 #include <map>
+#include <strings.h>
 #include <vector>
 
 namespace seam {
@@ -34,11 +36,23 @@ std::map<std::string, WindowClass>& classes() {
     return registered;
 }
 
+QRect placeOnScreen(const Window& window) {
+    const RECT& place = window.place;
+    return {QPoint(place.left, place.top) + originOf(window),
+            QSize(place.right - place.left, place.bottom - place.top)};
+}
+
+std::unique_ptr<FrameWindow> makeFrame(const Window& window) {
+    auto frame = std::make_unique<FrameWindow>(window.handle, placeOnScreen(window));
+    frame->setWindowTitle(shownText(window.title));
+    frame->setWindowIcon(iconOf(window.windowClass->icon));
+    return frame;
+}
+
 std::unique_ptr<NativeWindow> makeNative(const Window& window) {
     const Window* parent = findWindow(window.parent);
-    const QRect place(QPoint(window.place.left, window.place.top) + originOf(window),
-                      QSize(window.width(), window.height()));
-    QWindow* host = parent != nullptr ? parent->native.get() : nullptr;
+    const QRect place = placeOnScreen(window);
+    QWindow* host = parent != nullptr ? toolkitWindow(*parent) : nullptr;
     if (parent == nullptr && window.parent) {
         host = QWindow::fromWinId(window.parent.number);
     }
@@ -120,7 +134,9 @@ void removeWindow(HWND handle) {
     leaveRoster(handle);
     leaveHost(handle);
     leaveScreens(handle); // while there is a window to take back what it holds from
+    QWidget* widget = window->control ? &window->control->widget() : nullptr;
     table().take(handle.number);
+    delete widget;
 }
 
 } // namespace
@@ -141,11 +157,12 @@ HWND addWindow(std::unique_ptr<Window> window) {
     return handle;
 }
 
+WindowPicture* Window::picture() const {
+    return frame ? static_cast<WindowPicture*>(frame.get()) : native.get();
+}
+
 QWindow* toolkitWindow(const Window& window) {
-    if (window.control) {
-        return window.control->widget().window()->windowHandle();
-    }
-    return window.dialog ? window.dialog->windowHandle() : window.native.get();
+    return window.native ? window.native.get() : widgetOf(window).window()->windowHandle();
 }
 
 void forEachWindow(const std::function<void(Window&)>& visit) {
@@ -158,13 +175,25 @@ HWND topLevelOf(HWND window) {
                                                                     : window;
 }
 
+static void invalidateChildren(const Window& window, const RECT& area, bool erase) {
+    forEachWindow([&](Window& child) {
+        if (child.parent == window.handle && child.picture() != nullptr) {
+            const RECT& place = child.place;
+            invalidate(child,
+                       {area.left - place.left, area.top - place.top, area.right - place.left,
+                        area.bottom - place.top},
+                       erase);
+        }
+    });
+}
+
 void invalidate(Window& window, RECT area, bool erase) {
     area = {std::max(area.left, 0), std::max(area.top, 0), std::min(area.right, window.width()),
             std::min(area.bottom, window.height())};
     if (area.left >= area.right || area.top >= area.bottom) {
         return;
     }
-    if (!window.native) {
+    if (window.picture() == nullptr) {
         widgetOf(window).update(); // it paints itself: a WM_PAINT would never be answered
         return;
     }
@@ -175,12 +204,15 @@ void invalidate(Window& window, RECT area, bool erase) {
                         : area;
     window.eraseNeeded = window.eraseNeeded || erase;
     window.paintNeeded = true;
+    if ((window.style & WS_CLIPCHILDREN) == 0) {
+        invalidateChildren(window, area, erase);
+    }
     wake();
 }
 
 void windowResized(Window& window, int width, int height) {
-    window.place.right = window.place.left + width;
-    window.place.bottom = window.place.top + height;
+    window.place.right = window.place.left + width + 2 * window.border;
+    window.place.bottom = window.place.top + height + 2 * window.border;
     invalidate(window, {0, 0, width, height}, true);
     queuePosted({window.handle, WM_SIZE, 0, static_cast<LPARAM>(MAKELONG(width, height)), 0});
 }
@@ -201,10 +233,10 @@ HandleCounts liveHandles() {
 Picture windowPicture(HWND window) {
     Picture picture;
     const Window* found = findWindow(window);
-    if (found == nullptr || !found->native) {
+    if (found == nullptr || found->picture() == nullptr) {
         return picture;
     }
-    const PixelView view = found->native->pixels();
+    const PixelView view = found->picture()->pixels();
     picture.width = view.width;
     picture.height = view.height;
     for (int y = 0; y < view.height; ++y) {
@@ -235,11 +267,25 @@ WORD RegisterClassA(const WNDCLASSA* windowClass) {
     return static_cast<WORD>(classes().size());
 }
 
+static bool namesButton(const char* className) {
+    return className != nullptr && strcasecmp(className, "button") == 0;
+}
+
+static HWND makeFrameButton(const Window& host, const char* title, DWORD style, const Place& place,
+                            HINSTANCE instance) {
+    ControlTemplate made{0, "button", title == nullptr ? "" : title, place, style, {}};
+    return addControl(made, host.handle, instance, *host.frame);
+}
+
 HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DWORD style, int x,
                      int y, int width, int height, HWND parent, HMENU menu, HINSTANCE instance,
                      void* parameter) {
     const auto windowClass = classes().find(className == nullptr ? "" : className);
     const bool child = (style & WS_CHILD) != 0;
+    if (const Window* host = findWindow(parent);
+        child && host != nullptr && host->frame && namesButton(className)) {
+        return makeFrameButton(*host, title, style, {x, y, width, height}, instance);
+    }
     if (windowClass == classes().end() ||
         (child && findWindow(parent) == nullptr && !foreignExists(parent)) || !toolkit()) {
         return {};
@@ -253,12 +299,19 @@ HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DW
     window.style = style;
     window.topmost = (exStyle & WS_EX_TOPMOST) != 0;
     window.title = title == nullptr ? "" : title;
-    window.place = {x, y, x + std::max(width, 1), y + std::max(height, 1)};
+    const bool framed = !child && !window.topmost && (style & WS_BORDER) != 0;
+    window.border = framed ? FrameWindow::border : 0;
+    const int least = 1 + 2 * window.border;
+    window.place = {x, y, x + std::max(width, least), y + std::max(height, least)};
     const HWND handle = addWindow(std::move(made));
     if (!handle) {
         return {};
     }
-    window.native = makeNative(window);
+    if (framed) {
+        window.frame = makeFrame(window);
+    } else {
+        window.native = makeNative(window);
+    }
     if (mayBeForeign(window.parent)) {
         followHost(window.parent, handle);
     } else if (!child) {

@@ -2,11 +2,13 @@
 #include "platform/user/controls/control.h"
 
 #include "platform/gdi/encoding.h"
+#include "platform/gdi/objects.h"
 #include "platform/user/controls/item_painter.h"
 #include "platform/user/text.h"
 
 #include <QButtonGroup>
 #include <QCheckBox>
+#include <QDialog>
 #include <QPainter>
 #include <QPushButton>
 #include <QRadioButton>
@@ -66,6 +68,7 @@ class Button : public Control {
     Button(const ControlTemplate& made, HWND handle, QWidget& dialog)
         : button_(makeWidget(made.style, handle, dialog)) {
         Button::setText(made.text);
+        button_->setCursor(Qt::ArrowCursor);
         QObject::connect(button_, &QAbstractButton::clicked, button_,
                          [handle] { notify(handle, BN_CLICKED); });
     }
@@ -85,6 +88,9 @@ class Button : public Control {
 
     void setText(const std::string& text) override {
         button_->setText(shownText(text));
+        if (qobject_cast<QDialog*>(button_->window()) == nullptr) {
+            button_->setShortcut(QKeySequence()); // only a dialog sees to the underlined letters
+        }
     }
 
     bool checked() const override {
@@ -102,6 +108,15 @@ class Button : public Control {
         if (exclusive) {
             group->setExclusive(true);
         }
+    }
+
+    std::optional<LRESULT> answer(UINT message, WPARAM wParam, LPARAM /*lParam*/) override {
+        const Font* font = findObjectAs<Font>(HFONT{HGDIOBJ{static_cast<DWORD>(wParam)}});
+        if (message != WM_SETFONT || font == nullptr) {
+            return std::nullopt;
+        }
+        button_->setFont(font->face().font);
+        return 0;
     }
 
   private:

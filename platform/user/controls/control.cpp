@@ -7,6 +7,24 @@
 
 namespace seam {
 
+namespace {
+
+LRESULT controlProcedure(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
+    Control& control = *findWindow(window)->control;
+    if (message == WM_SETTEXT) {
+        const auto* text = reinterpret_cast<const char*>(lParam);
+        control.setText(text == nullptr ? "" : text);
+        return TRUE;
+    }
+    return control.answer(message, wParam, lParam).value_or(0);
+}
+
+WindowClass& controlClass() {
+    static WindowClass windowClass{"control", 0, controlProcedure, {}, {}, {}, {}};
+    return windowClass;
+}
+
+/// Makes the control with its widget in `dialog`; null for a kind that there isn't.
 std::unique_ptr<Control> makeControl(const ControlTemplate& made, HWND handle, QWidget& dialog) {
     using Maker = std::unique_ptr<Control> (*)(const ControlTemplate&, HWND, QWidget&);
 
@@ -34,6 +52,31 @@ std::unique_ptr<Control> makeControl(const ControlTemplate& made, HWND handle, Q
         }
     }
     return nullptr;
+}
+
+} // namespace
+
+HWND addControl(const ControlTemplate& made, HWND parent, HINSTANCE instance, QWidget& host) {
+    auto record = std::make_unique<Window>();
+    Window& window = *record;
+    window.windowClass = &controlClass();
+    window.instance = instance;
+    window.parent = parent;
+    window.style = made.style;
+    window.id = made.id;
+    window.visible = true;
+    const HWND handle = addWindow(std::move(record));
+    if (!handle) {
+        return {};
+    }
+    window.control = makeControl(made, handle, host);
+    if (!window.control) {
+        DestroyWindow(handle);
+        return {};
+    }
+    const QRect place = window.control->widget().geometry();
+    window.place = {place.left(), place.top(), place.right() + 1, place.bottom() + 1};
+    return handle;
 }
 
 void notify(HWND control, WORD code) {

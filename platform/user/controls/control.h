@@ -12,7 +12,8 @@
 
 namespace seam {
 
-/// What stands behind a control's handle. The widget belongs to the dialog's.
+/// What stands behind a control's handle. The widget belongs to the one that it lies in, and goes
+/// with the handle.
 class Control {
   public:
     Control() = default;
@@ -50,9 +51,6 @@ class Control {
     }
 };
 
-/// Makes the control of a template with its widget in `dialog`; null for a kind that there isn't.
-std::unique_ptr<Control> makeControl(const ControlTemplate& made, HWND handle, QWidget& dialog);
-
 std::unique_ptr<Control> makeButton(const ControlTemplate& made, HWND handle, QWidget& dialog);
 std::unique_ptr<Control> makeStatic(const ControlTemplate& made, HWND handle, QWidget& dialog);
 std::unique_ptr<Control> makeListBox(const ControlTemplate& made, HWND handle, QWidget& dialog);
@@ -65,7 +63,11 @@ constexpr UINT SBM_SETPOS = 0x00E0;
 constexpr UINT SBM_GETPOS = 0x00E1;
 constexpr UINT SBM_SETRANGE = 0x00E2;
 
-/// Tells the control's dialog by WM_COMMAND that the user has done something with it.
+/// Makes the control of a template with its record, in the window `parent`, whose widget is `host`.
+/// Null if there is no such kind of control, or there are too many windows.
+HWND addControl(const ControlTemplate& made, HWND parent, HINSTANCE instance, QWidget& host);
+
+/// Tells the control's parent by WM_COMMAND that the user has done something with it.
 void notify(HWND control, WORD code);
 
 } // namespace seam

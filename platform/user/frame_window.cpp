@@ -1,0 +1,178 @@
+#include "platform/user/frame_window.h"
+
+#include "platform/user/keys.h"
+#include "platform/user/queue.h"
+#include "platform/user/toolkit.h"
+#include "platform/user/window.h"
+
+#include <QCloseEvent>
+#include <QGuiApplication>
+#include <QKeyEvent>
+#include <QMouseEvent>
+#include <QPainter>
+#include <QWheelEvent>
+#include <QWindow>
+
+namespace seam {
+
+namespace {
+
+constexpr QPoint clientCorner(FrameWindow::border, FrameWindow::border);
+
+} // namespace
+
+FrameWindow::FrameWindow(HWND owner, const QRect& place) : WindowPicture(owner) {
+    setWindowFlags(Qt::Window | Qt::FramelessWindowHint);
+    setAttribute(Qt::WA_OpaquePaintEvent);
+    setAttribute(Qt::WA_NoSystemBackground);
+    setMouseTracking(true);
+    moveTo(place);
+    winId(); // makes its window
+    windowHandle()->installEventFilter(this);
+}
+
+PixelView FrameWindow::pixels() {
+    if (image_.isNull()) {
+        return {};
+    }
+    // Not bits(): the image is never shared.
+    auto* bits = reinterpret_cast<DWORD*>(const_cast<uchar*>(image_.constBits()));
+    return {bits, image_.width(), image_.height(), static_cast<int>(image_.bytesPerLine() / 4)};
+}
+
+void FrameWindow::flush() {
+    if (!dirty_.isEmpty() && isVisible()) {
+        const QRect area = dirty_;
+        dirty_ = QRect();
+        repaint(area.translated(clientCorner));
+    }
+}
+
+void FrameWindow::resizePicture(QSize size) {
+    const QImage kept = copyPicture();
+    image_ = QImage(size, QImage::Format_RGB32);
+    image_.fill(Qt::black);
+    pastePicture(kept);
+}
+
+void FrameWindow::moveTo(const QRect& place) {
+    setFixedSize(place.size());
+    move(place.topLeft());
+    const QSize client = place.size() - QSize(2 * border, 2 * border);
+    if (image_.size() != client) {
+        resizePicture(client.expandedTo({1, 1}));
+    }
+}
+
+void FrameWindow::drag() {
+    const bool held = (QGuiApplication::mouseButtons() & Qt::LeftButton) != 0;
+    if (held && !windowHandle()->startSystemMove()) {
+        grip_ = QCursor::pos() - pos();
+    }
+}
+
+void FrameWindow::queueActivation(bool active) {
+    const LONG minimised = isMinimized() ? 1 : 0;
+    const MSG activation{owner_, WM_ACTIVATE,
+                         static_cast<WPARAM>(MAKELONG(active ? WA_ACTIVE : WA_INACTIVE, minimised)),
+                         0, 0};
+    if (active) {
+        queueInput(activation);
+        queueInput({owner_, WM_SETFOCUS, 0, 0, 0});
+    } else {
+        queueInput({owner_, WM_KILLFOCUS, 0, 0, 0});
+        queueInput(activation);
+    }
+}
+
+bool FrameWindow::event(QEvent* event) {
+    switch (event->type()) {
+    case QEvent::Close:
+        queuePosted({owner_, WM_CLOSE, 0, 0, 0}); // it goes when its procedure says so
+        event->ignore();
+        return true;
+    case QEvent::WindowActivate:
+    case QEvent::WindowDeactivate:
+        queueActivation(event->type() == QEvent::WindowActivate);
+        break;
+    default:
+        break;
+    }
+    return QWidget::event(event);
+}
+
+bool FrameWindow::eventFilter(QObject* /*watched*/, QEvent* event) {
+    return inputIsBarred(owner_, *event);
+}
+
+/// It is no dialog: neither Tab nor a button that is disabled passes the focus on.
+bool FrameWindow::focusNextPrevChild(bool /*next*/) {
+    return false;
+}
+
+void FrameWindow::paintEvent(QPaintEvent* event) {
+    QPainter painter(this);
+    for (const QRect& area : event->region()) {
+        const QRect inner = area & image_.rect().translated(clientCorner);
+        painter.drawImage(inner, image_, inner.translated(-clientCorner));
+    }
+    painter.setPen(Qt::black);
+    painter.drawRect(rect().adjusted(0, 0, -1, -1));
+}
+
+void FrameWindow::moveEvent(QMoveEvent* /*event*/) {
+    Window* window = findWindow(owner_);
+    const QPoint corner = pos() - screenOrigin();
+    if (window == nullptr ||
+        (window->place.left == corner.x() && window->place.top == corner.y())) {
+        return;
+    }
+    RECT& place = window->place;
+    place = {corner.x(), corner.y(), corner.x() + place.right - place.left,
+             corner.y() + place.bottom - place.top};
+    queuePosted({owner_, WM_MOVE, 0, static_cast<LPARAM>(MAKELONG(corner.x(), corner.y())), 0});
+}
+
+/// A window manager that has its own idea of windows has given it another size.
+void FrameWindow::resizeEvent(QResizeEvent* event) {
+    Window* window = findWindow(owner_);
+    const QSize client = event->size() - QSize(2 * border, 2 * border);
+    if (window != nullptr && image_.size() != client && !client.isEmpty()) {
+        resizePicture(client);
+        windowResized(*window, client.width(), client.height());
+    }
+}
+
+void FrameWindow::keyPressEvent(QKeyEvent* event) {
+    queueKey(keyTarget(owner_), *event, true);
+}
+
+void FrameWindow::keyReleaseEvent(QKeyEvent* event) {
+    queueKey(keyTarget(owner_), *event, false);
+}
+
+void FrameWindow::mouseMoveEvent(QMouseEvent* event) {
+    if (grip_) {
+        move(event->globalPosition().toPoint() - *grip_);
+        return;
+    }
+    queueMouse(owner_, WM_MOUSEMOVE, *event, clientCorner);
+}
+
+void FrameWindow::mousePressEvent(QMouseEvent* event) {
+    queueMouse(owner_, buttonMessage(event->button(), true), *event, clientCorner);
+}
+
+void FrameWindow::mouseReleaseEvent(QMouseEvent* event) {
+    if (grip_ && event->button() == Qt::LeftButton) {
+        grip_.reset();
+        return;
+    }
+    queueMouse(owner_, buttonMessage(event->button(), false), *event, clientCorner);
+}
+
+void FrameWindow::wheelEvent(QWheelEvent* event) {
+    queueWheel(owner_, *event);
+}
+
+} // namespace seam
