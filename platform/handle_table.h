@@ -23,7 +23,8 @@ enum class HandleKind : DWORD {
     resource,
     device,
     key,
-    remoteWindow
+    remoteWindow,
+    menu
 };
 
 template <class Object>

@@ -46,6 +46,7 @@ struct HandleCounts {
     std::size_t keys = 0;
     std::size_t modules = 0; // loads that nobody has freed
     std::size_t timers = 0;
+    std::size_t menus = 0;
 
     friend bool operator==(const HandleCounts&, const HandleCounts&) = default;
 };

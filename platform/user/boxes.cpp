@@ -1,7 +1,6 @@
-// Message boxes, dialogs, menus and the guard against exceptions.
+// Message boxes and the guard against exceptions.
 #include "platform/harness.h"
 #include "platform/kernel.h"
-#include "platform/menus.h"
 #include "platform/trace.h"
 #include "platform/user/overlay.h"
 #include "platform/user/text.h"
@@ -80,14 +79,6 @@ BOOL MessageBeep(UINT /*type*/) {
         QApplication::beep();
     }
     return TRUE;
-}
-
-HMENU GetMenu(HWND /*window*/) {
-    return {}; // no class of the program has a menu bar
-}
-
-BOOL EnableMenuItem(HMENU /*menu*/, UINT /*item*/, UINT /*enable*/) {
-    return -1;
 }
 
 int RunGuarded(int (*body)(), int (*handler)()) {

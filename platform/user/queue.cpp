@@ -205,7 +205,9 @@ void drainWithinToolkitLoop() {
     if (clockIsManual() && handled == 0 && deadline) {
         moveClock(*deadline);
     }
-    armWaker(handled == batch || (clockIsManual() && deadline) ? clockNow() : deadline);
+    const bool ending = quitAsked || thrown; // one box or menu at a time
+    const bool again = handled == batch || ending || (clockIsManual() && deadline);
+    armWaker(again ? clockNow() : deadline);
 }
 
 void queuePosted(const MSG& message) {

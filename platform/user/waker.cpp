@@ -67,7 +67,9 @@ void wakeToolkitLoop() {
 }
 
 void rejectToolkitModal() {
-    if (auto* dialog = qobject_cast<QDialog*>(QApplication::activeModalWidget())) {
+    if (QWidget* popup = QApplication::activePopupWidget()) {
+        popup->close();
+    } else if (auto* dialog = qobject_cast<QDialog*>(QApplication::activeModalWidget())) {
         dialog->reject();
     }
 }

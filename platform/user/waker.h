@@ -17,7 +17,7 @@ void wakeToolkitLoop();
 /// does nothing. The queue supplies it; the waker calls it.
 void drainWithinToolkitLoop();
 
-/// Ends the innermost box of the toolkit as its Cancel would.
+/// Closes the menu of the toolkit that is open, or else ends its innermost box as its Cancel would.
 void rejectToolkitModal();
 
 } // namespace seam

@@ -9,6 +9,7 @@
 #include "platform/user/foreign.h"
 #include "platform/user/frame_window.h"
 #include "platform/user/icons.h"
+#include "platform/user/menus.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
 #include "platform/user/roster.h"
@@ -220,6 +221,7 @@ void windowResized(Window& window, int width, int height) {
 void countUserHandles(HandleCounts& counts) {
     counts.windows = table().live();
     counts.timers = liveTimers();
+    counts.menus = liveMenus();
 }
 
 HandleCounts liveHandles() {

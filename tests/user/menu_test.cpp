@@ -1,0 +1,141 @@
+// Menus that open: what they show and choose, and what goes on behind them.
+#include "platform/menus.h"
+#include "tests/user/test_window.h"
+
+#include <QApplication>
+#include <QMenu>
+#include <QTest>
+#include <QTimer>
+
+#include <stdexcept>
+
+namespace {
+
+using test::handlers;
+
+class Menus : public test::WindowTest {
+  protected:
+    void SetUp() override {
+        WindowTest::SetUp();
+        seam::useSystemClock(); // the toolkit's own loop runs behind a menu
+        menu = CreatePopupMenu();
+        AppendMenuA(menu, MF_STRING, 11, "&Open\tCtrl+O");
+        AppendMenuA(menu, MF_SEPARATOR, 0, nullptr);
+        AppendMenuA(menu, MF_STRING | MF_GRAYED, 12, "&Save");
+        AppendMenuA(menu, MF_STRING, 13, "Caf\xE9 \x80");
+        handlers[WM_COMMAND] = [](HWND, WPARAM, LPARAM) { return 0; };
+    }
+
+    void TearDown() override {
+        DestroyMenu(menu);
+        WindowTest::TearDown();
+    }
+
+    /// Does something with the menu once it is open.
+    static void whenOpen(const std::function<void(QMenu&)>& action) {
+        QTimer::singleShot(0, [action] {
+            auto* open = qobject_cast<QMenu*>(QApplication::activePopupWidget());
+            if (open == nullptr) {
+                whenOpen(action);
+            } else {
+                action(*open);
+            }
+        });
+    }
+
+    BOOL track() const {
+        return TrackPopupMenu(menu, 0, 30, 40, 0, window, nullptr);
+    }
+
+    /// What arrives at the window: the ids, and 0 for anything that isn't a menu's command.
+    static std::vector<WPARAM> chosen() {
+        test::seen.clear();
+        test::handleWaiting();
+        std::vector<WPARAM> ids;
+        for (const test::Seen& one : test::seen) {
+            if (one.message == WM_COMMAND) {
+                ids.push_back(one.lParam == 0 ? one.wParam : 0);
+            }
+        }
+        return ids;
+    }
+
+    HMENU menu;
+};
+
+TEST_F(Menus, TellTheWindowWhatTheKeysHaveChosen) {
+    EXPECT_EQ(GetMenuItemCount(menu), 4);
+    EXPECT_EQ(static_cast<UINT>(EnableMenuItem(menu, 12, MF_GRAYED)), MF_GRAYED);
+    EXPECT_EQ(EnableMenuItem(menu, 99, MF_GRAYED), -1);
+
+    const struct {
+        std::vector<Qt::Key> keys;
+        UINT save;
+        std::vector<WPARAM> chosen;
+    } cases[] = {{{Qt::Key_O}, MF_GRAYED, {11}},
+                 {{Qt::Key_S, Qt::Key_Escape}, MF_GRAYED, {}},
+                 {{Qt::Key_S}, MF_ENABLED, {12}},
+                 {{Qt::Key_Up, Qt::Key_Return}, MF_GRAYED, {13}}};
+
+    for (const auto& one : cases) {
+        EnableMenuItem(menu, 12, one.save);
+        whenOpen([&](QMenu& open) {
+            EXPECT_EQ(open.pos(), QPoint(30, 40));
+            EXPECT_EQ(open.actions().at(3)->text(), QStringLiteral("Caf\u00E9 \u20AC"));
+            EXPECT_FALSE(TrackPopupMenu(menu, 0, 0, 0, 0, window, nullptr)) << "one at a time";
+            for (const Qt::Key key : one.keys) {
+                QTest::keyClick(&open, key);
+            }
+        });
+        EXPECT_TRUE(track());
+        EXPECT_EQ(chosen(), one.chosen);
+    }
+}
+
+TEST_F(Menus, LetTimersAndPaintsGoOnBehindThem) {
+    int ticks = 0;
+    handlers[WM_TIMER] = [&](HWND, WPARAM, LPARAM) {
+        InvalidateRect(window, nullptr, FALSE);
+        if (++ticks == 4) {
+            whenOpen([](QMenu& open) { QTest::keyClick(&open, Qt::Key_Escape); });
+        }
+        return LRESULT{0};
+    };
+    SetTimer(window, 1, 5, nullptr);
+    EXPECT_TRUE(track());
+    KillTimer(window, 1);
+    EXPECT_GE(ticks, 4);
+    EXPECT_GE(test::seenAmong({WM_PAINT}).size(), 3U);
+}
+
+TEST_F(Menus, GoWithTheirWindowWithTheirHandleAndWithAQuit) {
+    const HWND other = test::makeWindow();
+    const std::function<void()> endings[] = {[&] { DestroyMenu(menu); }, [] { PostQuitMessage(5); },
+                                             [&] { DestroyWindow(window); }};
+    for (const auto& ending : endings) {
+        menu = GetMenuItemCount(menu) < 0 ? CreatePopupMenu() : menu;
+        AppendMenuA(menu, MF_STRING, 1, "Item");
+        handlers[WM_TIMER] = [&](HWND, WPARAM, LPARAM) {
+            KillTimer(other, 1);
+            ending();
+            return LRESULT{0};
+        };
+        SetTimer(other, 1, 1, nullptr);
+        EXPECT_TRUE(track());
+        EXPECT_EQ(QApplication::activePopupWidget(), nullptr);
+        EXPECT_TRUE(chosen().empty());
+    }
+    EXPECT_FALSE(track()) << "the window has gone";
+    DestroyWindow(other);
+}
+
+TEST_F(Menus, LetAnExceptionBehindThemOut) {
+    handlers[WM_TIMER] = [](HWND, WPARAM, LPARAM) -> LRESULT { throw std::runtime_error("fault"); };
+    SetTimer(window, 1, 1, nullptr);
+    EXPECT_THROW(track(), std::runtime_error);
+    KillTimer(window, 1);
+    whenOpen([](QMenu& open) { QTest::keyClick(&open, Qt::Key_Escape); });
+    EXPECT_TRUE(track()) << "no menu counts as open any more";
+}
+
+} // namespace
