@@ -24,7 +24,8 @@ enum class HandleKind : DWORD {
     device,
     key,
     remoteWindow,
-    menu
+    menu,
+    accelerators
 };
 
 template <class Object>

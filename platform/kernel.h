@@ -128,6 +128,7 @@ HGLOBAL GlobalFree(HGLOBAL block);
 constexpr ResourceName RT_BITMAP{2};
 constexpr ResourceName RT_DIALOG{5};
 constexpr ResourceName RT_STRING{6};
+constexpr ResourceName RT_ACCELERATOR{9};
 
 /// The handle of a module that is in the process, whatever its name's case: null stands for the
 /// program file itself. Null if it isn't there; nothing is loaded.

@@ -1,5 +1,5 @@
 // Resources of the program file, which Qt's resource system holds: bitmaps as whole .bmp files in
-// ":/bitmap", dialogs in ":/dialog".
+// ":/bitmap", dialogs in ":/dialog", tables of keys in ":/accelerators".
 
 #include "platform/handle_table.h"
 #include "platform/kernel.h"
@@ -42,7 +42,11 @@ ResourceFolder folderOf(ResourceName type) {
     if (type.number == RT_BITMAP.number) {
         return {":/bitmap", bitmapFileHeader};
     }
-    return type.number == RT_DIALOG.number ? ResourceFolder{":/dialog", 0} : ResourceFolder{};
+    if (type.number == RT_DIALOG.number) {
+        return {":/dialog", 0};
+    }
+    return type.number == RT_ACCELERATOR.number ? ResourceFolder{":/accelerators", 0}
+                                                : ResourceFolder{};
 }
 
 /// The path of the resource of this name, whatever its case; empty if there is none. The resources

@@ -55,7 +55,24 @@ WPARAM buttonsOf(Qt::MouseButtons buttons) {
            ((buttons & Qt::MiddleButton) != 0 ? 16U : 0U);
 }
 
+constexpr int heldShift = 32; // where lParam has what is held with a key
+
+UINT heldOf(Qt::KeyboardModifiers modifiers) {
+    return ((modifiers & Qt::ShiftModifier) != 0 ? shiftHeld : 0U) |
+           ((modifiers & Qt::ControlModifier) != 0 ? ctrlHeld : 0U) |
+           ((modifiers & Qt::AltModifier) != 0 ? altHeld : 0U) |
+           ((modifiers & Qt::MetaModifier) != 0 ? metaHeld : 0U);
+}
+
 } // namespace
+
+KeyStroke keyStroke(const QKeyEvent& event) {
+    return {codeOf(event.key()), heldOf(event.modifiers())};
+}
+
+KeyStroke keyStroke(const MSG& message) {
+    return {message.wParam, static_cast<UINT>(message.lParam >> heldShift)};
+}
 
 void queueKey(HWND window, const QKeyEvent& event, bool down) {
     const bool system = event.key() == Qt::Key_F10 || event.key() == Qt::Key_Alt ||
@@ -63,7 +80,8 @@ void queueKey(HWND window, const QKeyEvent& event, bool down) {
     const UINT message =
         down ? (system ? WM_SYSKEYDOWN : WM_KEYDOWN) : (system ? WM_SYSKEYUP : WM_KEYUP);
     const LPARAM repeated = event.isAutoRepeat() ? LPARAM{1} << 30 : 0;
-    queueInput({window, message, codeOf(event.key()), repeated | 1, 0});
+    const auto [code, held] = keyStroke(event);
+    queueInput({window, message, code, (LPARAM{held} << heldShift) | repeated | 1, 0});
 }
 
 void queueMouse(HWND window, UINT message, const QMouseEvent& event, QPoint corner) {

@@ -12,7 +12,27 @@ class QWheelEvent;
 
 namespace seam {
 
-/// Queues WM_KEYDOWN, WM_KEYUP or their WM_SYS... form (Alt held, or F10) for the window.
+// Of the keys that are held with another one.
+constexpr UINT shiftHeld = 1;
+constexpr UINT ctrlHeld = 2;
+constexpr UINT altHeld = 4;
+constexpr UINT metaHeld = 8;
+
+struct KeyStroke {
+    WPARAM code = 0; // the platform's
+    UINT held = 0;
+
+    friend bool operator==(const KeyStroke&, const KeyStroke&) = default;
+};
+
+/// Which key is pressed and what is held with it; the keypad's keys are like the others.
+KeyStroke keyStroke(const QKeyEvent& event);
+
+/// The same of a message that queueKey has queued.
+KeyStroke keyStroke(const MSG& message);
+
+/// Queues WM_KEYDOWN, WM_KEYUP or their WM_SYS... form (Alt held, or F10) for the window. What is
+/// held with the key stands in the bits of lParam from 32 up.
 void queueKey(HWND window, const QKeyEvent& event, bool down);
 
 /// Queues a mouse message for the window, whose client area begins at `corner` of what the event

@@ -1,6 +1,7 @@
 #include "platform/user/queue.h"
 
 #include "platform/harness.h"
+#include "platform/user/accelerators.h"
 #include "platform/user/clock.h"
 #include "platform/user/ending.h"
 #include "platform/user/overlay.h"
@@ -257,12 +258,14 @@ void flushWindows() {
 }
 
 void waitForMessage(MSG& message) {
+    const InnerDepth withoutTable; // a dialog's keys are the toolkit's
     Filter withoutQuit;
     withoutQuit.except = WM_QUIT;
     waitFor(withoutQuit, message);
 }
 
 bool runUntil(std::int64_t milliseconds) {
+    const InnerDepth withoutTable;
     MSG message{};
     for (;;) {
         pump();
@@ -291,6 +294,7 @@ BOOL GetMessageA(MSG* message, HWND window, UINT lowest, UINT highest) {
         return FALSE;
     }
     endWindowsAtExit();
+    loopAsksForMessage();
     waitFor({}, *message);
     return message->message != WM_QUIT ? TRUE : FALSE;
 }
@@ -330,6 +334,7 @@ LRESULT DispatchMessageA(const MSG* message) {
     if (findWindow(message->hwnd) == nullptr) {
         return 0;
     }
+    const InnerDepth inner;
     if (message->message == WM_TIMER) {
         traceTick(message->wParam);
     } else if (isMouseMessage(message->message)) {
