@@ -31,7 +31,10 @@ struct OPENFILENAME {
 /// Lets the user choose a file to open or to write to, over hwndOwner, and writes its path to
 /// lpstrFile; FALSE if it was cancelled, and then lpstrFile stays. Any name may be typed, of a file
 /// that exists or not; it is taken as typed, and nobody asks about overwriting. A path that
-/// lpstrFile can't hold is refused with a message and the dialog stays. The current directory stays
-/// as it is. Timers and paints go on meanwhile.
+/// lpstrFile can't hold is refused with a message and the dialog stays; so is a name with a
+/// backslash, which the platform's form can't express. Names that aren't UTF-8 aren't shown and
+/// can't be chosen; where the directory to begin with has such a name, the nearest one above it
+/// that has none takes its place. nFilterIndex becomes that of the filter in use. The current
+/// directory stays as it is. Timers and paints go on meanwhile.
 BOOL GetOpenFileNameA(OPENFILENAME* dialog);
 BOOL GetSaveFileNameA(OPENFILENAME* dialog);

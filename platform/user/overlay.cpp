@@ -10,6 +10,8 @@
 #include <QScreen>
 #include <qdrawutil.h>
 
+#include <algorithm>
+
 namespace seam {
 
 namespace {
@@ -21,6 +23,15 @@ QPoint middleOf(const QWindow& owner) {
     }
     const QRect seen = owner.geometry() & owner.screen()->geometry();
     return seen.isEmpty() ? owner.geometry().center() : seen.center();
+}
+
+/// Where a window has to stand to lie on the screen, at least with its upper left corner.
+QPoint keptOn(const QRect& screen, const QRect& place) {
+    const auto inside = [](int start, int size, int from, int room) {
+        return std::max(from, std::min(start, from + room - size));
+    };
+    return {inside(place.x(), place.width(), screen.x(), screen.width()),
+            inside(place.y(), place.height(), screen.y(), screen.height())};
 }
 
 /// Puts the dialog over its owner. A window that stays above all others, out of the window
@@ -36,7 +47,8 @@ void placeOver(QDialog& dialog, QWindow& owner) {
         dialog.windowHandle()->setTransientParent(&owner);
     }
     dialog.adjustSize();
-    dialog.move(middleOf(owner) - dialog.rect().center());
+    dialog.move(keptOn(owner.screen()->geometry(),
+                       dialog.rect().translated(middleOf(owner) - dialog.rect().center())));
 }
 
 int boxes = 0; // calls of runOver on the stack
@@ -60,12 +72,11 @@ bool boxIsUp() {
     return boxes > 0;
 }
 
-int runOver(QDialog& dialog, HWND owner) {
+int execOver(QDialog& dialog, QWindow* under) {
     const BoxCount count;
     flushWindows();
     dialog.setWindowModality(Qt::ApplicationModal);
-    const Window* over = findWindow(topLevelOf(owner));
-    if (QWindow* under = over != nullptr ? toolkitWindow(*over) : nullptr) {
+    if (under != nullptr) {
         placeOver(dialog, *under);
         QObject::connect(under, &QObject::destroyed, &dialog, &QDialog::reject);
     }
@@ -74,7 +85,12 @@ int runOver(QDialog& dialog, HWND owner) {
     dialog.show();
     dialog.activateWindow();
     wakeToolkitLoop();
-    const int result = dialog.exec();
+    return dialog.exec();
+}
+
+int runOver(QDialog& dialog, HWND owner) {
+    const Window* over = findWindow(topLevelOf(owner));
+    const int result = execOver(dialog, over != nullptr ? toolkitWindow(*over) : nullptr);
     rethrowFromToolkitLoop();
     return result;
 }

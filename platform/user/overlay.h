@@ -13,6 +13,10 @@ namespace seam {
 /// if the owner goes.
 int runOver(QDialog& dialog, HWND owner);
 
+/// The same over a window of the toolkit's, for a box that comes out of one of its handlers: what a
+/// handler of ours has thrown meanwhile is left to the runOver round it.
+int execOver(QDialog& dialog, QWindow* under);
+
 /// Whether runOver is at work, also when its dialog has just been hidden.
 bool boxIsUp();
 

@@ -1,0 +1,217 @@
+// The dialogs for choosing a file, answered by keys in the user's place.
+#include "platform/common_dialogs.h"
+#include "tests/kernel/scratch_directory.h"
+#include "tests/user/test_window.h"
+
+#include <QApplication>
+#include <QComboBox>
+#include <QFileDialog>
+#include <QLineEdit>
+#include <QListView>
+#include <QMessageBox>
+#include <QTest>
+#include <QTimer>
+
+#include <array>
+#include <stdexcept>
+
+namespace {
+
+class FileDialogs : public ScratchDirectory {
+  protected:
+    void SetUp() override {
+        test::handlers.clear();
+        window = test::makeWindow();
+        test::handleWaiting();
+        make("one.zkt");
+        make("two.txt");
+        make("inner/three.zkt");
+        initial = whole("inner");
+        asked.lStructSize = 76;
+        asked.hwndOwner = window;
+        asked.lpstrFilter = "Toons (*.zkt)\0*.zkt\0All files\0*.*\0";
+        asked.nFilterIndex = 1;
+        asked.lpstrFile = path.data();
+        asked.nMaxFile = static_cast<DWORD>(path.size());
+        asked.lpstrInitialDir = "";
+        asked.lpstrTitle = "Open a Toon";
+    }
+
+    void TearDown() override {
+        DestroyWindow(window);
+        EXPECT_EQ(std::filesystem::current_path(), root_);
+        ScratchDirectory::TearDown();
+    }
+
+    /// Does something with the innermost window of a kind once it is up.
+    template <class Widget>
+    static void whenUp(const std::function<void(Widget&)>& action) {
+        QTimer::singleShot(0, [action] {
+            auto* up = qobject_cast<Widget*>(QApplication::activeModalWidget());
+            if (up == nullptr || !up->isActiveWindow()) {
+                whenUp<Widget>(action);
+            } else {
+                action(*up);
+            }
+        });
+    }
+
+    static QLineEdit& nameField(const QFileDialog& dialog) {
+        return *dialog.findChild<QLineEdit*>(QStringLiteral("fileNameEdit"));
+    }
+
+    static void enter(const QFileDialog& dialog, const QString& name) {
+        nameField(dialog).selectAll();
+        for (const QChar character : name) {
+            QKeyEvent press(QEvent::KeyPress, 0, Qt::NoModifier, QString(character));
+            QCoreApplication::sendEvent(&nameField(dialog), &press);
+        }
+        QTest::keyClick(&nameField(dialog), Qt::Key_Return);
+    }
+
+    void put(const std::string& text) {
+        path.fill('x');
+        path[text.copy(path.data(), path.size() - 1)] = '\0';
+    }
+
+    std::string result() const {
+        return path.data();
+    }
+
+    HWND window;
+    std::string initial;
+    std::array<char, 256> path{};
+    OPENFILENAME asked{};
+};
+
+TEST_F(FileDialogs, GiveTheTypedPathInThePlatformsForm) {
+    const struct {
+        BOOL (*choose)(OPENFILENAME*);
+        const char* file;
+        std::string initial;
+        QString typed;
+        const char* shown;
+        std::string chosen;
+    } cases[] = {
+        {GetOpenFileNameA, "", "", QStringLiteral("one.zkt"), "", "one.zkt"},
+        {GetOpenFileNameA, "", "", QStringLiteral("missing"), "", "missing"},
+        {GetSaveFileNameA, "old.zkt", "", QStringLiteral("two.txt"), "old.zkt", "two.txt"},
+        {GetSaveFileNameA, "", initial, QStringLiteral("new"), "", "inner\\new"},
+        {GetSaveFileNameA, "", initial, QStringLiteral("../caf\u00E9"), "", "caf\xC3\xA9"},
+        {GetOpenFileNameA, "", "C:\\none", QStringLiteral("inner/a \"b\""), "", "inner\\a \"b\""},
+        {GetSaveFileNameA, "INNER\\three.zkt", "", QStringLiteral("x"), "three.zkt", "inner\\x"},
+    };
+
+    for (const auto& one : cases) {
+        put(one.file);
+        asked.lpstrInitialDir = one.initial.c_str();
+        whenUp<QFileDialog>([&](QFileDialog& dialog) {
+            EXPECT_EQ(dialog.windowTitle(), QStringLiteral("Open a Toon"));
+            EXPECT_EQ(nameField(dialog).text(), QLatin1String(one.shown));
+            enter(dialog, one.typed);
+        });
+        EXPECT_TRUE(one.choose(&asked));
+        EXPECT_EQ(result(), whole(one.chosen));
+    }
+}
+
+TEST_F(FileDialogs, LeaveThePathAloneWhenCancelledOrWithoutTheirOwner) {
+    const std::function<void(QFileDialog&)> endings[] = {
+        [](QFileDialog& dialog) { QTest::keyClick(&nameField(dialog), Qt::Key_Escape); },
+        [&](QFileDialog&) { PostMessageA(window, 0x8001, 0, 0); }};
+    test::handlers[0x8001] = [](HWND destroyed, WPARAM, LPARAM) {
+        return LRESULT{DestroyWindow(destroyed)};
+    };
+    for (const auto& ending : endings) {
+        put("old.zkt");
+        asked.nFilterIndex = 2;
+        whenUp<QFileDialog>([&](QFileDialog& dialog) {
+            QTest::keyClicks(&nameField(dialog), QStringLiteral("new.zkt"));
+            ending(dialog);
+        });
+        EXPECT_FALSE(GetSaveFileNameA(&asked));
+        EXPECT_EQ(result(), "old.zkt");
+        EXPECT_EQ(asked.nFilterIndex, 2U);
+    }
+}
+
+TEST_F(FileDialogs, RefuseWhatTheCallerCannotHoldAndGoOn) {
+    const std::string fits(path.size() - 1 - whole("x").size() + 1, 'y');
+
+    const struct {
+        QString typed;
+        const char* why;
+    } cases[] = {{QString::fromStdString(fits + "y"), "The path is too long."},
+                 {QString(300, QLatin1Char('z')), "The path is too long."},
+                 {QStringLiteral("C:\\one.zkt"), "The path can't be used."}};
+
+    for (const auto& one : cases) {
+        int refusals = 0;
+        whenUp<QFileDialog>([&](QFileDialog& dialog) {
+            whenUp<QMessageBox>([&](QMessageBox& box) {
+                ++refusals;
+                EXPECT_EQ(box.text(), QLatin1String(one.why));
+                QTest::keyClick(&box, Qt::Key_Return);
+            });
+            enter(dialog, one.typed);
+            EXPECT_TRUE(dialog.isVisible());
+            enter(dialog, QString::fromStdString(fits));
+        });
+        EXPECT_TRUE(GetOpenFileNameA(&asked));
+        EXPECT_EQ(result(), whole(fits));
+        EXPECT_EQ(refusals, 1);
+    }
+}
+
+TEST_F(FileDialogs, ListWhatTheFilterLetsThroughAndGoIntoATypedDirectory) {
+    make("plain");
+    const auto waitForRows = [](const QFileDialog& dialog, int rows) {
+        const auto& list = *dialog.findChild<QListView*>(QStringLiteral("listView"));
+        return QTest::qWaitFor([&] { return list.model()->rowCount(list.rootIndex()) == rows; });
+    };
+    whenUp<QFileDialog>([&](QFileDialog& dialog) {
+        auto& filters = *dialog.findChild<QComboBox*>(QStringLiteral("fileTypeCombo"));
+        EXPECT_EQ(filters.currentText(), QStringLiteral("All files"));
+        EXPECT_TRUE(waitForRows(dialog, 4));
+        QTest::keyClick(&filters, Qt::Key_Up);
+        EXPECT_EQ(filters.currentText(), QStringLiteral("Toons (*.zkt)"));
+        EXPECT_TRUE(waitForRows(dialog, 2)) << "a directory and a Toon";
+        enter(dialog, QStringLiteral("inner"));
+        EXPECT_TRUE(dialog.isVisible());
+        EXPECT_EQ(nameField(dialog).text(), QString());
+        EXPECT_EQ(dialog.directory().path().toStdString(), (root_ / "inner").string());
+        enter(dialog, QStringLiteral("three.zkt"));
+    });
+    asked.nFilterIndex = 2;
+    EXPECT_TRUE(GetOpenFileNameA(&asked));
+    EXPECT_EQ(result(), whole("inner\\three.zkt"));
+    EXPECT_EQ(asked.nFilterIndex, 1U);
+}
+
+TEST_F(FileDialogs, BeginAboveADirectoryThatTheToolkitCannotName) {
+    make("caf\xE9/x.zkt");
+    initial = whole("caf\xE9");
+    asked.lpstrInitialDir = initial.c_str();
+    whenUp<QFileDialog>([&](QFileDialog& dialog) { enter(dialog, QStringLiteral("one.zkt")); });
+    EXPECT_TRUE(GetOpenFileNameA(&asked));
+    EXPECT_EQ(result(), whole("one.zkt"));
+}
+
+TEST_F(FileDialogs, EndWithAQuitOrAnExceptionAlsoBehindARefusal) {
+    test::handlers[0x8001] = [](HWND, WPARAM, LPARAM) -> LRESULT {
+        throw std::runtime_error("fault");
+    };
+    const auto refuseAnd = [](const std::function<void()>& action) {
+        whenUp<QFileDialog>([action](QFileDialog& dialog) {
+            whenUp<QMessageBox>([action](QMessageBox&) { action(); });
+            enter(dialog, QStringLiteral("\\"));
+        });
+    };
+    refuseAnd([] { PostQuitMessage(3); });
+    EXPECT_FALSE(GetOpenFileNameA(&asked));
+    EXPECT_EQ(test::runLoop(), 3U);
+    refuseAnd([&] { PostMessageA(window, 0x8001, 0, 0); });
+    EXPECT_THROW(GetOpenFileNameA(&asked), std::runtime_error);
+}
+
+} // namespace
