@@ -175,11 +175,18 @@ void NativeWindow::wheelEvent(QWheelEvent* event) {
 }
 
 void NativeWindow::focusInEvent(QFocusEvent* /*event*/) {
+    if (std::exchange(lent_, false)) {
+        return;
+    }
     queueInput({owner_, WM_ACTIVATE, 1, 0, 0});
     queueInput({owner_, WM_SETFOCUS, 0, 0, 0});
 }
 
-void NativeWindow::focusOutEvent(QFocusEvent* /*event*/) {
+void NativeWindow::focusOutEvent(QFocusEvent* event) {
+    lent_ = event->reason() == Qt::PopupFocusReason;
+    if (lent_) {
+        return;
+    }
     queueInput({owner_, WM_KILLFOCUS, 0, 0, 0});
     queueInput({owner_, WM_ACTIVATE, 0, 0, 0});
 }

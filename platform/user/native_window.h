@@ -41,6 +41,7 @@ class NativeWindow : public QWindow, public WindowPicture {
 
     QBackingStore store_;
     QImage shadow_;            // the picture where the display's pixels have another form than ours
+    bool lent_ = false;        // a menu has the keyboard and will give it back
     std::int64_t flushed_ = 0; // when the server was last told to fetch pixels
 };
 

@@ -89,6 +89,7 @@ TEST_F(Menus, TellTheWindowWhatTheKeysHaveChosen) {
         });
         EXPECT_TRUE(track());
         EXPECT_EQ(chosen(), one.chosen);
+        EXPECT_TRUE(test::seenAmong({WM_ACTIVATE, WM_KILLFOCUS}).empty());
     }
 }
 
