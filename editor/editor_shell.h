@@ -1,14 +1,37 @@
-// The Toon editor's main window.
+// The Toon editor's frame: its main window with the stage in it, what a run makes and frees, its
+// message loop, the about box.
 #pragma once
 
 #include "platform/dialogs.h"
 
-/// The editor's main window; null while no editor is open.
+/// The main window; null while no editor is open. Written here.
 extern HWND EditorMainWindow;
 
-/// Opens the editor and runs it to its end. There is no editor yet: a box over the owner says so.
-/// Gives 0.
+/// The repaint flag that the editor's stage gives to PaintStage. Written by it and by PaintStage.
+extern DWORD EditorRepaintFlag;
+
+/// Opens the editor over its owner and runs it until its main window goes. 0; also if it can't
+/// start, and then nothing shows. The window classes are set up once a process.
 int RunEditor(HINSTANCE instance, HWND owner, int showCommand);
+
+/// Nonzero if at least one of the two classes could be set up.
+int EditorClassSetup(HINSTANCE instance);
+
+/// The main window, then the keys, then the stage in it. 0 if there is no main window.
+int CreateEditorWindows(HINSTANCE instance, int showCommand);
+
+/// Fixes StageSize, and with it the main window's size, by that of the screen, and centres it.
+void SizeMainWindow(HWND mainWindow);
+
+/// Makes a clean start: the random numbers, the state of the run, all that it draws with.
+void EditorStartup(HWND mainWindow, HINSTANCE instance);
+void EditorShutdown();
 
 /// Puts a window into the middle of the screen.
 void CentreDialog(HWND window);
+
+LRESULT MainWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
+LRESULT StageWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
+
+/// The about box, which closes by OK alone.
+LRESULT AboutProc(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam);

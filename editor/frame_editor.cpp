@@ -1,7 +1,16 @@
-// The frame editor, as far as the stage asks for it. It can't be opened yet: EditorDialog stays
-// null, so that no click of the stage gets here.
+#include "editor/frame_editor.h"
+
 #include "stage/editor_host.h"
 
 HWND EditorDialog;
+
+void OpenFrameEditor(HWND mainWindow, HINSTANCE /*instance*/) {
+    MessageBoxA(mainWindow, "There is no frame editor yet.", "Fenky Dorbo Toon File Editor",
+                MB_ICONEXCLAMATION);
+}
+
+int FrameEditorAccelerator(HINSTANCE /*instance*/, int /*id*/) {
+    return 0;
+}
 
 void SetEditedPosition(LONG /*x*/, LONG /*y*/) {}

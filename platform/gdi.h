@@ -173,6 +173,7 @@ int FillRect(HDC dc, const RECT* area, HBRUSH brush);
 BOOL InflateRect(RECT* rectangle, int dx, int dy);
 BOOL PtInRect(const RECT* rectangle, POINT point); ///< left and top edges in, the others out
 
+constexpr int COLOR_ACTIVECAPTION = 2;
 constexpr int COLOR_BTNFACE = 15;
 constexpr int COLOR_BTNSHADOW = 16;
 constexpr int COLOR_BTNTEXT = 18;
@@ -186,6 +187,10 @@ DWORD GetSysColor(int index); ///< black for an index without a colour
 //
 // Text is Windows-1252; its five holes stand for U+0081 and so on. Glyphs are drawn without
 // antialiasing, at whole pixels. In OPAQUE mode a line's cells get the background colour first.
+
+constexpr int FW_THIN = 100;
+constexpr int FW_NORMAL = 400;
+constexpr int FW_BOLD = 700;
 
 /// A font. A negative height is the character height in pixels, a positive one that of the cell;
 /// a weight of 600 and more is bold. "MS Serif" is drawn with Liberation Serif, anything else with

@@ -3,7 +3,7 @@
 #include "platform/kernel.h"
 #include "saver/saver_guard.h"
 #include "saver/setup_dialog.h"
-#include "saver/window_loop.h"
+#include "stage/window_loop.h"
 #include "stage/stage.h"
 
 HINSTANCE SaverInstance;
@@ -173,7 +173,7 @@ int RunSaver(HWND parent) {
         if (PreviewMode == 0) {
             SetForegroundWindow(SaverWindow);
         }
-        result = RunWindowLoop(SaverWindow);
+        result = RunWindowLoop(SaverWindow, nullptr);
     }
     UnloadPasswordModule();
     return result;

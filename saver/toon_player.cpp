@@ -2,7 +2,7 @@
 
 #include "platform/kernel.h"
 #include "saver/show_cycle.h"
-#include "saver/window_loop.h"
+#include "stage/window_loop.h"
 #include "stage/backdrop.h"
 #include "stage/player.h"
 #include "stage/stage.h"
@@ -50,7 +50,7 @@ int RunPlayer(HINSTANCE instance, HWND parent, const char* name) {
         return 0;
     }
     CopyText(NextToonFile, name, NEXT_TOON_SIZE);
-    return RunWindowLoop(PlayerWindow);
+    return RunWindowLoop(PlayerWindow, nullptr);
 }
 
 LRESULT PlayerProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {

@@ -4,6 +4,10 @@
 
 #include "platform/user.h"
 
+/// The editor's stage, a child of its main window; null while there is none. Defined and written by
+/// the editor.
+extern HWND EditorStage;
+
 /// The open frame editor, null while none is open. Defined and written by the editor.
 extern HWND EditorDialog;
 

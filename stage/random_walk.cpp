@@ -165,6 +165,11 @@ void RandomWalkArrived(HWND stage) {
     SendShowDone(stage);
 }
 
+void EndRandomWalk() {
+    RandomWalkActive = 0;
+    WalkingOut = 0;
+}
+
 void FinishOpening(HWND stage) {
     if (WalkingOut == 0) {
         return;

@@ -64,6 +64,9 @@ void RandomWalkArrived(HWND stage);
 /// sends once more, and asks for the repaint that takes the title off. Before its end: nothing.
 void FinishOpening(HWND stage);
 
+/// Forgets a random walk that ResetShow has put an end to.
+void EndRandomWalk();
+
 /// The first walk of the editor, and of the preview. 0 once OpeningDone is 1, and while a walk or
 /// show is under way, else 1.
 int StartOpeningWalk(HWND stage);

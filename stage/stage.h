@@ -9,9 +9,7 @@
 
 // ---- Messages -----------------------------------------------------------------------------------
 
-constexpr UINT TM_BACKGROUND = 1028;        // to the editor: build the backdrop anew and repaint
-constexpr UINT TM_ENABLEPLAY = 1029;        // to the editor: enable the Play button by wParam
-constexpr UINT TM_EDITORCLOSED = 1030;      // to the editor: the frame editor has gone
+// Those to the editor's main window, from 1028 on, stand in toon/toon_prompts.h.
 constexpr UINT TM_SHOWDONE = 1031;          // to the stage: a show or walk about has ended
 constexpr UINT TM_WALKDONE = 1032;          // to the stage: a walk has ended
 constexpr UINT TM_VERIFYPASSWORD = 0x8000U; // to the saver: run the password verifier

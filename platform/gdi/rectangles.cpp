@@ -29,6 +29,8 @@ BOOL PtInRect(const RECT* rectangle, POINT point) {
 
 DWORD GetSysColor(int index) {
     switch (index) {
+    case COLOR_ACTIVECAPTION:
+        return RGB(0, 0, 128);
     case COLOR_BTNFACE:
         return RGB(192, 192, 192);
     case COLOR_BTNSHADOW:

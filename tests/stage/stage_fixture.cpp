@@ -15,6 +15,7 @@ DWORD RepaintFlag = 1;
 
 // ---- The host -----------------------------------------------------------------------------------
 
+HWND EditorStage;
 HWND EditorDialog;
 
 void SetPlayButton(int state) {

@@ -1,9 +1,12 @@
-#include "saver/window_loop.h"
+#include "stage/window_loop.h"
 
-int RunWindowLoop(HWND window) {
+int RunWindowLoop(HWND window, MessageTranslator translate) {
     MSG message{};
     while (IsWindow(window)) {
-        if (GetMessageA(&message, nullptr, 0, 0)) {
+        if (!GetMessageA(&message, nullptr, 0, 0)) {
+            continue;
+        }
+        if (translate == nullptr || translate(&message) == 0) {
             TranslateMessage(&message);
             DispatchMessageA(&message);
         }

@@ -1,0 +1,8 @@
+// Which of the editor's buttons can be pressed. SetPlayButton, DisableButtons and RestoreButtons
+// stand in stage/editor_host.h: the stage asks for them.
+#pragma once
+
+#include "stage/editor_host.h"
+
+/// 1 from DisableButtons to RestoreButtons. Also cleared at the start of the editor.
+extern DWORD ButtonsSaved;
