@@ -1,6 +1,7 @@
 #include "platform/user/menus.h"
 
 #include "platform/gdi/encoding.h"
+#include "platform/gdi/font.h"
 #include "platform/handle_table.h"
 #include "platform/user/controls/control.h"
 #include "platform/user/cursors.h"
@@ -69,6 +70,8 @@ Menu* findMenu(HMENU menu) {
 }
 
 void fillMenu(QMenu& shown, const Menu& menu) {
+    constexpr int fontHeight = 11; // as in dialogs
+    shown.setFont(dialogFont(fontHeight));
     for (const MenuItem& item : menu.items) {
         if ((item.flags & MF_SEPARATOR) != 0) {
             shown.addSeparator();
