@@ -3,8 +3,8 @@
 #include "platform/kernel.h"
 #include "saver/saver_guard.h"
 #include "saver/setup_dialog.h"
-#include "stage/window_loop.h"
 #include "stage/stage.h"
+#include "stage/window_loop.h"
 
 HINSTANCE SaverInstance;
 HWND SaverWindow;

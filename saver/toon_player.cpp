@@ -2,10 +2,10 @@
 
 #include "platform/kernel.h"
 #include "saver/show_cycle.h"
-#include "stage/window_loop.h"
 #include "stage/backdrop.h"
 #include "stage/player.h"
 #include "stage/stage.h"
+#include "stage/window_loop.h"
 #include "toon/toon_document.h"
 
 HINSTANCE PlayerClassInstance;
