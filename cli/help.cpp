@@ -70,12 +70,14 @@ constexpr Help helps[] = {
      "  toon film intro.zkt intro.png --size 640x480\n"
      "  toon film intro.zkt title.png --still 1000\n"},
     {"trace",
-     "FILE.zkt... | --walk-about [--size WxH] [--seed N] [--mode WHO] [--shows N] [--paces N]",
+     "FILE.zkt... | --walk-about [--size WxH] [--seed N] [--mode WHO] [--script FILE] [--shows N] "
+     "[--paces N]",
      "prints what happens in a show, to the millisecond",
      "\n"
      "  --size WxH    the stage in pixels; 1024x768 if not told\n"
      "  --seed N      of the random numbers; the same show for the same seed\n"
-     "  --mode WHO    who shows it: saver (if not told) or player\n"
+     "  --mode WHO    who shows it: saver (if not told), player or editor\n"
+     "  --script FILE what a user does in the editor; the Toons are there to be opened\n"
      "  --walk-about  traces walks about, in the place of Toons\n"
      "  --shows N     after how many shows the stage closes; 1 if not told\n"
      "  --paces N     the odometer at the start\n"
@@ -84,7 +86,8 @@ constexpr Help helps[] = {
      "\n"
      "  toon trace intro.zkt\n"
      "  toon trace intro.zkt --size 1920x1080 | grep ' walk '\n"
-     "  toon trace --walk-about --seed 7 --shows 5\n"},
+     "  toon trace --walk-about --seed 7 --shows 5\n"
+     "  toon trace --mode editor --script my.scene intro.zkt\n"},
 };
 
 const Help* find(const std::string& command) {

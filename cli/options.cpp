@@ -53,6 +53,19 @@ bool readMode(const std::string& value, StageArguments& arguments) {
     return player || value == "saver";
 }
 
+bool readTraceMode(const std::string& value, StageArguments& arguments) {
+    if (value != "editor") {
+        return readMode(value, arguments);
+    }
+    arguments.stage.mode = ReplayMode::editor;
+    return true;
+}
+
+bool readScript(const std::string& value, StageArguments& arguments) {
+    arguments.script = value;
+    return !value.empty();
+}
+
 bool readWalkAbout(const std::string& /*value*/, StageArguments& arguments) {
     arguments.walkAbout = true;
     return true;
@@ -94,6 +107,8 @@ const Option optionShows = {"--shows", "a number from 1 on", readShows};
 const Option optionPaces = {"--paces", "a number of 0 to 4294967295", readPaces};
 const Option optionStill = {"--still", "a moment in milliseconds from 0 on", readStill};
 const Option optionMode = {"--mode", "saver or player", readMode};
+const Option optionTraceMode = {"--mode", "saver, player or editor", readTraceMode};
+const Option optionScript = {"--script", "a file", readScript};
 const Option optionWalkAbout = {"--walk-about", nullptr, readWalkAbout};
 
 std::string ReadArguments(const std::vector<std::string>& line, const std::vector<Option>& options,

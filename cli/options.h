@@ -12,6 +12,7 @@ struct StageArguments {
     ReplayOptions stage;
     bool walkAbout = false;
     std::optional<std::int64_t> still; // ms
+    std::string script;                // file of a scene
     std::vector<std::string> names;    // what is no option, in its order
 };
 
@@ -22,13 +23,15 @@ struct Option {
     bool (*read)(const std::string& value, StageArguments& arguments); // false: not such a value
 };
 
-// --size WxH, --seed N, --shows N, --paces N, --still MS, --mode WHO, --walk-about
+// --size WxH, --seed N, --shows N, --paces N, --still MS, --mode WHO, --script FILE, --walk-about
 extern const Option optionSize;
 extern const Option optionSeed;
 extern const Option optionShows;
 extern const Option optionPaces;
 extern const Option optionStill;
 extern const Option optionMode;
+extern const Option optionTraceMode; // --mode, which knows the editor too
+extern const Option optionScript;
 extern const Option optionWalkAbout;
 
 /// Reads a command line with these options, in any order and place; what stands behind `--` is no

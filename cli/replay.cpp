@@ -1,5 +1,6 @@
 #include "cli/replay.h"
 
+#include "editor/editor_shell.h"
 #include "platform/kernel.h"
 #include "platform/trace.h"
 #include "saver/saver_guard.h"
@@ -13,6 +14,7 @@
 #include "toon/settings.h"
 #include "toon/toon_document.h"
 
+#include <algorithm>
 #include <cstdlib>
 #include <filesystem>
 #include <stdexcept>
@@ -49,7 +51,29 @@ LRESULT replayProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
                  : SaverGuardProc(window, message, wParam, lParam);
 }
 
+/// The editor's windows have procedures of their own, and its shows only the record to tell of
+/// their ends.
+void tellLine(const char* event) {
+    const std::string line = event;
+    if (mode == ReplayMode::editor && line.ends_with(" show_done") && RandomWalkActive == 0) {
+        ++showsDone;
+    }
+    if (hooked->line) {
+        hooked->line(line);
+    }
+}
+
+HWND createEditor() {
+    const HINSTANCE instance = GetModuleHandleA(nullptr);
+    EditorClassSetup(instance); // refused from the second replay on
+    CreateEditorWindows(instance, SW_SHOWNORMAL);
+    return EditorMainWindow;
+}
+
 HWND createStage(const ReplayOptions& options) {
+    if (options.mode == ReplayMode::editor) {
+        return createEditor();
+    }
     WNDCLASSA windowClass{};
     windowClass.lpfnWndProc = replayProc;
     windowClass.hInstance = GetModuleHandleA(nullptr);
@@ -167,8 +191,8 @@ class ToldStage {
   public:
     ToldStage(const ReplayOptions& options, const ReplayHooks& hooks, ReplayEnd& end) {
         hooked = &hooks;
-        if (hooks.line) {
-            TraceSink = [](const char* event) { hooked->line(event); };
+        if (hooks.line || options.mode == ReplayMode::editor) {
+            TraceSink = tellLine;
         }
         if (hooks.picture) {
             seam::watchPictures([&](HWND, const RECT& drawn, const seam::PixelView& picture) {
@@ -179,6 +203,7 @@ class ToldStage {
             end.message = end.message.empty() ? text : end.message;
             return IDOK;
         });
+        seam::answerFileDialogs([](const std::string&) { return std::nullopt; });
         stage_ = createStage(options);
     }
 
@@ -190,6 +215,7 @@ class ToldStage {
         TraceSink = nullptr;
         seam::watchPictures(nullptr);
         seam::answerBoxes(nullptr);
+        seam::answerFileDialogs(nullptr);
         hooked = nullptr;
     }
 
@@ -207,10 +233,27 @@ class ToldStage {
     HWND stage_;
 };
 
+/// Does a step of a scene at its moment; false if the stage has closed, or mustn't go on.
+bool actStep(const SceneStep& step, const ReplayHooks& hooks) {
+    auto due = seam::nextDeadline();
+    while (due && *due <= step.moment) {
+        if ((hooks.goesOn && !hooks.goesOn()) || !seam::runUntil(*due)) {
+            return false;
+        }
+        due = seam::nextDeadline();
+    }
+    if (!seam::runUntil(step.moment)) {
+        return false;
+    }
+    step.act();
+    return seam::runUntil(step.moment);
+}
+
 /// Goes from one moment at which something happens to the next one, as far as it may.
 void act(const ReplayOptions& options, const ReplayHooks& hooks) {
+    bool stands = std::ranges::all_of(options.scene,
+                                      [&](const SceneStep& step) { return actStep(step, hooks); });
     auto due = seam::nextDeadline();
-    bool stands = true;
     while (stands && due && *due <= options.longest && (!hooks.goesOn || hooks.goesOn())) {
         stands = seam::runUntil(*due);
         due = seam::nextDeadline();
@@ -223,7 +266,8 @@ void act(const ReplayOptions& options, const ReplayHooks& hooks) {
 } // namespace
 
 ReplayEnd Replay(const ReplayOptions& options, const ReplayHooks& hooks) {
-    setenv("QT_QPA_PLATFORM", "offscreen", 1); // whatever the user's desktop is
+    setenv("QT_QPA_PLATFORM", "offscreen", 1);              // whatever the user's desktop is
+    setenv("QT_LOGGING_RULES", "default.warning=false", 0); // of what that platform can't do
     const fs::path before = fs::current_path();
     const ReplayGround ground;
     const std::vector<std::string> names = copyToons(options, before, ground.toons());

@@ -1,8 +1,9 @@
 // Acts shows out on a clock moved by hand, without a screen, and keeps the record of what happened:
-// the saver's or the player's own road from its window's creation on, the same each time for the
-// same seed.
+// the saver's, the player's or the editor's own road from its window's creation on, the same each
+// time for the same seed.
 #pragma once
 
+#include "cli/scene.h"
 #include "platform/harness.h"
 
 #include <cstdint>
@@ -41,20 +42,24 @@ class ReplayGround {
 /// its start and seeds the second. For the time between two stages only.
 void ForgetEarlierStages();
 
-/// Who shows it: the saver, or the player of a single Toon, which knows one show only.
-enum class ReplayMode { saver, player };
+/// Who shows it: the saver, the player of a single Toon, which knows one show only, or the editor,
+/// where a user acts. The editor's stage is as large as the screen lets it be: 750x700 on the one
+/// that the toolkit gives us where there is none. Its main window and it are made at one moment,
+/// from which times count.
+enum class ReplayMode { saver, player, editor };
 
 struct ReplayOptions {
     ReplayMode mode = ReplayMode::saver;
     std::vector<std::string>
         toons;        // files; copied into a directory of their own. None: walks about
-    int width = 1024; // of the stage, in pixels
+    int width = 1024; // of the stage, in pixels; not of the editor's
     int height = 768;
     std::uint32_t seed = 1;  // of the random numbers
-    int shows = 1;           // after how many ends of a show the stage closes
+    int shows = 1;           // after how many ends of a show the stage closes; not the editor's
     std::uint32_t paces = 0; // the odometer at the start; 0 plays intro.zkt first
     std::int64_t longest = 24LL * 60 * 60 * 1000; // ms, after which the stage closes at the latest
     bool statements = true;                       // whether walks about use the table of statements
+    std::vector<SceneStep> scene;                 // what is done in the editor
     bool anyName = true; // a Toon is played whatever its file is called; else as the saver finds it
 };
 
@@ -79,9 +84,11 @@ struct ReplayEnd {
     std::string message;     // what the first message box said; empty if none came up
 };
 
-/// Acts shows out as the saver or the player does. A stage that stands still for good, as after a
-/// Toon that doesn't load, is closed; message boxes are answered with OK. The settings are those of
-/// a fresh user and lie in a directory that goes at the end. What a hook throws closes the stage
-/// and is passed on, but for `line`, which must not throw. Throws a std::exception that tells why
-/// if the files can't be copied or there is no room for the stage.
+/// Acts shows out as the saver or the player does, or a scene of the editor, of which a step comes
+/// after all that falls due at its moment. A stage that stands still for good, as after a
+/// Toon that doesn't load, or a scene's last step, is closed; message boxes are answered with OK,
+/// file dialogs as the scene says. The settings are those of a fresh user and lie in a directory
+/// that goes at the end. What a hook throws closes the stage and is passed on, but for `line`,
+/// which must not throw. Throws a std::exception that tells why if the files can't be copied or
+/// there is no room for the stage.
 ReplayEnd Replay(const ReplayOptions& options, const ReplayHooks& hooks);

@@ -11,13 +11,20 @@
 #include <cstdio>
 #include <cstring>
 #include <exception>
+#include <fstream>
+#include <stdexcept>
 
 static std::string readTraceArguments(const std::vector<std::string>& line,
                                       StageArguments& arguments) {
-    std::string wrong = ReadArguments(
-        line, {optionSize, optionSeed, optionShows, optionPaces, optionMode, optionWalkAbout},
-        arguments);
-    if (wrong.empty() && arguments.names.empty() && !arguments.walkAbout) {
+    std::string wrong = ReadArguments(line,
+                                      {optionSize, optionSeed, optionShows, optionPaces,
+                                       optionTraceMode, optionScript, optionWalkAbout},
+                                      arguments);
+    const bool edits = arguments.stage.mode == ReplayMode::editor;
+    if (wrong.empty() && !edits && !arguments.script.empty()) {
+        return "--script is for --mode editor";
+    }
+    if (wrong.empty() && !edits && arguments.names.empty() && !arguments.walkAbout) {
         return "it takes a Toon, or --walk-about";
     }
     if (!arguments.walkAbout) {
@@ -29,6 +36,14 @@ static std::string readTraceArguments(const std::vector<std::string>& line,
 static int fail(const std::string& what) {
     std::fprintf(stderr, "toon trace: %s\n", what.c_str());
     return 1;
+}
+
+static std::vector<SceneStep> readScript(const std::string& file) {
+    std::ifstream in(file);
+    if (!in) {
+        throw std::runtime_error(file + ": it can't be read");
+    }
+    return ReadScene(in, file);
 }
 
 /// A line as people read it: what he says is UTF-8, and stands on one line whatever it holds.
@@ -67,7 +82,8 @@ static int printTrace(const ReplayOptions& options) {
     if (error != 0) {
         return fail(std::string("the record can't be written: ") + std::strerror(error));
     }
-    return end.message.empty() ? 0 : fail("the saver says: " + end.message);
+    const bool plays = options.mode != ReplayMode::editor; // where a box is part of the scene
+    return end.message.empty() || !plays ? 0 : fail("the saver says: " + end.message);
 }
 
 int TraceCommand(const std::vector<std::string>& line) {
@@ -76,12 +92,16 @@ int TraceCommand(const std::vector<std::string>& line) {
     if (!wrong.empty()) {
         return TellWrongUsage("trace", wrong);
     }
-    const std::string unplayable = WhyUnplayable(arguments.stage.toons);
+    const bool plays = arguments.stage.mode != ReplayMode::editor;
+    const std::string unplayable = plays ? WhyUnplayable(arguments.stage.toons) : "";
     if (!unplayable.empty()) {
         return fail(unplayable);
     }
     CatchInterruptions();
     try {
+        if (!arguments.script.empty()) {
+            arguments.stage.scene = readScript(arguments.script);
+        }
         return printTrace(arguments.stage);
     } catch (const std::exception& error) {
         return fail(error.what());

@@ -4,5 +4,6 @@
 #include <string>
 #include <vector>
 
-/// toon trace FILE.zkt... or --walk-about: prints the record of the show; gives the exit code.
+/// toon trace FILE.zkt..., or --walk-about, or --mode editor: prints the record of the show; gives
+/// the exit code.
 int TraceCommand(const std::vector<std::string>& line);

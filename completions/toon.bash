@@ -13,7 +13,13 @@ _toon() {
         return
         ;;
     --mode)
-        COMPREPLY=($(compgen -W "saver player" -- "$word"))
+        words="saver player"
+        [ "${COMP_WORDS[1]}" != trace ] || words+=" editor"
+        COMPREPLY=($(compgen -W "$words" -- "$word"))
+        return
+        ;;
+    --script)
+        compopt -o default
         return
         ;;
     --seed | --still | --shows | --paces) return ;;
@@ -30,7 +36,7 @@ _toon() {
         words="--size --seed --mode --walk-about --still --help"
         [ "$COMP_CWORD" -le 2 ] || files='*'
         ;;
-    trace) words="--size --seed --mode --walk-about --shows --paces --help" ;;
+    trace) words="--size --seed --mode --script --walk-about --shows --paces --help" ;;
     *) return ;;
     esac
     if [[ $word == -* ]]; then

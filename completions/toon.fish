@@ -20,5 +20,7 @@ complete -c toon -n "$stage" -l walk-about -d 'a walk about in the place of a To
 complete -c toon -n '__fish_seen_subcommand_from film' -F
 complete -c toon -n '__fish_seen_subcommand_from film' -l still -x -d 'the picture at a millisecond'
 complete -c toon -n "$stage" -l mode -x -a 'saver player' -d 'who shows it'
+complete -c toon -n '__fish_seen_subcommand_from trace' -l mode -x -a 'editor' -d 'who shows it'
+complete -c toon -n '__fish_seen_subcommand_from trace' -l script -r -F -d 'what a user does in the editor'
 complete -c toon -n '__fish_seen_subcommand_from trace' -l shows -x -d 'after how many the stage closes'
 complete -c toon -n '__fish_seen_subcommand_from trace' -l paces -x -d 'the odometer at the start'

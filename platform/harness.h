@@ -65,6 +65,14 @@ void countUserHandles(HandleCounts& counts);
 using BoxAnswer = std::function<int(const std::string&, const std::string&, UINT)>;
 void answerBoxes(BoxAnswer answer);
 
+/// Answers file dialogs in the user's place while set; gets the title, gives the path that was
+/// typed, or nothing for Cancel.
+using FileAnswer = std::function<std::optional<std::string>(const std::string& title)>;
+void answerFileDialogs(FileAnswer answer);
+
+/// Minimises a top-level window or brings it back, as its window manager would.
+void minimise(HWND window, bool minimised);
+
 /// A copy of a window's picture, row by row, 0x00rrggbb.
 struct Picture {
     int width = 0;

@@ -1,6 +1,7 @@
 // Where windows stand, whether they show, and which one has the keyboard.
 #include "platform/user/window.h"
 
+#include "platform/harness.h"
 #include "platform/user/controls/control.h"
 #include "platform/user/cursors.h"
 #include "platform/user/dialog.h"
@@ -107,6 +108,13 @@ void showWindow(HWND handle) {
 
 HWND keyTarget(HWND window) {
     return focus && topLevelOf(focus) == topLevelOf(window) ? focus : window;
+}
+
+void minimise(HWND window, bool minimised) {
+    const Window* found = findWindow(window);
+    if (found != nullptr && toolkitWindow(*found) != nullptr) {
+        toolkitWindow(*found)->setWindowStates(minimised ? Qt::WindowMinimized : Qt::WindowNoState);
+    }
 }
 
 void forgetFocus(HWND window) {
