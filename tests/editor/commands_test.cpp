@@ -1,0 +1,113 @@
+// What can be pressed when, and what each command does.
+#include "tests/editor/editor_fixture.h"
+
+#include "platform/user/window.h"
+
+#include <QTimer>
+
+namespace {
+
+TEST_F(EditorTest, ButtonsLabelAndTimersAreThoseOfEachState) {
+    openAtRest();
+    EXPECT_EQ(stateNow(), "idle") << "no Toon is open";
+    for (const EditorState& state : editorStates) {
+        reach(state.name);
+        EXPECT_EQ(stateNow(), state.name);
+        press(PlayButton);
+        EXPECT_EQ(stateNow(), state.afterPlay) << state.name;
+    }
+}
+
+TEST_F(EditorTest, OnlyAWalkToAFrameStopsWhenAnotherWindowIsActive) {
+    for (const EditorState& state : editorStates) {
+        reach(state.name);
+        SendMessageA(EditorMainWindow, WM_ACTIVATE, WA_ACTIVE, 0);
+        SendMessageA(EditorMainWindow, WM_ACTIVATE, WA_CLICKACTIVE, 0);
+        EXPECT_EQ(stateNow(), state.name);
+        SendMessageA(EditorMainWindow, WM_ACTIVATE, 0x10001, 0); // minimised
+        EXPECT_EQ(stateNow(), std::string("to a frame") == state.name ? "held" : state.name);
+    }
+}
+
+class Command : public EditorTest {
+  protected:
+    /// The one thing that the command does in a state; "" stands for an editor without a Toon.
+    std::string effect(const std::string& state, int command) {
+        close();
+        state.empty() ? openAtRest() : reach(state);
+        filesAsked = 0;
+        fileGiven = "";
+        boxes.clear();
+        key(command);
+        if (!EditorMainWindow || filesAsked != 0 || !boxes.empty()) {
+            return !EditorMainWindow ? "closes" : filesAsked != 0 ? "asks" : "edits";
+        }
+        const std::string after = stateNow();
+        return after == (state.empty() ? "idle" : state) ? "" : after;
+    }
+};
+
+TEST_F(Command, AKeyDoesWhatItsButtonMayDoAndElseNothing) {
+    const std::tuple<int, const char*, const char*> cases[] = {
+        {KEY_PLAY, "to a frame", ""}, {KEY_CONTINUE, "to a frame", ""},
+        {KEY_STOP, "to a frame", ""}, {KEY_OPEN, "asks", "asks"},
+        {KEY_EDIT, "edits", "edits"}, {KEY_WALK, "about", "about"},
+    };
+    for (const auto& [command, withToon, withoutToon] : cases) {
+        EXPECT_EQ(effect("idle", command), withToon) << command;
+        EXPECT_EQ(effect("", command), withoutToon) << command;
+        EXPECT_EQ(effect("about", command), "") << command;
+    }
+    EXPECT_EQ(effect("pause", KEY_OPEN), "") << "Stop shows: File can't be pressed";
+    EXPECT_EQ(effect("held", KEY_WALK), "");
+    for (const int editorsKey : {108, 128, 129, 130, 131, 132, 133, 134}) {
+        EXPECT_EQ(effect("idle", editorsKey), "") << editorsKey;
+    }
+}
+
+TEST_F(Command, AnItemOfTheMenuDoesWhatItSays) {
+    EXPECT_EQ(effect("idle", 5000), "asks");
+    EXPECT_EQ(effect("idle", 5001), "edits");
+    EXPECT_EQ(effect("idle", 5002), "to a frame");
+    EXPECT_EQ(effect("pause", 5004), "closes");
+    EXPECT_EQ(effect("idle", 5005), "");
+}
+
+TEST_F(EditorTest, OnlyOkClosesTheAboutBox) {
+    openAtRest();
+    int asked = 0;
+    const auto answer = [&] {
+        seam::forEachWindow([&](const seam::Window& window) {
+            if (window.dialog) {
+                PostMessageA(window.handle, WM_COMMAND, ++asked == 1 ? IDCANCEL : IDOK, 0);
+            }
+        });
+    };
+    QTimer timer;
+    QObject::connect(&timer, &QTimer::timeout, answer);
+    timer.start(0);
+    key(5003);
+    EXPECT_GE(asked, 2);
+}
+
+TEST_F(EditorTest, OpeningAToonShowsItAndWhatFailsChangesNothing) {
+    openAtRest();
+    EXPECT_EQ(events({"rebuild_backdrop"}).back(), "rebuild_backdrop index=0 tile=bg01");
+    for (const char* name : {"", "missing.zkt", "none.zkt"}) {
+        openToon(name);
+        EXPECT_EQ(IsWindowEnabled(PlayButton), FALSE) << name;
+        EXPECT_STREQ(ToonFileName, "") << name;
+    }
+    EXPECT_EQ(boxes.size(), 2U);
+    openToon("two.zkt");
+    EXPECT_EQ(events({"rebuild_backdrop"}).back(), "rebuild_backdrop index=3 tile=bg03");
+    reach("at frame");
+    openToon("");
+    EXPECT_EQ(stateNow(), "at frame");
+    EXPECT_EQ(FrameCount, 2);
+    openToon("one.zkt");
+    EXPECT_EQ(stateNow(), "idle");
+    EXPECT_EQ(FrameCount, 1);
+}
+
+} // namespace
