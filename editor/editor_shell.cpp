@@ -93,6 +93,8 @@ int CreateEditorWindows(HINSTANCE instance, int showCommand) {
     EditorAccelerators = LoadAcceleratorsA(instance, "BUTTONS");
     EditorStage = CreateWindowExA(0, STAGE_CLASS, "no text", WS_CHILD | WS_VISIBLE | WS_BORDER, 0,
                                   0, 0, 0, mainWindow, nullptr, instance, nullptr);
+    // The class has outlived the last run, which may have been closed in the middle of a show.
+    SetClassLongA(EditorStage, GCL_HCURSOR, static_cast<LONG>(ArrowCursor.number));
     return 1;
 }
 

@@ -6,6 +6,7 @@
 #include "stage/player.h"
 #include "stage/random_walk.h"
 #include "stage/walk.h"
+#include "toon/toon_document.h"
 
 DWORD SaverActive;
 DWORD PreviewMode;
@@ -49,6 +50,7 @@ void StageBegin() {
     BubbleHidden = 1;
     RandomWalkActive = 0;
     WalkingOut = 0;
+    ToonDocHeader.windowSize = 0; // no Toon is in memory that a walk about would be scaled by
 }
 
 void SendShowDone(HWND stage) {

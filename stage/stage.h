@@ -35,7 +35,8 @@ extern DWORD SaverActive;
 /// 1 once the saver runs as a child of a given window. Written by the saver.
 extern DWORD PreviewMode;
 
-/// Puts the whole stage at rest before a new stage window has set a timer. What outlives a stage
+/// Puts the whole stage at rest before a new stage window has set a timer, and forgets the stage on
+/// which the last Toon was made: none is in memory by which to scale. What outlives a stage
 /// stays: the last mouth shape, the last statement and background, the speed and the caption, where
 /// he last stood and walked to. OpeningDone and TitleShown are the host's to clear. Art, fonts and
 /// backdrop aren't touched. Timers stand under their

@@ -116,11 +116,17 @@ TEST_F(EditorTest, ClosedInAnyStateItsStageBeginsClean) {
             {"FrameCount", FrameCount, 1},
             {"ToonFileName", ToonFileName[0], 0},
             {"BackgroundIndex", BackgroundIndex, 0},
+            {"cursor", SetClassLongA(EditorStage, GCL_HCURSOR, LONG{IDC_ARROW.number}),
+             IDC_ARROW.number},
         };
         for (const auto& [name, is, shouldBe] : values) {
             EXPECT_EQ(is, shouldBe) << name << ", closed at " << state.name;
         }
         EXPECT_STREQ(CaptionText, "Fenky Dorbo's Rematch");
+        record.clear();
+        pass(1200);
+        EXPECT_THAT(events({"walk"}), testing::Contains(testing::HasSubstr("to=[275,350]")))
+            << "no Toon is in memory to scale by";
         close();
     }
 }
