@@ -15,6 +15,7 @@
 
 LONG NextFrameIndex;
 DWORD ShowStarted;
+DWORD WalkingOff;
 DWORD AwaitingArrival;
 DWORD PlayIdle = 1;
 LONG PendingPause;
@@ -61,6 +62,7 @@ UINT_PTR WalkOffStage(HWND stage) {
         WalkTo(stage, CharacterX, CharacterY, targetX, CharacterY, WALK_OFF_POSE);
     NextFrameIndex = 0;
     ShowStarted = 0;
+    WalkingOff = 1;
     AwaitingArrival = 0;
     PlayIdle = 1;
     return begun;
@@ -91,6 +93,7 @@ void FrameArrival(HWND stage) {
         ArrivalPause(stage, PlayFrame.text, PlayFrame.pause);
         return;
     }
+    WalkingOff = 0;
     SetBusyCursor(stage, 0);
     SetPlayButton(PLAY_BUTTON_PLAY);
     SendShowDone(stage);
@@ -161,11 +164,12 @@ void ResetShow(HWND stage) {
     EnterShow(stage);
     SetPlayButton(PLAY_BUTTON_PLAY);
     ShowStarted = 0;
+    WalkingOff = 0;
     AwaitingArrival = 0;
 }
 
 bool ShowUnderWay() {
-    return NextFrameIndex != 0 || ShowStarted != 0;
+    return NextFrameIndex != 0 || ShowStarted != 0 || WalkingOff != 0;
 }
 
 LONG PlayProgress(LONG range) {

@@ -15,6 +15,9 @@ extern LONG NextFrameIndex;
 /// 1 from the moment when he has been brought on for a show until he walks off.
 extern DWORD ShowStarted;
 
+/// 1 while he walks off at the end of a show.
+extern DWORD WalkingOff;
+
 /// 1 while the walk under way leads to a frame, also while it stands stopped. The Play command also
 /// sets it.
 extern DWORD AwaitingArrival;
@@ -69,8 +72,8 @@ void CancelArrival(HWND stage);
 /// random walk's flag stays. Nothing at all while no art is loaded.
 void ResetShow(HWND stage);
 
-/// Whether a show has begun and the walk off hasn't: also while it stands stopped at its first
-/// frame. The walk off itself shows in WalkTimerRunning only.
+/// Whether a show has begun and the walk off hasn't ended: also while it stands stopped at its first
+/// frame.
 bool ShowUnderWay();
 
 /// The part of `range` that the show has come through, the frame walked to included.

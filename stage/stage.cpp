@@ -42,6 +42,7 @@ void StageBegin() {
     WalkStepIndex = 0;
     NextFrameIndex = 0;
     ShowStarted = 0;
+    WalkingOff = 0;
     AwaitingArrival = 0;
     PlayIdle = 1;
     PendingPause = 0;

@@ -258,6 +258,7 @@ BOOL EndDialog(HWND dialog, LPARAM result) {
         return FALSE;
     }
     window->dialog->result = result;
+    queuePosted({}); // its loop may be waiting, where this comes from one of the toolkit's events
     return TRUE;
 }
 

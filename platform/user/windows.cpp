@@ -125,6 +125,9 @@ void passActivationOn(const Window& window) {
 
 void removeWindow(HWND handle) {
     const Window* window = findWindow(handle);
+    if (window != nullptr && window->dialog) {
+        queuePosted({}); // the loop that it runs may be waiting
+    }
     if (window == nullptr) {
         return; // a handler of its end has taken its owner away, and it with it
     }

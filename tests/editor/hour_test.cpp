@@ -50,7 +50,7 @@ class Hour : public EditorTest {
     }
 
   private:
-    std::mt19937 random_{20};
+    std::mt19937 random_{7};
 };
 
 TEST_F(Hour, IsAlwaysInOneOfTheStatesAndPassesThroughEach) {
