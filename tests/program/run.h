@@ -11,6 +11,8 @@ namespace ground {
 
 class Run : public testing::Test {
   protected:
+    explicit Run(QSize screen = {800, 600}) : ground(screen.width(), screen.height()) {}
+
     void addToon(const std::string& name) {
         std::filesystem::copy_file(std::string(DORBO_TOONS "/") + name, ground.toons() / name);
     }
