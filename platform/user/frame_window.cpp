@@ -5,6 +5,8 @@
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
 
+#include <QAccessible>
+#include <QAccessibleWidget>
 #include <QCloseEvent>
 #include <QGuiApplication>
 #include <QKeyEvent>
@@ -19,6 +21,12 @@ namespace {
 
 constexpr QPoint clientCorner(FrameWindow::border, FrameWindow::border);
 
+/// Says of a framed window that it is a window; else it would be told of as a mere part of one.
+QAccessibleInterface* accessibleWindow(const QString& /*className*/, QObject* object) {
+    auto* window = dynamic_cast<FrameWindow*>(object);
+    return window == nullptr ? nullptr : new QAccessibleWidget(window, QAccessible::Window);
+}
+
 } // namespace
 
 FrameWindow::FrameWindow(HWND owner, const QRect& place) : WindowPicture(owner) {
@@ -26,6 +34,7 @@ FrameWindow::FrameWindow(HWND owner, const QRect& place) : WindowPicture(owner) 
     setAttribute(Qt::WA_OpaquePaintEvent);
     setAttribute(Qt::WA_NoSystemBackground);
     setMouseTracking(true);
+    QAccessible::installFactory(accessibleWindow); // once, however often it is asked for
     moveTo(place);
     winId(); // makes its window
     windowHandle()->installEventFilter(this);
