@@ -218,8 +218,11 @@ int Ground::command(const std::vector<std::string>& words) const {
 }
 
 void Ground::typeInto(const std::string& title, const std::string& text) const {
-    command(
-        {"xdotool", "search", "--sync", "--onlyvisible", "--name", title, "windowfocus", "--sync"});
+    // It gives up over a window that goes while it looks: then once more.
+    waitFor([&] {
+        return command({"xdotool", "search", "--sync", "--onlyvisible", "--name", title,
+                        "windowfocus", "--sync"}) == 0;
+    });
     command({"xdotool", "type", text});
     press("Return");
 }
