@@ -85,13 +85,8 @@ void FrameWindow::queueActivation(bool active) {
     const MSG activation{owner_, WM_ACTIVATE,
                          static_cast<WPARAM>(MAKELONG(active ? WA_ACTIVE : WA_INACTIVE, minimised)),
                          0, 0};
-    if (active) {
-        queueInput(activation);
-        queueInput({owner_, WM_SETFOCUS, 0, 0, 0});
-    } else {
-        queueInput({owner_, WM_KILLFOCUS, 0, 0, 0});
-        queueInput(activation);
-    }
+    queueInput({owner_, static_cast<UINT>(active ? WM_SETFOCUS : WM_KILLFOCUS), 0, 0, 0});
+    queuePosted(activation); // no input: it doesn't wait until a box that takes it away is answered
 }
 
 bool FrameWindow::event(QEvent* event) {

@@ -31,6 +31,10 @@ class Chrome : public Run, public testing::WithParamInterface<QSize> {
         return ground.command({"xdotool", "search", "--onlyvisible", "--name", name, what}) == 0;
     }
 
+    void activate(const std::string& name) {
+        ASSERT_TRUE(waitFor([&] { return window(name, "windowactivate"); }));
+    }
+
     void openEditor() {
         // The first keys may come before the dialog is there and has the keyboard.
         ASSERT_TRUE(waitFor([&] {
@@ -49,6 +53,7 @@ class Chrome : public Run, public testing::WithParamInterface<QSize> {
         }
         std::ofstream(ground.toons() / "short.zkt", std::ios::binary) << toon;
         ground.press("ctrl+o");
+        expect({.active = false}, "behind a dialog");
         ground.typeInto("Open Toon File", "short.zkt");
     }
 
@@ -160,9 +165,9 @@ TEST_P(Chrome, LooksAsDrawn) {
     EXPECT_EQ(coloursOf(text), (std::set<QRgb>{black, dark, light, face}));
     expect({.walking = true}, "while he says hello");
     press(close, {.walking = true});
-    window("Rematch", "windowactivate");
+    activate("Rematch");
     expect({.active = false, .walking = true}, "inactive");
-    window(title, "windowactivate");
+    activate(title);
     expect({.walking = true}, "active again");
     if (GetParam().width() == 640) { // where he has soon gone again
         expect({}, "at rest");
