@@ -2,6 +2,7 @@
 #include "editor/button_states.h"
 
 #include "editor/chrome.h"
+#include "editor/editor_shell.h"
 #include "platform/trace.h"
 #include "stage/player.h"
 #include "stage/stage.h"
@@ -57,4 +58,14 @@ void RestoreButtons() {
         EnableWindow(SysButton(i), SavedSysStates[i]);
     }
     ButtonsSaved = 0;
+}
+
+void EndShow() {
+    if (!EditorMainWindow || !ShowUnderWay()) {
+        return;
+    }
+    SetBusyCursor(EditorStage, 0);
+    ResetShow(EditorStage);
+    RestoreButtons();
+    DrawProgress(EditorMainWindow);
 }

@@ -33,13 +33,9 @@ static HPEN FacePen;
 constexpr LONG ButtonWidth = 75;
 constexpr LONG ButtonHeight = 23;
 constexpr LONG SysButtonSize = 15;
-constexpr LONG MARGIN = 10;       // left and right of the stage, and of the buttons
-constexpr LONG ABOVE_STAGE = 25;  // of caption
-constexpr LONG BELOW_STAGE = 40;  // of buttons
 constexpr LONG BELOW_BUTTONS = 9; // File and Play
 
-// ---- What a run makes
-// ---------------------------------------------------------------------------
+// ---- What a run makes ---------------------------------------------------------------------------
 
 void CreateChromeTools(HINSTANCE instance) {
     SysButtonsBitmap = LoadBitmapA(instance, "sysbuts");
@@ -115,8 +111,7 @@ void PlaceSysButtons(HWND mainWindow) {
     MoveWindow(CloseButton, x + SysButtonSize, top, SysButtonSize, SysButtonSize, TRUE);
 }
 
-// ---- Places
-// -------------------------------------------------------------------------------------
+// ---- Places -------------------------------------------------------------------------------------
 
 /// The caption's width in pixels; FALSE if it can't be told.
 static BOOL MeasureCaption(HWND mainWindow, LONG* width) {
@@ -165,8 +160,7 @@ LRESULT ChromeHitTest(HWND mainWindow, LPARAM point) {
     return drags ? HTCAPTION : HTNOWHERE;
 }
 
-// ---- Painting
-// -----------------------------------------------------------------------------------
+// ---- Painting -----------------------------------------------------------------------------------
 
 static void BevelRect(HDC dc, const RECT& place, int width) {
     DrawBevel(dc, place.left, place.top, place.right, place.bottom, width);

@@ -1,13 +1,13 @@
 // The looks of the editor's main window, which has no frame of the window manager's: caption,
 // buttons, a sunken frame round the stage, a bar of progress. All places are in pixels of its
-// client area; no failure is reported.
+// client area; no failure is reported. The bar is drawn by DrawProgress, which the stage asks for
+// too (stage/editor_host.h).
 #pragma once
 
 #include "platform/dialogs.h"
 #include "stage/editor_host.h"
 
-// ---- What a run makes
-// -----------------------------------------------------------------------------
+// ---- What a run makes ---------------------------------------------------------------------------
 
 /// The five buttons. They have no ids: whoever gets their commands knows them by their handles.
 /// Null while there is no editor.
@@ -33,8 +33,15 @@ void DestroySysButtons();
 void PlaceMainButtons(HWND mainWindow);
 void PlaceSysButtons(HWND mainWindow);
 
-// ---- Places
-// ---------------------------------------------------------------------------------------
+// ---- Places -------------------------------------------------------------------------------------
+
+constexpr LONG MARGIN = 10;      // left and right of the stage, and of the buttons
+constexpr LONG ABOVE_STAGE = 25; // of caption
+constexpr LONG BELOW_STAGE = 40; // of buttons
+
+/// What the chrome adds to the stage.
+constexpr int CHROME_ACROSS = 2 * MARGIN;
+constexpr int CHROME_DOWN = ABOVE_STAGE + BELOW_STAGE;
 
 /// The sunken frame, and the caption strip: two caps with buttons in them, two bars, the text
 /// between. Written by LayoutChrome.
@@ -45,15 +52,15 @@ extern RECT CaptionTextRect;
 extern RECT CaptionRightBar;
 extern RECT CaptionRightCap;
 
-/// Works the places out anew: the caption in force says how long the bars are.
+/// Works the places out anew: the caption in force says how long the bars are. The caption strip
+/// stays as it was if its text can't be measured.
 void LayoutChrome(HWND mainWindow);
 
 /// The answer to WM_NCHITTEST: HTCAPTION on the bars and on the text, which thus drag the window,
 /// else HTNOWHERE.
 LRESULT ChromeHitTest(HWND mainWindow, LPARAM point);
 
-// ---- Painting
-// -------------------------------------------------------------------------------------
+// ---- Painting -----------------------------------------------------------------------------------
 
 /// The handler of WM_PAINT. The caption pieces come out in the active colours, whatever the window
 /// is.

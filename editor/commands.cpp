@@ -1,5 +1,6 @@
 #include "editor/commands.h"
 
+#include "editor/button_states.h"
 #include "editor/chrome.h"
 #include "editor/editor_shell.h"
 #include "editor/frame_editor.h"
@@ -30,17 +31,14 @@ constexpr int ITEM_EXIT = 5004;
 
 constexpr DWORD STATEMENTS_ALLOWED = 1;
 
-// ---- Commands
-// -----------------------------------------------------------------------------------
+// ---- Commands -----------------------------------------------------------------------------------
 
 /// A show that is under way ends where the frames that it plays have gone.
 static void OpenToon(HWND mainWindow) {
     const HGLOBAL before = FrameStore;
     ToonOpenFromMenu(mainWindow);
-    if (FrameStore != before && ShowUnderWay()) {
-        ResetShow(EditorStage);
-        RestoreButtons();
-        DrawProgress(mainWindow);
+    if (FrameStore != before) {
+        EndShow();
     }
 }
 
@@ -153,8 +151,7 @@ void PopupCommand(HWND mainWindow, WPARAM wParam, HINSTANCE instance) {
     }
 }
 
-// ---- The menu
-// -----------------------------------------------------------------------------------
+// ---- The menu -----------------------------------------------------------------------------------
 
 void CreateFilePopup() {
     FilePopup = CreatePopupMenu();

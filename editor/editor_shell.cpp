@@ -22,14 +22,13 @@
 
 HWND EditorMainWindow;
 HWND EditorStage;
-DWORD EditorRepaintFlag = 1;
 
-static HWND EditorOwner; // the setup dialog
+static DWORD EditorRepaintFlag = 1; // for PaintStage: keep anew what lies under him
+static HWND EditorOwner;            // the setup dialog
 static HINSTANCE EditorClassInstance;
 static HACCEL EditorAccelerators;
 static HCURSOR TargetCursor;
 static HCURSOR ArrowCursor;
-static HCURSOR WaitCursor;
 
 constexpr const char* MAIN_CLASS = "ToonHelpClass";
 constexpr const char* STAGE_CLASS = "ToonChildClass";
@@ -40,8 +39,7 @@ constexpr int CAPTION_STRING = 1;
 constexpr int TITLE_STRING = 3;
 constexpr int CAPTION_LIMIT = 30; // bytes of the first caption, its NUL included
 
-// ---- A run
-// --------------------------------------------------------------------------------------
+// ---- A run --------------------------------------------------------------------------------------
 
 /// Accelerators come first, wherever the focus is; then the frame editor's keys.
 static int TranslateKey(const MSG* message) {
@@ -56,7 +54,7 @@ int RunEditor(HINSTANCE instance, HWND owner, int showCommand) {
     if (!EditorClassInstance && !EditorClassSetup(instance)) {
         return 0;
     }
-    EditorClassInstance = instance;
+    EditorClassInstance = instance; // also if what follows fails: a class is set up once
     if (!CreateEditorWindows(instance, showCommand)) {
         return 0;
     }
@@ -99,13 +97,11 @@ int CreateEditorWindows(HINSTANCE instance, int showCommand) {
 }
 
 void SizeMainWindow(HWND mainWindow) {
-    constexpr int besideStage = 20;
-    constexpr int aboveAndBelowStage = 65;
     const int screenWidth = GetSystemMetrics(SM_CXSCREEN);
     const int screenHeight = GetSystemMetrics(SM_CYSCREEN);
     StageSize = MAKELONG(screenWidth - 50, screenHeight - 100);
-    const int width = LOWORD(StageSize) + 2 * GetSystemMetrics(SM_CXBORDER) + besideStage;
-    const int height = HIWORD(StageSize) + 2 * GetSystemMetrics(SM_CYBORDER) + aboveAndBelowStage;
+    const int width = LOWORD(StageSize) + 2 * GetSystemMetrics(SM_CXBORDER) + CHROME_ACROSS;
+    const int height = HIWORD(StageSize) + 2 * GetSystemMetrics(SM_CYBORDER) + CHROME_DOWN;
     MoveWindow(mainWindow, (screenWidth - width) / 2, (screenHeight - height) / 2, width, height,
                TRUE);
 }
@@ -131,7 +127,6 @@ void EditorStartup(HWND mainWindow, HINSTANCE instance) {
     LoadExpressionSheet(instance);
     TargetCursor = LoadCursorA(instance, "target");
     ArrowCursor = LoadCursorA(nullptr, IDC_ARROW);
-    WaitCursor = LoadCursorA(nullptr, IDC_WAIT);
     BylineFont = MakeFont(16, FW_NORMAL, "MS Serif");
     TitleFont = MakeFont(32, FW_BOLD, "MS Serif");
     CreateChromeTools(instance);
@@ -150,7 +145,6 @@ void EditorShutdown() {
     FreeFont(&BylineFont);
     FreeFont(&TitleFont);
     DestroyChromeTools();
-    DestroyCursor(WaitCursor);
     DestroyCursor(TargetCursor);
     DestroyCursor(ArrowCursor);
     BackdropBitmap = nullptr;
@@ -165,8 +159,7 @@ void CentreDialog(HWND window) {
                (GetSystemMetrics(SM_CYSCREEN) - height) / 2, width, height, FALSE);
 }
 
-// ---- The main window
-// ----------------------------------------------------------------------------
+// ---- The main window ----------------------------------------------------------------------------
 
 static void OpenMainWindow(HWND window, HINSTANCE instance) {
     SettingsLoad();
@@ -267,8 +260,7 @@ LRESULT MainWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) 
     }
 }
 
-// ---- The stage
-// ----------------------------------------------------------------------------------
+// ---- The stage ----------------------------------------------------------------------------------
 
 static void CloseStage() {
     Trace("close");
@@ -314,8 +306,7 @@ LRESULT StageWindowProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam)
     }
 }
 
-// ---- The about box
-// ------------------------------------------------------------------------------
+// ---- The about box ------------------------------------------------------------------------------
 
 LRESULT AboutProc(HWND dialog, UINT message, WPARAM wParam, LPARAM /*lParam*/) {
     switch (message) {

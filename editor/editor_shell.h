@@ -7,9 +7,6 @@
 /// The main window; null while no editor is open. Written here.
 extern HWND EditorMainWindow;
 
-/// The repaint flag that the editor's stage gives to PaintStage. Written by it and by PaintStage.
-extern DWORD EditorRepaintFlag;
-
 /// Opens the editor over its owner and runs it until its main window goes. 0; also if it can't
 /// start, and then nothing shows. The window classes are set up once a process.
 int RunEditor(HINSTANCE instance, HWND owner, int showCommand);

@@ -3,8 +3,7 @@
 
 #include "platform/user.h"
 
-// ---- Menus
-// -----------------------------------------------------------------------------------------
+// ---- Menus --------------------------------------------------------------------------------------
 
 constexpr UINT MF_ENABLED = 0x0000;
 constexpr UINT MF_STRING = 0x0000;
@@ -33,14 +32,14 @@ HMENU GetMenu(HWND window);
 BOOL TrackPopupMenu(HMENU menu, UINT flags, int x, int y, int reserved, HWND window,
                     const RECT* area);
 
-// ---- Accelerators
-// ----------------------------------------------------------------------------------
+// ---- Accelerators -------------------------------------------------------------------------------
 
 using HACCEL = Handle<struct AcceleratorKind>;
 
 /// A table of the resources, which lasts as long as the program; null if there is no such table or
-/// it can't be read. From here on the loop that asks for it translates its keys, wherever in the
-/// program the focus is.
+/// it can't be read. From here on the loop that runs, or begins, at this depth of the program's
+/// loops gets the table's keys as messages, wherever in the program the focus is, for as long as it
+/// gives each message to TranslateAcceleratorA.
 HACCEL LoadAcceleratorsA(HINSTANCE instance, const char* name);
 
 /// Stands in a loop before all other handling. If the message is the press of a key of the table,

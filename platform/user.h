@@ -273,7 +273,7 @@ HICON LoadIconA(HINSTANCE instance, ResourceName name); ///< of the program; nul
 HCURSOR SetCursor(HCURSOR cursor);                      ///< null: none; gives the one before
 int ShowCursor(BOOL show); ///< the display count after it; the pointer shows from 0 up
 BOOL GetCursorPos(POINT* point);
-/// Also the window that lies there is asked for its cursor anew, by a WM_MOUSEMOVE.
+/// A window of this program that has that place gets a WM_MOUSEMOVE, and so sets its cursor anew.
 BOOL SetCursorPos(int x, int y);
 
 constexpr int SM_CXSCREEN = 0; // of the primary monitor, in pixels

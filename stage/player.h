@@ -72,8 +72,8 @@ void CancelArrival(HWND stage);
 /// random walk's flag stays. Nothing at all while no art is loaded.
 void ResetShow(HWND stage);
 
-/// Whether a show has begun and the walk off hasn't ended: also while it stands stopped at its first
-/// frame.
+/// Whether a show has begun and the walk off hasn't ended: also while it stands stopped at its
+/// first frame.
 bool ShowUnderWay();
 
 /// The part of `range` that the show has come through, the frame walked to included.

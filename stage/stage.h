@@ -9,7 +9,7 @@
 
 // ---- Messages -----------------------------------------------------------------------------------
 
-// Those to the editor's main window, from 1028 on, stand in toon/toon_prompts.h.
+// Those to the editor's main window, 1028 to 1030, stand in toon/toon_prompts.h.
 constexpr UINT TM_SHOWDONE = 1031;          // to the stage: a show or walk about has ended
 constexpr UINT TM_WALKDONE = 1032;          // to the stage: a walk has ended
 constexpr UINT TM_VERIFYPASSWORD = 0x8000U; // to the saver: run the password verifier

@@ -9,6 +9,7 @@
 
 #include <algorithm>
 #include <array>
+#include <string_view>
 
 namespace seam {
 
@@ -35,7 +36,26 @@ constexpr std::array<KeyCode, 31> keyCodes{{
     {Qt::Key_AltGr, 0x12},
 }};
 
-WPARAM codeOf(int key) {
+/// Where no code goes by the character (an alphabet without A to Z, digits that need Shift), it
+/// goes by the place of the key: as on an American keyboard. X counts keys from 8 on.
+WPARAM codeOfPlace(quint32 scanCode) {
+    struct Row {
+        quint32 first;
+        std::string_view keys;
+    };
+
+    constexpr Row rows[] = {
+        {10, "1234567890"}, {24, "QWERTYUIOP"}, {38, "ASDFGHJKL"}, {52, "ZXCVBNM"}};
+    for (const Row& row : rows) {
+        if (scanCode >= row.first && scanCode < row.first + row.keys.size()) {
+            return static_cast<WPARAM>(row.keys[scanCode - row.first]);
+        }
+    }
+    return 0xFF; // a key without a code
+}
+
+WPARAM codeOf(const QKeyEvent& event) {
+    const int key = event.key();
     if ((key >= Qt::Key_A && key <= Qt::Key_Z) || (key >= Qt::Key_0 && key <= Qt::Key_9) ||
         key == Qt::Key_Space) {
         return static_cast<WPARAM>(key);
@@ -45,7 +65,7 @@ WPARAM codeOf(int key) {
     }
     const auto* found = std::find_if(keyCodes.begin(), keyCodes.end(),
                                      [key](const KeyCode& entry) { return entry.key == key; });
-    return found == keyCodes.end() ? 0xFF : found->code; // 0xFF: a key without a code
+    return found == keyCodes.end() ? codeOfPlace(event.nativeScanCode()) : found->code;
 }
 
 /// The wParam of mouse messages: which buttons are down.
@@ -67,7 +87,7 @@ UINT heldOf(Qt::KeyboardModifiers modifiers) {
 } // namespace
 
 KeyStroke keyStroke(const QKeyEvent& event) {
-    return {codeOf(event.key()), heldOf(event.modifiers())};
+    return {codeOf(event), heldOf(event.modifiers())};
 }
 
 KeyStroke keyStroke(const MSG& message) {

@@ -21,9 +21,10 @@ namespace seam {
 
 namespace {
 
+/// Never freed: windows may be destroyed when the process exits.
 HandleTable<Menu>& table() {
-    static HandleTable<Menu> menus(HandleKind::menu);
-    return menus;
+    static auto* const menus = new HandleTable<Menu>(HandleKind::menu);
+    return *menus;
 }
 
 /// The one that is open.

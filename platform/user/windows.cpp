@@ -27,14 +27,16 @@ namespace seam {
 
 namespace {
 
+// Neither is ever freed: windows may be destroyed when the process exits.
+
 HandleTable<Window>& table() {
-    static HandleTable<Window> windows(HandleKind::window);
-    return windows;
+    static auto* const windows = new HandleTable<Window>(HandleKind::window);
+    return *windows;
 }
 
 std::map<std::string, WindowClass>& classes() {
-    static std::map<std::string, WindowClass> registered;
-    return registered;
+    static auto* const registered = new std::map<std::string, WindowClass>;
+    return *registered;
 }
 
 QRect placeOnScreen(const Window& window) {
@@ -47,6 +49,12 @@ std::unique_ptr<FrameWindow> makeFrame(const Window& window) {
     auto frame = std::make_unique<FrameWindow>(window.handle, placeOnScreen(window));
     frame->setWindowTitle(shownText(window.title));
     frame->setWindowIcon(iconOf(window.windowClass->icon));
+    // What lies over a window that has an owner itself stays in front of it. A window over one that
+    // has none is minimised, raised and listed by itself.
+    const Window* owner = findWindow(window.owner);
+    if (owner != nullptr && owner->owner) {
+        frame->windowHandle()->setTransientParent(toolkitWindow(*owner));
+    }
     return frame;
 }
 

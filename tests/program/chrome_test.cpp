@@ -158,7 +158,8 @@ TEST_P(Chrome, LooksAsDrawn) {
     openEditor();
     expect({}, "at first");
     const QImage first = ground.grab();
-    const auto [left, right] = barEnds(first);
+    const std::pair ends = barEnds(first);
+    const auto [left, right] = ends;
     const int textWidth = right - left - 10;
     EXPECT_EQ(left, 8 + (client.width() - 16 - textWidth - 10) / 2) << "in the middle";
     const QImage text = first.copy(edges(left + 5, 2, right - 5, 22).translated(client.topLeft()));
@@ -174,7 +175,7 @@ TEST_P(Chrome, LooksAsDrawn) {
         press(walkAbout, {});
         press(minimise, {});
         openShortToon();
-        const auto opened = [&] { return barEnds(ground.grab()) != std::pair(left, right); };
+        const auto opened = [&] { return barEnds(ground.grab()) != ends; };
         ASSERT_TRUE(waitFor(opened)) << "it has a caption of its own";
         expect({}, "nothing walked");
         ground.press("alt+p");
