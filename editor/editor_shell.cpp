@@ -22,12 +22,12 @@
 
 HWND EditorMainWindow;
 HWND EditorStage;
+HCURSOR TargetCursor;
 
 static DWORD EditorRepaintFlag = 1; // for PaintStage: keep anew what lies under him
 static HWND EditorOwner;            // the setup dialog
 static HINSTANCE EditorClassInstance;
 static HACCEL EditorAccelerators;
-static HCURSOR TargetCursor;
 static HCURSOR ArrowCursor;
 
 constexpr const char* MAIN_CLASS = "ToonHelpClass";

@@ -7,6 +7,9 @@
 /// The main window; null while no editor is open. Written here.
 extern HWND EditorMainWindow;
 
+/// The cursor of the stage while the frame editor is open; null while no editor is.
+extern HCURSOR TargetCursor;
+
 /// Opens the editor over its owner and runs it until its main window goes. 0; also if it can't
 /// start, and then nothing shows. The window classes are set up once a process.
 int RunEditor(HINSTANCE instance, HWND owner, int showCommand);

@@ -1,10 +1,49 @@
-// The frame editor. It isn't written yet: a box says so.
+// The frame editor, where a Toon is written: a small dialog over the stage that shows one frame.
+//
+// Its fields are a scratch pad. CommitFrame takes them into the frame store, ToonSave writes the
+// store to the file; File, Save takes no fields. While it is open, the main window's keys are its
+// own, and a click on the stage gives the frame its place (FrameFromClick, stage/editor_host.h).
+//
+// Operations give 1 for done, 0 for not done, and take the dialog's window unless a line says
+// otherwise.
 #pragma once
 
 #include "platform/dialogs.h"
 
-/// Says over the main window that there is no frame editor yet.
+/// Opens it over the main window; nothing if it is open.
 void OpenFrameEditor(HWND mainWindow, HINSTANCE instance);
 
-/// A key of the main window's table while the frame editor is open: 1 if it took it.
+LRESULT FrameEditorProc(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam);
+
+/// A key of the main window's table while it is open: 1 if it took it.
 int FrameEditorAccelerator(HINSTANCE instance, int id);
+
+/// Begins a new Toon of one frame where the open one has no name; shows the current frame.
+int StartFrameEditor(HWND dialog);
+
+/// Asks about unsaved changes, and closes.
+int ExitFrameEditor(HWND dialog);
+
+/// Closes without a question. Changes that are still unsaved give way to the file's state.
+int CloseFrameEditor(HWND dialog);
+
+/// Adds a frame of zeros at the end and shows it; above 250 frames a message instead.
+int NewFrame(HWND dialog);
+
+/// Adds a frame of zeros before the current one and shows it; above 250 frames a message instead.
+int InsertFrame(HWND dialog);
+
+/// Takes the current frame out and shows the one that takes its place, or the last; the only frame
+/// is cleared instead.
+int DeleteFrame(HWND dialog);
+
+/// Has the user pick a pose. Marks the Toon as changed whatever comes of it.
+void ChoosePose(HINSTANCE instance, HWND dialog);
+
+int SaveToonAs(HWND dialog);
+int SaveToonCommand(HWND dialog);
+
+/// Opens another Toon. One that doesn't load leaves a new untitled one behind the fields, so that
+/// no save can write over its file.
+int OpenToonInEditor(HWND dialog);
+int NewToonInEditor(HWND dialog);

@@ -178,9 +178,9 @@ BOOL DestroyWindow(HWND window);
 /// WM_NCLBUTTONDOWN on HTCAPTION lets the user drag a top-level window.
 LRESULT DefWindowProcA(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
 
-BOOL IsWindow(HWND window); ///< also true of a window of another program on the same display
-BOOL IsIconic(HWND window); ///< of a child: its top-level window's state
-HWND GetParent(HWND window);
+BOOL IsWindow(HWND window);  ///< also true of a window of another program on the same display
+BOOL IsIconic(HWND window);  ///< of a child: its top-level window's state
+HWND GetParent(HWND window); ///< of a top-level window: its owner
 
 /// The top-level window with this class and title, of this process or of another one of this
 /// program that the same user runs on the same display; null if there is none.
@@ -269,6 +269,7 @@ constexpr ResourceName IDC_ARROW{32512};
 constexpr ResourceName IDC_WAIT{32514};
 HCURSOR LoadCursorA(HINSTANCE instance, ResourceName name); ///< null instance: the system's own
 BOOL DestroyCursor(HCURSOR cursor); ///< TRUE if there is such a cursor; it lasts with the program
+constexpr ResourceName IDI_APPLICATION{32512};
 HICON LoadIconA(HINSTANCE instance, ResourceName name); ///< of the program; null if none
 HCURSOR SetCursor(HCURSOR cursor);                      ///< null: none; gives the one before
 int ShowCursor(BOOL show); ///< the display count after it; the pointer shows from 0 up
@@ -276,12 +277,18 @@ BOOL GetCursorPos(POINT* point);
 /// A window of this program that has that place gets a WM_MOUSEMOVE, and so sets its cursor anew.
 BOOL SetCursorPos(int x, int y);
 
+/// Keeps the pointer within a part of the screen, until it is called with null. FALSE where that
+/// can't be had: off X11, or while another program holds the pointer. It is free again when the
+/// program ends, however it does.
+BOOL ClipCursor(const RECT* area);
+
 constexpr int SM_CXSCREEN = 0; // of the primary monitor, in pixels
 constexpr int SM_CYSCREEN = 1;
 constexpr int SM_CXBORDER = 5; // of the line that WS_BORDER draws
 constexpr int SM_CYBORDER = 6;
 int GetSystemMetrics(int index); ///< 0 for any other index
 
+char* CharLowerA(char* text); ///< A to Z become a to z, in place; gives the text
 BOOL MessageBeep(UINT type);
 
 constexpr UINT MB_OK = 0x00;

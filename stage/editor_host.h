@@ -30,6 +30,6 @@ void RestoreButtons();
 /// Draws the bar of the present show's progress on the editor's main window.
 void DrawProgress(HWND mainWindow);
 
-/// Puts the character of the frame that is being edited at a point of the stage. For an open
-/// frame editor only.
-void SetEditedPosition(LONG x, LONG y);
+/// Takes the frame editor's fields, and with them a point of the stage as the frame's place.
+/// Nothing while no frame editor is open.
+void FrameFromClick(LONG x, LONG y);

@@ -237,7 +237,7 @@ LRESULT StageClick(HWND stage, LPARAM coordinates) {
         return 0;
     }
     if (EditorDialog) {
-        SetEditedPosition(click.x, click.y);
+        FrameFromClick(click.x, click.y);
         return 0;
     }
     WalkTo(stage, CharacterSprite.drawX, CharacterSprite.drawY, click.x - CharacterSprite.cx / 2,

@@ -31,12 +31,24 @@ int ToonPromptSave(HWND owner) {
     return ToonSave(owner);
 }
 
-LONG ToonOpen(HWND owner) {
+int ToonChoose(HWND owner) {
     if (ToonPromptSave(owner) == 0) {
         return 0;
     }
     ToonFileDialog.lpstrTitle = "Open Toon File";
-    return GetOpenFileNameA(&ToonFileDialog) ? ToonLoad(owner) : 0;
+    return GetOpenFileNameA(&ToonFileDialog) ? 1 : 0;
+}
+
+LONG ToonOpen(HWND owner) {
+    return ToonChoose(owner) == 0 ? 0 : ToonLoad(owner);
+}
+
+int ToonNew(HWND owner) {
+    if (ToonPromptSave(owner) == 0) {
+        return 0;
+    }
+    ToonFileName[0] = '\0';
+    return 1;
 }
 
 int ToonOpenFromMenu(HWND mainWindow) {

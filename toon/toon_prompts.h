@@ -17,9 +17,15 @@ constexpr int COMMIT_FRAME_COMMAND = 1012;
 /// and gives what ToonSave gave. No and Cancel leave the changes in memory.
 int ToonPromptSave(HWND owner);
 
-/// ToonPromptSave, then the file dialog, then ToonLoad. Gives what that gave; 0 also where the user
-/// has stopped one of the first two.
+/// ToonPromptSave, then the file dialog: 1 if the user has chosen a file, whose name then stands in
+/// ToonFileName.
+int ToonChoose(HWND owner);
+
+/// ToonChoose, then ToonLoad. Gives what that gave; 0 also where nothing was chosen.
 LONG ToonOpen(HWND owner);
+
+/// ToonPromptSave, and the Toon has no name any more. 0 if the user has stopped it.
+int ToonNew(HWND owner);
 
 /// The Open command of the editor's main window: forgets the name of the open Toon and opens
 /// another. 1 once it is there: its first frame is the current one, and the main window has been

@@ -6,6 +6,7 @@
 #include "platform/user/ending.h"
 #include "platform/user/foreign.h"
 #include "platform/user/icons.h"
+#include "platform/user/menus.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
 #include "platform/user/text.h"
@@ -15,6 +16,8 @@
 #include <QButtonGroup>
 #include <QCloseEvent>
 #include <QKeyEvent>
+#include <QLabel>
+#include <QMenuBar>
 #include <QPushButton>
 #include <QRadioButton>
 #include <QWindow>
@@ -76,6 +79,22 @@ void groupButtons(DialogWindow& dialog, const DialogTemplate& made,
     }
 }
 
+/// A label that stands for a control shows its underlined letter, and screen readers tell of it.
+void tieLabels(const std::vector<QWidget*>& widgets) {
+    for (QWidget* widget : widgets) {
+        auto* label = qobject_cast<QLabel*>(widget);
+        if (label == nullptr) {
+            continue;
+        }
+        const QString name = label->text().remove(QLatin1Char('&')).remove(QLatin1Char(':'));
+        for (QWidget* control : widgets) {
+            if (!name.isEmpty() && control->accessibleName() == name) {
+                label->setBuddy(control);
+            }
+        }
+    }
+}
+
 /// The first control of the template is the first to have the focus.
 void orderTabs(const std::vector<QWidget*>& widgets) {
     for (std::size_t i = 1; i < widgets.size(); ++i) {
@@ -88,7 +107,7 @@ bool addControls(const Window& owner, const DialogTemplate& made) {
     DialogWindow& dialog = *owner.dialog;
     std::vector<QWidget*> widgets;
     for (const ControlTemplate& control : made.controls) {
-        const HWND handle = addControl(control, owner.handle, owner.instance, dialog);
+        const HWND handle = addControl(control, owner.handle, owner.instance, dialog.client());
         if (!handle) {
             return false;
         }
@@ -96,6 +115,7 @@ bool addControls(const Window& owner, const DialogTemplate& made) {
     }
     groupButtons(dialog, made, widgets);
     orderTabs(widgets);
+    tieLabels(widgets);
     return true;
 }
 
@@ -131,6 +151,11 @@ HWND makeDialog(HINSTANCE instance, ResourceName name, HWND owner, DLGPROC proce
         return {};
     }
     window.dialog = std::make_unique<DialogWindow>(handle, *made, procedure);
+    if (!made->menus.empty()) {
+        window.menu = makeMenuBar(made->menus);
+        window.dialog->addMenuBar(window.menu);
+        window.place.bottom = window.place.top + window.dialog->height();
+    }
     tieToOwner(*window.dialog->windowHandle(), owner);
     if (!addControls(window, *made)) {
         DestroyWindow(handle);
@@ -172,6 +197,16 @@ DialogWindow::DialogWindow(HWND handle, const DialogTemplate& made, DLGPROC answ
     setFixedSize(made.place.width, made.place.height);
     winId(); // makes its window
     windowHandle()->installEventFilter(this);
+}
+
+void DialogWindow::addMenuBar(HMENU bar) {
+    auto* shown = new QMenuBar(this);
+    fillMenuBar(*shown, bar, handle_);
+    const int height = shown->sizeHint().height();
+    shown->setGeometry(0, 0, width(), height);
+    client_ = new QWidget(this);
+    client_->setGeometry(0, height, width(), this->height());
+    setFixedSize(width(), client_->height() + height);
 }
 
 void DialogWindow::focusFirst() {

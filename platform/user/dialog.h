@@ -20,6 +20,14 @@ class DialogWindow : public QDialog {
         return procedure_;
     }
 
+    /// Gives it the menu bar, above all else.
+    void addMenuBar(HMENU bar);
+
+    /// In what its controls lie: all of it but the menu bar.
+    QWidget& client() {
+        return *client_;
+    }
+
     /// Gives the focus to the first tab stop.
     void focusFirst();
 
@@ -39,6 +47,7 @@ class DialogWindow : public QDialog {
 
     HWND handle_;
     DLGPROC procedure_;
+    QWidget* client_ = this;
 };
 
 } // namespace seam

@@ -85,7 +85,7 @@ class Line {
         for (; at < rest_.size() && rest_[at] != '"'; ++at) {
             const bool escape = rest_[at] == '\\' && at + 1 < rest_.size();
             at += escape ? 1 : 0;
-            found += escape && rest_[at] == 'r' ? '\r' : rest_[at];
+            found += escape ? unescaped(rest_[at]) : rest_[at];
         }
         good_ = good_ && at < rest_.size();
         rest_.remove_prefix(std::min(at + 1, rest_.size()));
@@ -120,6 +120,13 @@ class Line {
     }
 
   private:
+    static char unescaped(char letter) {
+        if (letter == 'r') {
+            return '\r';
+        }
+        return letter == 't' ? '\t' : letter;
+    }
+
     static int across(int units) {
         return (units * baseWidth + 2) / 4;
     }
@@ -166,7 +173,11 @@ bool readLine(std::string_view text, DialogTemplate& dialog) {
         dialog.fontHeight = (start.number() * pixelsOfAnInch + pointsOfAnInch / 2) / pointsOfAnInch;
         start.text();
     } else if (first == "menu") {
-        dialog.menu = start.number();
+        dialog.menus.push_back({start.text(), {}});
+    } else if (!dialog.menus.empty() && (first == "item" || first == "separator")) {
+        const bool isItem = first == "item";
+        const int id = isItem ? start.number() : 0;
+        dialog.menus.back().items.push_back({id, isItem ? start.text() : std::string()});
     } else {
         readControl(line, dialog);
         return line.good();

@@ -27,12 +27,22 @@ struct ControlTemplate {
     std::string spokenName; // for who can't see what stands beside it
 };
 
+struct MenuItemTemplate {
+    int id = 0;
+    std::string text; // empty: a line
+};
+
+struct MenuTemplate {
+    std::string text;
+    std::vector<MenuItemTemplate> items;
+};
+
 struct DialogTemplate {
     std::string title;
     Place place;
     DWORD style = 0;
-    int fontHeight = 0; // in pixels
-    int menu = 0;
+    int fontHeight = 0;              // in pixels
+    std::vector<MenuTemplate> menus; // of its menu bar
     std::vector<ControlTemplate> controls;
 };
 
@@ -41,12 +51,16 @@ struct DialogTemplate {
 ///     # a remark
 ///     dialog "title" LEFT TOP WIDTH HEIGHT STYLE..
 ///     font POINTS "face"
-///     menu ID
+///     menu "text of the bar"
+///     item ID "text"
+///     separator
 ///     ID KIND "text" LEFT TOP WIDTH HEIGHT STYLE.. named "spoken name"
 ///
-/// Places are in dialog units. In a text \r stands for a carriage return, \" and \\ for themselves.
-/// Styles are the platform's in lower case without what stands before the underscore. Nothing if a
-/// line can't be read.
+/// Places are in dialog units. In a text \r stands for a carriage return, \t for a tab, \" and
+/// \\ for themselves. Items and separators belong to the menu before them. A label whose text, but
+/// for the ampersand and a colon, is the spoken name of a control stands for that control. Styles
+/// are the platform's in lower case without what stands before the underscore. Nothing if a line
+/// can't be read.
 std::optional<DialogTemplate> parseDialogTemplate(std::string_view text);
 
 } // namespace seam

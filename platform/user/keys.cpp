@@ -56,6 +56,10 @@ WPARAM codeOfPlace(quint32 scanCode) {
 
 WPARAM codeOf(const QKeyEvent& event) {
     const int key = event.key();
+    constexpr WPARAM keypadZero = 0x60;
+    if ((event.modifiers() & Qt::KeypadModifier) != 0 && key >= Qt::Key_0 && key <= Qt::Key_9) {
+        return keypadZero + static_cast<WPARAM>(key - Qt::Key_0); // these have codes of their own
+    }
     if ((key >= Qt::Key_A && key <= Qt::Key_Z) || (key >= Qt::Key_0 && key <= Qt::Key_9) ||
         key == Qt::Key_Space) {
         return static_cast<WPARAM>(key);

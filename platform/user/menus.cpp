@@ -13,6 +13,7 @@
 #include "platform/user/window.h"
 
 #include <QMenu>
+#include <QMenuBar>
 
 #include <algorithm>
 #include <memory>
@@ -26,6 +27,8 @@ HandleTable<Menu>& table() {
     static auto* const menus = new HandleTable<Menu>(HandleKind::menu);
     return *menus;
 }
+
+constexpr int menuFontHeight = 11; // pixels, as in dialogs
 
 /// The one that is open.
 struct OpenMenu {
@@ -71,8 +74,7 @@ Menu* findMenu(HMENU menu) {
 }
 
 void fillMenu(QMenu& shown, const Menu& menu) {
-    constexpr int fontHeight = 11; // as in dialogs
-    shown.setFont(dialogFont(fontHeight));
+    shown.setFont(dialogFont(menuFontHeight));
     for (const MenuItem& item : menu.items) {
         if ((item.flags & MF_SEPARATOR) != 0) {
             shown.addSeparator();
@@ -81,6 +83,51 @@ void fillMenu(QMenu& shown, const Menu& menu) {
         QAction* action = shown.addAction(fromWindows1252(item.text.data(), item.text.size()));
         action->setEnabled((item.flags & MF_GRAYED) == 0);
         action->setData(QVariant::fromValue(item.id));
+    }
+}
+
+HMENU makeMenuBar(const std::vector<MenuTemplate>& made) {
+    const HMENU bar = CreatePopupMenu();
+    for (const MenuTemplate& menu : made) {
+        const HMENU popup = CreatePopupMenu();
+        for (const MenuItemTemplate& item : menu.items) {
+            AppendMenuA(popup, item.text.empty() ? MF_SEPARATOR : MF_STRING,
+                        static_cast<UINT_PTR>(item.id), item.text.c_str());
+        }
+        if (Menu* found = findMenu(bar)) {
+            found->items.push_back({MF_POPUP, 0, menu.text, popup});
+        }
+    }
+    return bar;
+}
+
+void destroyMenuTree(HMENU menu) {
+    if (const Menu* found = findMenu(menu)) {
+        for (const MenuItem& item : found->items) {
+            destroyMenuTree(item.popup);
+        }
+        DestroyMenu(menu);
+    }
+}
+
+void fillMenuBar(QMenuBar& shown, HMENU bar, HWND window) {
+    const Menu* found = findMenu(bar);
+    if (found == nullptr) {
+        return;
+    }
+    shown.setFont(dialogFont(menuFontHeight));
+    for (const MenuItem& item : found->items) {
+        QMenu* popup = shown.addMenu(fromWindows1252(item.text.data(), item.text.size()));
+        // Filled each time that it opens: items may have been enabled or greyed meanwhile.
+        QObject::connect(popup, &QMenu::aboutToShow, popup, [popup, handle = item.popup] {
+            popup->clear();
+            if (const Menu* menu = findMenu(handle)) {
+                fillMenu(*popup, *menu);
+            }
+        });
+        QObject::connect(popup, &QMenu::triggered, popup, [window](const QAction* chosen) {
+            queueInput({window, WM_COMMAND, chosen->data().value<UINT_PTR>(), 0, 0});
+        });
     }
 }
 
@@ -112,7 +159,7 @@ BOOL AppendMenuA(HMENU menu, UINT flags, UINT_PTR id, const char* text) {
     if (found == nullptr) {
         return FALSE;
     }
-    found->items.push_back({flags, id, text == nullptr ? "" : text});
+    found->items.push_back({flags, id, text == nullptr ? "" : text, {}});
     return TRUE;
 }
 
@@ -121,16 +168,27 @@ int GetMenuItemCount(HMENU menu) {
     return found == nullptr ? -1 : static_cast<int>(found->items.size());
 }
 
-BOOL EnableMenuItem(HMENU menu, UINT item, UINT enable) {
+/// The item of a command, in the menu or in those that open from it; null if there is none.
+static MenuItem* findItem(HMENU menu, UINT command) {
     Menu* found = findMenu(menu);
     if (found == nullptr) {
-        return -1;
+        return nullptr;
     }
-    const auto entry =
-        std::find_if(found->items.begin(), found->items.end(), [item](const MenuItem& one) {
-            return (one.flags & MF_SEPARATOR) == 0 && one.id == item;
-        });
-    if (entry == found->items.end()) {
+    for (MenuItem& item : found->items) {
+        MenuItem* const inner = findItem(item.popup, command);
+        if (inner != nullptr) {
+            return inner;
+        }
+        if ((item.flags & (MF_SEPARATOR | MF_POPUP)) == 0 && item.id == command) {
+            return &item;
+        }
+    }
+    return nullptr;
+}
+
+BOOL EnableMenuItem(HMENU menu, UINT item, UINT enable) {
+    MenuItem* const entry = findItem(menu, item);
+    if (entry == nullptr) {
         return -1;
     }
     const UINT before = entry->flags & MF_GRAYED;
@@ -138,8 +196,9 @@ BOOL EnableMenuItem(HMENU menu, UINT item, UINT enable) {
     return static_cast<BOOL>(before);
 }
 
-HMENU GetMenu(HWND /*window*/) {
-    return {}; // no window of the program has a menu bar
+HMENU GetMenu(HWND window) {
+    const Window* found = findWindow(window);
+    return found == nullptr ? HMENU{} : found->menu;
 }
 
 BOOL TrackPopupMenu(HMENU menu, UINT flags, int x, int y, int reserved, HWND window,

@@ -1,6 +1,8 @@
 #include "platform/user/text.h"
 
 #include "platform/gdi/encoding.h"
+#include "platform/kernel/text.h"
+#include "platform/user.h"
 
 #include <QStringDecoder>
 
@@ -14,3 +16,9 @@ QString shownText(const std::string& bytes) {
 }
 
 } // namespace seam
+
+char* CharLowerA(char* text) {
+    const std::string lower = seam::lowered(text);
+    std::copy(lower.begin(), lower.end(), text);
+    return text;
+}

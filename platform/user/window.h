@@ -49,6 +49,7 @@ struct Window {
     bool dying = false; // WM_DESTROY has been sent
     bool paintNeeded = false;
     bool eraseNeeded = false;
+    HMENU menu; // its menu bar
     HIMC inputContext = defaultInputContext;
     RECT update{0, 0, 0, 0}; // bounds of what WM_PAINT has to paint
     bool enabled = true;

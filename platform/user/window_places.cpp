@@ -287,7 +287,11 @@ HWND SetFocus(HWND window) {
     const Window* found = findWindow(window);
     focus = found != nullptr && found->picture() != nullptr ? window : HWND{};
     if (found != nullptr && found->control) {
-        found->control->widget().setFocus();
+        QWidget& widget = found->control->widget();
+        if (!widget.isActiveWindow()) {
+            widget.activateWindow();
+        }
+        widget.setFocus();
     } else if (focus && topLevelOf(control) == topLevelOf(focus)) {
         widgetOf(*findWindow(control)).clearFocus();
     }

@@ -146,9 +146,11 @@ void removeWindow(HWND handle) {
     leaveRoster(handle);
     leaveHost(handle);
     leaveScreens(handle); // while there is a window to take back what it holds from
+    const HMENU menu = window->menu;
     QWidget* widget = window->control ? &window->control->widget() : nullptr;
     table().take(handle.number);
     delete widget;
+    destroyMenuTree(menu);
 }
 
 } // namespace
@@ -363,7 +365,10 @@ BOOL IsWindow(HWND window) {
 
 HWND GetParent(HWND window) {
     const Window* found = findWindow(window);
-    return found == nullptr ? HWND{} : found->parent;
+    if (found == nullptr) {
+        return {};
+    }
+    return found->parent ? found->parent : found->owner;
 }
 
 HWND FindWindowA(const char* className, const char* title) {

@@ -144,7 +144,7 @@ TEST_F(Click, OnHimDoesNothing) {
     EXPECT_THAT(events({"walk"}), IsEmpty());
     EXPECT_THAT(HostCalls, IsEmpty());
     click(230, 229);
-    EXPECT_THAT(HostCalls, ElementsAre("SetEditedPosition 230 229"));
+    EXPECT_THAT(HostCalls, ElementsAre("FrameFromClick 230 229"));
 }
 
 TEST_F(Click, DoesNothingDuringAShowUnlessAFrameIsEdited) {
@@ -169,6 +169,6 @@ TEST_F(Click, DoesNothingDuringAShowUnlessAFrameIsEdited) {
         EditorDialog = stage;
         HostCalls.clear();
         click(600, 600);
-        EXPECT_THAT(HostCalls, ElementsAre("SetEditedPosition 600 600"));
+        EXPECT_THAT(HostCalls, ElementsAre("FrameFromClick 600 600"));
     }
 }

@@ -33,8 +33,8 @@ void RestoreButtons() {
 
 void DrawProgress(HWND /*mainWindow*/) {}
 
-void SetEditedPosition(LONG x, LONG y) {
-    HostCalls.push_back("SetEditedPosition " + std::to_string(x) + " " + std::to_string(y));
+void FrameFromClick(LONG x, LONG y) {
+    HostCalls.push_back("FrameFromClick " + std::to_string(x) + " " + std::to_string(y));
 }
 
 // ---- The window ---------------------------------------------------------------------------------

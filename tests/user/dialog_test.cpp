@@ -118,23 +118,27 @@ class Dialogs : public test::WindowTest {
 } // namespace
 
 TEST(DialogTemplates, AreReadOrRefusedAsAWhole) {
-    const auto read =
-        seam::parseDialogTemplate("# remark\ndialog \"a \\\"b\\\"\" 4 8 90 153 popup\n"
-                                  "font 8 \"MS Sans Serif\"\nmenu 117\n"
-                                  "-1 static \"x\\ry\" 1 1 30 45 group center\n");
+    const auto read = seam::parseDialogTemplate(
+        "# remark\ndialog \"a \\\"b\\\"\" 4 8 90 153 popup\n"
+        "font 8 \"MS Sans Serif\"\nmenu \"&File\"\nitem 104 \"&New\\tCtrl+N\"\n"
+        "separator\n"
+        "-1 static \"x\\ry\" 1 1 30 45 group center\n");
     ASSERT_TRUE(read);
     EXPECT_EQ(read->title, "a \"b\"");
     EXPECT_EQ(read->place.width, 135);
     EXPECT_EQ(read->place.height, 249);
     EXPECT_EQ(read->fontHeight, 11);
-    EXPECT_EQ(read->menu, 117);
+    ASSERT_EQ(read->menus.size(), 1U);
+    ASSERT_EQ(read->menus[0].items.size(), 2U);
+    EXPECT_EQ(read->menus[0].items[0].text, "&New\tCtrl+N");
     ASSERT_EQ(read->controls.size(), 1U);
     EXPECT_EQ(read->controls[0].text, "x\ry");
     EXPECT_EQ(read->controls[0].place.left, 2); // a half is rounded up
     EXPECT_EQ(read->controls[0].style, WS_CHILD | WS_VISIBLE | WS_GROUP | SS_CENTER);
 
-    for (const char* wrong : {"dialog \"a 0 0 1 1", "dialog \"a\" 0 0 1", "1 button \"\" 0 0 1 x",
-                              "1 button \"\" 0 0 1 1 shiny", "font big \"a\"", "menu 1 2"}) {
+    for (const char* wrong :
+         {"dialog \"a 0 0 1 1", "dialog \"a\" 0 0 1", "1 button \"\" 0 0 1 x",
+          "1 button \"\" 0 0 1 1 shiny", "font big \"a\"", "menu 1", "item 1 \"a\""}) {
         EXPECT_FALSE(seam::parseDialogTemplate(wrong)) << wrong;
     }
 }

@@ -1,0 +1,63 @@
+// The pointer confined to a part of the screen. The X server knows how to confine it to a window
+// only, so there is one that nobody sees: it has no picture, and lies below all others.
+#include "platform/user.h"
+#include "platform/user/toolkit.h"
+
+#include <cstdlib>
+#include <memory>
+#include <xcb/xcb.h>
+
+using namespace seam;
+
+static xcb_window_t clipWindow = XCB_NONE;
+
+static void makeClipWindow(xcb_connection_t* connection, const RECT& area) {
+    const xcb_screen_t& screen = *xcb_setup_roots_iterator(xcb_get_setup(connection)).data;
+    const QPoint corner = QPoint(area.left, area.top) + screenOrigin();
+    const std::uint32_t overrides = 1; // out of the window manager's hands
+    clipWindow = xcb_generate_id(connection);
+    xcb_create_window(
+        connection, 0, clipWindow, screen.root, static_cast<std::int16_t>(corner.x()),
+        static_cast<std::int16_t>(corner.y()), static_cast<std::uint16_t>(area.right - area.left),
+        static_cast<std::uint16_t>(area.bottom - area.top), 0, XCB_WINDOW_CLASS_INPUT_ONLY,
+        XCB_COPY_FROM_PARENT, XCB_CW_OVERRIDE_REDIRECT, &overrides);
+    const std::uint32_t below = XCB_STACK_MODE_BELOW;
+    xcb_configure_window(connection, clipWindow, XCB_CONFIG_WINDOW_STACK_MODE, &below);
+    xcb_map_window(connection, clipWindow);
+}
+
+/// Our windows go on getting what happens over them.
+static bool confine(xcb_connection_t* connection) {
+    const auto request = xcb_grab_pointer(
+        connection, 1, clipWindow, XCB_EVENT_MASK_BUTTON_PRESS | XCB_EVENT_MASK_BUTTON_RELEASE,
+        XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC, clipWindow, XCB_NONE, XCB_CURRENT_TIME);
+    const std::unique_ptr<xcb_grab_pointer_reply_t, decltype(&std::free)> reply(
+        xcb_grab_pointer_reply(connection, request, nullptr), &std::free);
+    return reply != nullptr && reply->status == XCB_GRAB_STATUS_SUCCESS;
+}
+
+static void release(xcb_connection_t* connection) {
+    if (clipWindow != XCB_NONE) {
+        xcb_ungrab_pointer(connection, XCB_CURRENT_TIME);
+        xcb_destroy_window(connection, clipWindow);
+        clipWindow = XCB_NONE;
+    }
+}
+
+BOOL ClipCursor(const RECT* area) {
+    xcb_connection_t* connection = xConnection();
+    if (connection == nullptr) {
+        return FALSE;
+    }
+    release(connection);
+    bool done = true;
+    if (area != nullptr) {
+        makeClipWindow(connection, *area);
+        done = confine(connection);
+        if (!done) {
+            release(connection);
+        }
+    }
+    xcb_flush(connection);
+    return done ? TRUE : FALSE;
+}
