@@ -103,11 +103,11 @@ static void BaseName(char* name, const char* path) {
 
 void ShowEditorTitle(HWND dialog) {
     char title[TOON_PATH_SIZE + 16];
-    char name[TOON_PATH_SIZE] = "[Untitled]";
+    char name[TOON_PATH_SIZE] = "Untitled";
     if (ToonFileName[0] != '\0') {
         BaseName(name, ToonFileName);
     }
-    wsprintfA(title, "File: %s", name);
+    wsprintfA(title, "File: [%s]", name);
     SendMessageA(dialog, WM_SETTEXT, 0, reinterpret_cast<LPARAM>(title));
 }
 
