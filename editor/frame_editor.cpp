@@ -183,6 +183,7 @@ int OpenToonInEditor(HWND dialog) {
         FillFrameList(dialog);
         ShowEditorTitle(dialog);
         ToonSetDirty(dialog, 0);
+        SendMessageA(EditorMainWindow, TM_ENABLEPLAY, 0, 0);
         return 0;
     }
     FrameCount = count;
