@@ -200,10 +200,10 @@ DialogWindow::DialogWindow(HWND handle, const DialogTemplate& made, DLGPROC answ
 }
 
 void DialogWindow::addMenuBar(HMENU bar) {
-    auto* shown = new QMenuBar(this);
-    fillMenuBar(*shown, bar, handle_);
-    const int height = shown->sizeHint().height();
-    shown->setGeometry(0, 0, width(), height);
+    menuBar_ = new QMenuBar(this);
+    fillMenuBar(*menuBar_, bar, handle_);
+    const int height = menuBar_->sizeHint().height();
+    menuBar_->setGeometry(0, 0, width(), height);
     client_ = new QWidget(this);
     client_->setGeometry(0, height, width(), this->height());
     setFixedSize(width(), client_->height() + height);
@@ -247,6 +247,11 @@ void DialogWindow::keyPressEvent(QKeyEvent* event) {
     const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
     if (enter && !hasDefaultButton()) {
         command(IDOK);
+        return;
+    }
+    if (event->key() == Qt::Key_F10 && event->modifiers() == Qt::NoModifier &&
+        menuBar_ != nullptr) {
+        menuBar_->setActiveAction(menuBar_->actions().value(0));
         return;
     }
     QDialog::keyPressEvent(event);

@@ -8,10 +8,13 @@
 
 #include <optional>
 
+class QMenuBar;
+
 namespace seam {
 
 /// Its keys are the toolkit's: Tab, the underlined letters and the arrows. Enter presses the
-/// default button and Escape stands for IDCANCEL; closing it is WM_CLOSE.
+/// default button and Escape stands for IDCANCEL; closing it is WM_CLOSE. F10 opens the first menu
+/// of its bar.
 class DialogWindow : public QDialog {
   public:
     DialogWindow(HWND handle, const DialogTemplate& made, DLGPROC answering);
@@ -48,6 +51,7 @@ class DialogWindow : public QDialog {
     HWND handle_;
     DLGPROC procedure_;
     QWidget* client_ = this;
+    QMenuBar* menuBar_ = nullptr;
 };
 
 } // namespace seam
