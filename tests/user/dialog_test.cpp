@@ -12,6 +12,7 @@
 #include <QListView>
 #include <QPlainTextEdit>
 #include <QScrollBar>
+#include <QShortcutEvent>
 #include <QTimer>
 
 namespace {
@@ -168,6 +169,12 @@ TEST_F(Dialogs, TellOfWhatTheUserDoesAndNotOfWhatTheProgramDoes) {
     test::press(&child<QListView>(), Qt::Key_Space);
     test::handleWaiting();
     EXPECT_EQ(commands.back(), (Command{18, LBN_DBLCLK}));
+
+    commands.clear();
+    QShortcutEvent letter(QKeySequence(QStringLiteral("Alt+T")), 0);
+    QCoreApplication::sendEvent(&button("&Tick"), &letter);
+    test::handleWaiting();
+    EXPECT_EQ(commands, (std::vector<Command>{{17, BN_CLICKED}})) << "at once";
 
     commands.clear();
     EnableWindow(GetDlgItem(dialog, 17), FALSE);

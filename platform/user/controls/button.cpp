@@ -12,15 +12,37 @@
 #include <QPainter>
 #include <QPushButton>
 #include <QRadioButton>
+#include <QShortcutEvent>
 
 namespace seam {
 
 namespace {
 
-/// A button of whose looks the program draws everything.
-class DrawnButton : public QPushButton {
+/// A button that its underlined letter presses at once. The toolkit would show it down for a tenth
+/// of a second first, and keys that come within that time would overtake it.
+template <class Base>
+class Prompt : public Base {
   public:
-    DrawnButton(HWND handle, QWidget* dialog) : QPushButton(dialog), handle_(handle) {}
+    using Base::Base;
+
+  protected:
+    bool event(QEvent* event) override {
+        if (event->type() != QEvent::Shortcut ||
+            static_cast<QShortcutEvent*>(event)->isAmbiguous()) {
+            return Base::event(event);
+        }
+        if (this->isCheckable()) {
+            this->setFocus(Qt::ShortcutFocusReason);
+        }
+        this->click();
+        return true;
+    }
+};
+
+/// A button of whose looks the program draws everything.
+class DrawnButton : public Prompt<QPushButton> {
+  public:
+    DrawnButton(HWND handle, QWidget* dialog) : Prompt(dialog), handle_(handle) {}
 
   protected:
     void paintEvent(QPaintEvent* /*event*/) override {
@@ -36,9 +58,9 @@ class DrawnButton : public QPushButton {
 };
 
 /// The toolkit makes the one of a group that has the focus a tab stop: only the template does.
-class RadioButton : public QRadioButton {
+class RadioButton : public Prompt<QRadioButton> {
   public:
-    using QRadioButton::QRadioButton;
+    using Prompt::Prompt;
 
   protected:
     void focusInEvent(QFocusEvent* event) override {
@@ -53,11 +75,11 @@ QAbstractButton* makeWidget(DWORD style, HWND handle, QWidget& dialog) {
     case BS_OWNERDRAW:
         return new DrawnButton(handle, &dialog);
     case BS_AUTOCHECKBOX:
-        return new QCheckBox(&dialog);
+        return new Prompt<QCheckBox>(&dialog);
     case BS_AUTORADIOBUTTON:
         return new RadioButton(&dialog);
     default:
-        auto* button = new QPushButton(&dialog);
+        auto* button = new Prompt<QPushButton>(&dialog);
         button->setDefault((style & BS_TYPEMASK) == BS_DEFPUSHBUTTON);
         return button;
     }
