@@ -188,6 +188,7 @@ TEST_F(Dialogs, HoldWhatIsTypedToItsLimitAndGiveItAsBytes) {
     type(child<QLineEdit>(), QStringLiteral("\u20ACa\u4E00bcd"));
     EXPECT_EQ(text(10), "\x80"
                         "a?b");
+    EXPECT_EQ(child<QLineEdit>().text(), QStringLiteral("\u20ACa?b")) << "what is kept shows";
     SetDlgItemTextA(dialog, 10, "longer"); // the program may
     EXPECT_EQ(text(10), "longer");
     SendDlgItemMessageA(dialog, 10, EM_LIMITTEXT, 4, 0); // what stands there is not cut
@@ -196,6 +197,13 @@ TEST_F(Dialogs, HoldWhatIsTypedToItsLimitAndGiveItAsBytes) {
     SendDlgItemMessageA(dialog, 11, EM_LIMITTEXT, 5, 0);
     type(child<QPlainTextEdit>(), QStringLiteral("ab\ncdef"));
     EXPECT_EQ(text(11), "ab\rcd");
+    auto& lines = child<QPlainTextEdit>();
+    lines.moveCursor(QTextCursor::Left);
+    lines.moveCursor(QTextCursor::Left, QTextCursor::KeepAnchor);
+    lines.insertPlainText(QStringLiteral("\u4E00yz")); // as much as there is room for
+    EXPECT_EQ(lines.toPlainText(), QStringLiteral("ab\n?d"));
+    lines.undo();
+    EXPECT_EQ(lines.toPlainText(), QStringLiteral("ab\ncd")) << "whole";
     SetDlgItemTextA(dialog, 11, "a\xA0\x62\r\r"); // a hard blank stays one
     EXPECT_EQ(text(11), "a\xA0\x62\r\r");
     SetDlgItemTextA(dialog, 11, "\xC3\xA9\rx"); // two letters, not one of UTF-8

@@ -5,6 +5,7 @@
 
 #include <QLineEdit>
 #include <QPlainTextEdit>
+#include <QValidator>
 
 #include <algorithm>
 
@@ -12,10 +13,28 @@ namespace seam {
 
 namespace {
 
+/// What stays of a text in the program's character set: as long as it was, with a question mark for
+/// whatever has no byte there. The user sees at once what is kept.
+QString keptText(const QString& typed) {
+    const std::string bytes = toWindows1252(typed);
+    return fromWindows1252(bytes.data(), bytes.size());
+}
+
+class KeptText : public QValidator {
+  public:
+    using QValidator::QValidator;
+
+    State validate(QString& typed, int& /*cursor*/) const override {
+        typed = keptText(typed);
+        return Acceptable;
+    }
+};
+
 class LineEdit : public Control {
   public:
     LineEdit(const ControlTemplate& made, QWidget& dialog) : edit_(new QLineEdit(&dialog)) {
         LineEdit::setText(made.text);
+        edit_->setValidator(new KeptText(edit_));
         edit_->setTextMargins(0, 0, 0, 0);
     }
 
@@ -82,7 +101,7 @@ class TextEdit : public Control {
         edit_->setPlainText(fromWindows1252(text.data(), text.size())
                                 .replace(QLatin1String("\r\n"), QLatin1String("\r"))
                                 .replace(QLatin1Char('\r'), QLatin1Char('\n')));
-        accepted_ = edit_->toPlainText();
+        accepted_ = edit_->toPlainText().size();
     }
 
     std::optional<LRESULT> answer(UINT message, WPARAM wParam, LPARAM /*lParam*/) override {
@@ -94,24 +113,37 @@ class TextEdit : public Control {
     }
 
   private:
-    /// What would make the text too long is not taken: it stays as it was before.
+    /// What was typed or pasted goes in as far as there is room for it. Undo takes it out whole.
     void holdToLimit() {
-        const QString now = edit_->toPlainText();
-        if (limit_ > 0 && now.size() > limit_ && now.size() > accepted_.size()) {
-            const int at =
-                edit_->textCursor().position() - static_cast<int>(now.size() - accepted_.size());
-            const QSignalBlocker quiet(edit_);
-            edit_->setPlainText(accepted_);
-            QTextCursor cursor = edit_->textCursor();
-            cursor.setPosition(std::clamp(at, 0, static_cast<int>(accepted_.size())));
-            edit_->setTextCursor(cursor);
-        } else {
-            accepted_ = now;
+        const qsizetype size = edit_->toPlainText().size();
+        const qsizetype excess = limit_ > 0 ? std::min(size - limit_, size - accepted_) : 0;
+        const QSignalBlocker quiet(edit_);
+        QTextCursor cursor = edit_->textCursor();
+        cursor.joinPreviousEditBlock();
+        if (excess > 0) {
+            cursor.movePosition(QTextCursor::Left, QTextCursor::KeepAnchor,
+                                static_cast<int>(excess));
+            cursor.removeSelectedText();
+        }
+        keepBytes(cursor);
+        cursor.endEditBlock();
+        accepted_ = edit_->toPlainText().size();
+    }
+
+    void keepBytes(QTextCursor cursor) const {
+        const QString typed = edit_->toPlainText();
+        const QString kept = keptText(typed);
+        for (qsizetype at = 0; at < typed.size(); ++at) {
+            if (typed[at] != kept[at]) {
+                cursor.setPosition(static_cast<int>(at));
+                cursor.deleteChar();
+                cursor.insertText(kept.mid(at, 1));
+            }
         }
     }
 
     QPlainTextEdit* edit_;
-    QString accepted_;
+    qsizetype accepted_ = 0; // what there was when the limit last held
     qsizetype limit_ = 0;
 };
 
