@@ -22,6 +22,8 @@
 #include <QRadioButton>
 #include <QWindow>
 
+#include <algorithm>
+
 namespace seam {
 
 namespace {
@@ -102,6 +104,19 @@ void orderTabs(const std::vector<QWidget*>& widgets) {
     }
 }
 
+/// Without a button that the template says is the default one, the toolkit would choose one.
+void chooseNoDefault(const std::vector<QWidget*>& widgets) {
+    const auto buttonOf = [](QWidget* widget) { return qobject_cast<QPushButton*>(widget); };
+    const bool chosen = std::ranges::any_of(widgets, [&](QWidget* widget) {
+        return buttonOf(widget) != nullptr && buttonOf(widget)->isDefault();
+    });
+    for (QWidget* widget : widgets) {
+        if (!chosen && buttonOf(widget) != nullptr) {
+            buttonOf(widget)->setAutoDefault(false);
+        }
+    }
+}
+
 /// Makes the controls; false if one of them can't be made.
 bool addControls(const Window& owner, const DialogTemplate& made) {
     DialogWindow& dialog = *owner.dialog;
@@ -116,6 +131,7 @@ bool addControls(const Window& owner, const DialogTemplate& made) {
     groupButtons(dialog, made, widgets);
     orderTabs(widgets);
     tieLabels(widgets);
+    chooseNoDefault(widgets);
     return true;
 }
 
@@ -246,7 +262,8 @@ bool DialogWindow::hasDefaultButton() const {
 void DialogWindow::keyPressEvent(QKeyEvent* event) {
     const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
     if (enter && !hasDefaultButton()) {
-        command(IDOK);
+        auto* const button = qobject_cast<QPushButton*>(focusWidget());
+        button != nullptr ? button->click() : command(IDOK);
         return;
     }
     if (event->key() == Qt::Key_F10 && event->modifiers() == Qt::NoModifier &&
