@@ -64,8 +64,10 @@ void EndShow() {
     if (!EditorMainWindow || !ShowUnderWay()) {
         return;
     }
+    const BOOL play = IsWindowEnabled(PlayButton);
     SetBusyCursor(EditorStage, 0);
     ResetShow(EditorStage);
     RestoreButtons();
+    EnableWindow(PlayButton, play); // no show disables it, but the frame editor does
     DrawProgress(EditorMainWindow);
 }

@@ -136,6 +136,9 @@ LRESULT ConfigureProc(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam) {
     switch (message) {
     case WM_INITDIALOG:
         return ConfigureInit(dialog, &ToonDocHeader);
+    case WM_DESTROY:
+        FreeBackgroundList(dialog); // it may go with the editor
+        return 0;
     case WM_COMMAND:
         return ConfigureCommand(dialog, LOWORD(static_cast<DWORD>(wParam)));
     case WM_HSCROLL:

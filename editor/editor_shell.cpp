@@ -208,7 +208,11 @@ static void ShowNewBackdrop(HWND window, HINSTANCE instance) {
 
 static void LeaveFrameEditor() {
     SetClassLongA(EditorStage, GCL_HCURSOR, static_cast<LONG>(ArrowCursor.number));
-    ResetShow(EditorStage);
+    if (ShowUnderWay()) {
+        EndShow();
+    } else {
+        ResetShow(EditorStage);
+    }
     EndRandomWalk();
     RestoreButtons();
 }

@@ -51,6 +51,7 @@ void OpenFrameEditor(HWND mainWindow, HINSTANCE instance) {
 
 /// A Toon of one frame of zeros, without a name.
 static void BeginUntitledToon() {
+    EndShow();
     CurrentFrameIndex = 0;
     FrameCount = 1;
     FrameStoreAlloc(1);
@@ -63,6 +64,8 @@ int StartFrameEditor(HWND dialog) {
     if (ToonFileName[0] == '\0') {
         BeginUntitledToon();
     }
+    // A Toon that was read anew has lost the frames that weren't saved.
+    CurrentFrameIndex = std::clamp<LONG>(CurrentFrameIndex, 0, std::max<LONG>(FrameCount - 1, 0));
     FillFrameList(dialog);
     FrameGet(CurrentFrameIndex, &EditFrame);
     SendMessageA(GetParent(dialog), TM_ENABLEPLAY, 0, 0);
@@ -171,20 +174,29 @@ int SaveToonCommand(HWND dialog) {
     return ToonDirty != 0 ? ToonSave(dialog) : 0;
 }
 
+/// The fields stay as they were, and with them the pose.
+static int ForgetFailedToon(HWND dialog) {
+    const LONG pose = EditPose;
+    ToonFileName[0] = '\0';
+    BeginUntitledToon();
+    EditPose = pose;
+    FillFrameList(dialog);
+    ShowEditorTitle(dialog);
+    ToonSetDirty(dialog, 0);
+    return 0;
+}
+
 int OpenToonInEditor(HWND dialog) {
     if (ToonChoose(dialog) == 0) {
         return 0;
     }
     EndShow();
     const LONG count = ToonLoad(dialog);
+    if (!EditorDialog) {
+        return 0; // the editor was closed behind a message
+    }
     if (count == 0) {
-        ToonFileName[0] = '\0';
-        BeginUntitledToon();
-        FillFrameList(dialog);
-        ShowEditorTitle(dialog);
-        ToonSetDirty(dialog, 0);
-        SendMessageA(EditorMainWindow, TM_ENABLEPLAY, 0, 0);
-        return 0;
+        return ForgetFailedToon(dialog);
     }
     FrameCount = count;
     CurrentFrameIndex = 0;
@@ -200,7 +212,6 @@ int NewToonInEditor(HWND dialog) {
     if (ToonNew(dialog) == 0) {
         return 1;
     }
-    EndShow();
     ToonNewDefaults();
     StartFrameEditor(dialog);
     ToonSetDirty(dialog, 0);

@@ -113,7 +113,8 @@ void ShowEditorTitle(HWND dialog) {
 
 void ShowPoseLabel(HWND dialog, LONG pose) {
     char label[32];
-    wsprintfA(label, "Frame P&ose = %d", pose + 1);
+    const DWORD number = static_cast<DWORD>(pose) + 1; // a file may hold any
+    wsprintfA(label, "Frame P&ose = %d", static_cast<LONG>(number));
     SetDlgItemTextA(dialog, POSE_BUTTON, label);
 }
 

@@ -177,6 +177,9 @@ int CreatePoseWindow(HINSTANCE instance, HWND owner) {
 }
 
 LONG RunPosePicker(HINSTANCE instance, HWND owner, LONG currentPose) {
+    if (PoseWindow) {
+        return currentPose; // the owner still takes keys; one picker at a time
+    }
     PickedPose = currentPose;
     if (!PoseClassInstance && !PoseClassSetup(instance)) {
         return 0;

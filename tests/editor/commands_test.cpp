@@ -39,7 +39,7 @@ class Command : public EditorTest {
         fileGiven = "";
         boxes.clear();
         key(command);
-        if (!EditorMainWindow || filesAsked != 0 || !boxes.empty()) {
+        if (!EditorMainWindow || filesAsked != 0 || EditorDialog) {
             return !EditorMainWindow ? "closes" : filesAsked != 0 ? "asks" : "edits";
         }
         const std::string after = stateNow();

@@ -75,20 +75,19 @@ void EditorTest::SetUp() {
     ForgetEarlierStages();
     PacesWalked = 100;
     SettingsSave();
-    putToon("two.zkt", {{200, 300, 1, 2, 0, "One", 0}, {300, 300, 2, 2, 1, "Two and more", 0}});
-    putToon("one.zkt", {{600, 400, 3, 1, 1, "", 0}});
-    putToon("still.zkt", {{400, 400, 3, 0, 0, "", 0}, {500, 500, 3, 1, 0, "", 0}});
-    std::ofstream(toons() / "none.zkt") << "no Toon";
+    putToons();
     filesAsked = 0;
-    fileGiven = "";
+    fileGiven = nameGiven = "";
+    answerGiven = IDCANCEL;
     boxes.clear();
-    seam::answerBoxes([](const std::string& text, const std::string&, UINT) {
+    seam::answerBoxes([](const std::string& text, const std::string&, UINT type) {
         boxes.push_back(text);
-        return IDOK;
+        return (type & MB_YESNOCANCEL) == MB_YESNOCANCEL ? answerGiven : IDOK;
     });
-    seam::answerFileDialogs([](const std::string&) {
+    seam::answerFileDialogs([](const std::string& title) {
         ++filesAsked;
-        return fileGiven.empty() ? std::nullopt : std::optional(fileGiven);
+        const std::string& name = title == "Save Toon File" ? nameGiven : fileGiven;
+        return name.empty() ? std::nullopt : std::optional(name);
     });
     setUpClasses();
     RecordedStage::SetUp();
@@ -116,6 +115,13 @@ void EditorTest::putToon(const std::string& name, const std::vector<ToonFrame>& 
     file.write(reinterpret_cast<const char*>(&header), sizeof header);
     file.write(reinterpret_cast<const char*>(frames.data()),
                static_cast<std::streamsize>(frames.size() * sizeof(ToonFrame)));
+}
+
+void EditorTest::putToons() const {
+    putToon("two.zkt", {{200, 300, 1, 2, 0, "One", 0}, {300, 300, 2, 2, 1, "Two and more", 0}});
+    putToon("one.zkt", {{600, 400, 3, 1, 1, "", 0}});
+    putToon("still.zkt", {{400, 400, 3, 0, 0, "", 0}, {500, 500, 3, 1, 0, "", 0}});
+    std::ofstream(toons() / "none.zkt") << "no Toon";
 }
 
 void EditorTest::open() {
@@ -190,6 +196,10 @@ static bool fits(const EditorState& state) {
            RandomWalkActive == state.about && timers == state.timers && enabled == enabledButtons();
 }
 
+void EditorTest::playIsAlive(bool alive) {
+    playCame = alive;
+}
+
 static std::string label() {
     return seam::findWindow(PlayButton)->control->text();
 }
@@ -215,16 +225,23 @@ static void sendMouse(Target* target, QEvent::Type type, QPoint point) {
     QCoreApplication::sendEvent(target, &event);
 }
 
+QWidget& widgetOf(HWND window) {
+    return seam::widgetOf(*seam::findWindow(window));
+}
+
+void sendMouse(HWND window, QEvent::Type type, QPoint point) {
+    sendMouse(seam::toolkitWindow(*seam::findWindow(window)), type, point);
+}
+
 void EditorTest::press(HWND button) {
-    QWidget& widget = seam::widgetOf(*seam::findWindow(button));
+    QWidget& widget = widgetOf(button);
     sendMouse(&widget, QEvent::MouseButtonPress, QPoint(6, 6));
     sendMouse(&widget, QEvent::MouseButtonRelease, QPoint(6, 6));
     pass(0);
 }
 
 void EditorTest::click(int x, int y) {
-    sendMouse(seam::toolkitWindow(*seam::findWindow(EditorStage)), QEvent::MouseButtonPress,
-              QPoint(x, y));
+    sendMouse(EditorStage, QEvent::MouseButtonPress, QPoint(x, y));
     pass(0);
 }
 

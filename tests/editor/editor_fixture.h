@@ -8,9 +8,14 @@
 #include "tests/recorded_stage.h"
 #include "toon/toon_document.h"
 
+#include <QEvent>
+#include <QPoint>
+
 #include <functional>
 #include <memory>
 #include <set>
+
+class QWidget;
 
 // What a key sends.
 constexpr int KEY_FILE = 122;
@@ -39,6 +44,10 @@ struct EditorState {
 
 extern const std::vector<EditorState> editorStates;
 
+/// What a window shows of itself, and takes from a user's mouse.
+QWidget& widgetOf(HWND window);
+void sendMouse(HWND window, QEvent::Type type, QPoint point);
+
 /// Acts within a loop of the program's, as soon as `stands` says so.
 void once(const std::function<bool()>& stands, const std::function<void()>& act);
 
@@ -60,6 +69,9 @@ class EditorTest : public RecordedStage {
     /// description of what there is where it is none.
     static std::string stateNow();
 
+    /// That the frame editor has shut Play, or its end has opened it; a load is seen without this.
+    static void playIsAlive(bool alive);
+
     // What a user does, with the toolkit's own events; what it leads to has happened then.
     static void press(HWND button);
     static void click(int x, int y);
@@ -70,12 +82,15 @@ class EditorTest : public RecordedStage {
         return ground_->toons();
     }
 
+    void putToon(const std::string& name, const std::vector<ToonFrame>& frames) const;
+    void putToons() const; ///< two.zkt, one.zkt, still.zkt, and none.zkt, which is none
+
     static inline int filesAsked;
     static inline std::string fileGiven; // empty: the dialog is cancelled
+    static inline std::string nameGiven; // the same where it asks under which name to save
+    static inline int answerGiven;       // to a question
     static inline std::vector<std::string> boxes;
 
   private:
-    void putToon(const std::string& name, const std::vector<ToonFrame>& frames) const;
-
     std::unique_ptr<ReplayGround> ground_;
 };

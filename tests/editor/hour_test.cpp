@@ -1,5 +1,5 @@
 // An hour with a user who does whatever comes to his mind.
-#include "tests/editor/editor_fixture.h"
+#include "tests/editor/frame_fixture.h"
 
 #include <QApplication>
 #include <QMenu>
@@ -10,7 +10,7 @@
 
 namespace {
 
-class Hour : public EditorTest {
+class Hour : public FrameEditorTest {
   protected:
     /// A menu that has opened: opens, edits or plays, or lets it go.
     void chooseFromMenu() {
@@ -20,9 +20,51 @@ class Hour : public EditorTest {
         }
     }
 
+    /// A dialog or a picker that has opened: chooses in it, or lets it go.
+    void answerDialogs() {
+        if (const HWND picker = FindWindowA("PoseWndClass", nullptr)) {
+            PostMessageA(picker, pick({WM_KEYDOWN, WM_KEYDOWN, WM_LBUTTONUP, WM_CLOSE}),
+                         pick<WPARAM>({'1', '5', '8', '9'}), 0);
+        }
+        const HWND settings = FindWindowA("dialog", ToonDocHeader.magic);
+        if (settings && settings != EditorDialog) {
+            PostMessageA(settings, WM_HSCROLL, pick<WPARAM>({SB_LINEUP, SB_LINEDOWN, SB_PAGEDOWN}),
+                         0);
+            PostMessageA(settings, WM_COMMAND, pick<WPARAM>({IDOK, IDCANCEL}), 0);
+        }
+    }
+
+    void editAtRandom() {
+        constexpr int begin = 104;
+        answerGiven = pick({IDYES, IDNO, IDCANCEL});
+        nameGiven = pick<std::string>({"", "new.zkt", "no/where.zkt"});
+        switch (pick({0, 1, 2, 3, 3, 3, 3, 3})) {
+        case 0:
+            type(pick({X_FIELD, Y_FIELD, PAUSE_FIELD}), pick<std::string>({"", "0", "250", "-9"}));
+            break;
+        case 1:
+            stepInList(pick({Qt::Key_Down, Qt::Key_Up, Qt::Key_End}));
+            break;
+        case 2:
+            command(begin);
+            if (ToonDirty == 0 && ToonFileName[0] == '\0') {
+                playIsAlive(false);
+            }
+            break;
+        default:
+            command(pick(
+                {105, 106, 108, 109, 110, 110, 111, 112, 113, 114, 1012, 1015, 1016, 1021, 1046}));
+            break;
+        }
+    }
+
     void actAtRandom() {
         fileGiven = pick<std::string>({"", "two.zkt", "one.zkt", "still.zkt", "none.zkt", "x.zkt"});
         const int place = pick({0, 100, 250, 400, 749});
+        if (EditorDialog && pick({true, true, false})) {
+            editAtRandom();
+            return;
+        }
         switch (pick({0, 1, 2, 3, 4})) {
         case 0:
             click(place, pick({100, 300, 500}));
@@ -56,10 +98,14 @@ class Hour : public EditorTest {
 TEST_F(Hour, IsAlwaysInOneOfTheStatesAndPassesThroughEach) {
     constexpr std::int64_t hour = 60 * 60 * 1000;
     QTimer user;
-    QObject::connect(&user, &QTimer::timeout, [this] { chooseFromMenu(); });
+    QObject::connect(&user, &QTimer::timeout, [this] {
+        chooseFromMenu();
+        answerDialogs();
+    });
     user.start(0);
     open();
     std::set<std::string> seen;
+    int edits = 0;
     std::set<std::string> names;
     for (const EditorState& state : editorStates) {
         names.insert(state.name);
@@ -67,11 +113,21 @@ TEST_F(Hour, IsAlwaysInOneOfTheStatesAndPassesThroughEach) {
     while (seam::clockNow() < hour) {
         pass(pick({0, 10, 400, 1500, 3000, 5000}));
         record.clear();
+        const HWND before = EditorDialog;
         actAtRandom();
+        if (EditorDialog != before && (EditorDialog || ToonFileName[0] != '\0')) {
+            playIsAlive(!EditorDialog);
+        }
+        if (EditorDialog) {
+            expectInOrder(std::to_string(seam::clockNow()));
+            edits += EditorDialog != before ? 1 : 0;
+        }
         const std::string state = stateNow();
         seen.insert(state);
         ASSERT_TRUE(names.contains(state)) << state << " at " << seam::clockNow();
+        ASSERT_FALSE(HasFailure());
     }
+    EXPECT_GT(edits, 10);
     EXPECT_EQ(seen, names);
 }
 
