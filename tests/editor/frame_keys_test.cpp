@@ -1,0 +1,175 @@
+// The keys while the frame editor is open, pressed on the toolkit's own windows, and what fifty
+// openings of the dialogs leave behind.
+#include "tests/editor/frame_fixture.h"
+
+#include "platform/kernel.h"
+#include "platform/user/window.h"
+
+#include <QApplication>
+#include <QPixmapCache>
+
+#include <malloc.h>
+
+namespace {
+
+/// The control that has the focus, by its number; 0 for none of the frame editor's.
+int focused() {
+    int found = 0;
+    seam::forEachWindow([&](const seam::Window& window) {
+        const bool has = window.control && window.parent == EditorDialog &&
+                         &seam::widgetOf(window) == QApplication::focusWidget();
+        found = has ? window.id : found;
+    });
+    return found;
+}
+
+bool configurationStands() {
+    return FindWindowA("dialog", ToonMagic) != HWND{};
+}
+
+HWND picker() {
+    return FindWindowA("PoseWndClass", nullptr);
+}
+
+std::size_t heapInUse() {
+    QPixmapCache::clear(); // the toolkit's own, of bounded size
+    return mallinfo2().uordblks;
+}
+
+class FrameKeys : public FrameEditorTest {
+  protected:
+    using Step = std::function<bool()>; // false: not yet
+
+    static void inTurn(std::vector<Step> steps) {
+        if (!steps.empty()) {
+            if (steps.front()()) {
+                steps.erase(steps.begin());
+            }
+            QTimer::singleShot(10, [steps] { inTurn(steps); });
+        }
+    }
+
+    /// Runs the editor in its own loop with the frame editor over a Toon, and does the steps.
+    static void run(std::vector<Step> steps) {
+        steps.insert(steps.begin(), [] {
+            fileGiven = "two.zkt";
+            PostMessageA(EditorMainWindow, WM_COMMAND, KEY_OPEN, 0);
+            PostMessageA(EditorMainWindow, WM_COMMAND, KEY_EDIT, 0);
+            return true;
+        });
+        steps.emplace_back([] { return PostMessageA(EditorMainWindow, WM_CLOSE, 0, 0) != FALSE; });
+        once(editorStands, [steps] { inTurn(steps); });
+        RunEditor(GetModuleHandleA(nullptr), nullptr, SW_SHOWNORMAL);
+    }
+
+    static std::string effect() {
+        if (!EditorDialog) {
+            return "closes";
+        }
+        if (configurationStands()) {
+            PostMessageA(FindWindowA("dialog", ToonMagic), WM_COMMAND, IDCANCEL, 0);
+            return "configures";
+        }
+        return QApplication::activePopupWidget() != nullptr ? "menu"
+               : filesAsked != 0                            ? "asks"
+               : count("play_button") != 0                  ? "plays"
+               : count("random_walk_refused")               ? "walks"
+               : focused() != WINK_CHECK                    ? "to " + std::to_string(focused())
+                                                            : "";
+    }
+};
+
+TEST_F(FrameKeys, AreTheFrameEditorsWhereverTheFocusIs) {
+    const std::tuple<Qt::Key, Qt::KeyboardModifier, const char*> cases[] = {
+        {Qt::Key_C, Qt::AltModifier, ""},
+        {Qt::Key_E, Qt::ControlModifier, "closes"},
+        {Qt::Key_E, Qt::AltModifier, "to 1016"},
+        {Qt::Key_F, Qt::AltModifier, ""},
+        {Qt::Key_G, Qt::ControlModifier, "configures"},
+        {Qt::Key_O, Qt::ControlModifier, "asks"},
+        {Qt::Key_P, Qt::AltModifier, ""},
+        {Qt::Key_S, Qt::ControlModifier, "asks"},
+        {Qt::Key_S, Qt::AltModifier, "to 1020"},
+        {Qt::Key_T, Qt::AltModifier, "to 1017"},
+        {Qt::Key_W, Qt::AltModifier, ""},
+        {Qt::Key_X, Qt::AltModifier, "to 1018"},
+        {Qt::Key_Y, Qt::AltModifier, "to 1019"},
+    };
+    for (const auto& [code, held, expected] : cases) {
+        for (const bool inside : {true, false}) {
+            std::string found;
+            run({[] {
+                     ToonFileName[0] = '\0'; // for Save to ask for one
+                     CopyText(ToonDocHeader.magic, ToonMagic, sizeof ToonMagic);
+                     fileGiven = "";
+                     filesAsked = 0;
+                     SetFocus(GetDlgItem(EditorDialog, WINK_CHECK));
+                     return focused() == WINK_CHECK;
+                 },
+                 [inside] {
+                     if (!inside) {
+                         SetFocus(FileButton);
+                     }
+                     return focused() == (inside ? int{WINK_CHECK} : 0);
+                 },
+                 [code = code, held = held] {
+                     record.clear();
+                     QTest::sendKeyEvent(QTest::Click, QApplication::focusWindow(), code, '\0',
+                                         held);
+                     return true;
+                 },
+                 [] { return true; },
+                 [&found] {
+                     found = effect();
+                     return true;
+                 }});
+            const std::string stays = inside ? "" : "to 0";
+            EXPECT_EQ(found, *expected == '\0' ? stays : expected)
+                << code << " with the focus " << (inside ? "inside" : "outside");
+        }
+    }
+}
+
+TEST_F(FrameKeys, EnterAndEscapeDoNothingInItsFields) {
+    edit("two.zkt");
+    for (const int id : {FRAME_LIST, X_FIELD, Y_FIELD, PAUSE_FIELD, WINK_CHECK}) {
+        for (const Qt::Key code : {Qt::Key_Return, Qt::Key_Enter, Qt::Key_Escape}) {
+            field(id).setFocus();
+            QTest::keyClick(&field(id), code);
+            pass(0);
+            EXPECT_TRUE(EditorDialog) << id;
+            EXPECT_EQ(ToonDirty, 0U) << id;
+        }
+    }
+}
+
+TEST_F(FrameKeys, FiftyOpeningsLeaveNothingBehind) {
+    constexpr std::size_t rounds = 50;
+    constexpr std::size_t noPicture = 8000; // bytes that the toolkit may keep of a round
+    const auto round = [] {
+        key(KEY_EDIT);
+        once([] { return picker() != HWND{}; }, [] { SendMessageA(picker(), WM_KEYDOWN, '4', 0); });
+        command(POSE_BUTTON);
+        once(configurationStands,
+             [] { PostMessageA(FindWindowA("dialog", ToonMagic), WM_COMMAND, IDOK, 0); });
+        command(108);
+        answerGiven = IDNO;
+        key(KEY_EDIT);
+        EXPECT_FALSE(EditorDialog);
+        record.clear();
+        boxes.clear();
+    };
+    openAtRest();
+    for (int i = 0; i < 10; ++i) {
+        round();
+    }
+    const seam::HandleCounts before = seam::liveHandles();
+    const std::size_t heap = heapInUse();
+    for (std::size_t i = 0; i < rounds; ++i) {
+        round();
+    }
+    EXPECT_EQ(seam::liveHandles(), before);
+    EXPECT_LT(heapInUse(), heap + rounds * noPicture);
+}
+
+} // namespace
