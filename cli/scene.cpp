@@ -2,10 +2,15 @@
 
 #include "editor/chrome.h"
 #include "editor/editor_shell.h"
+#include "editor/frame_fields.h"
 #include "platform/harness.h"
+#include "platform/kernel.h"
+#include "stage/editor_host.h"
 
 #include <algorithm>
+#include <array>
 #include <charconv>
+#include <cstdlib>
 #include <iterator>
 #include <optional>
 #include <sstream>
@@ -28,6 +33,9 @@ struct Action {
 constexpr std::int64_t longestScene = 24LL * 60 * 60 * 1000; // ms
 constexpr int keyOpen = 126;
 constexpr int keyEdit = 127;
+constexpr int keySave = 134;
+constexpr int itemConfigure = 108;
+constexpr int poseButton = 1021;
 constexpr int keyFile = 122;
 constexpr int itemAbout = 5003;
 
@@ -46,9 +54,50 @@ void activate(WPARAM how) {
 }
 
 /// The dialog runs while the command is handled.
-void openFile(const std::optional<std::string>& name) {
+void chooseFile(int key, const std::optional<std::string>& name) {
     seam::answerFileDialogs([name](const std::string&) { return name; });
-    sendKey(keyOpen);
+    sendKey(key);
+}
+
+void answer(const Words& /*words*/, const Numbers& numbers) {
+    seam::answerBoxes([number = numbers[0]](const std::string&, const std::string&, UINT type) {
+        return (type & MB_YESNOCANCEL) == MB_YESNOCANCEL ? number : IDOK;
+    });
+}
+
+void sendItem(const Words& /*words*/, const Numbers& numbers) {
+    PostMessageA(EditorDialog, WM_COMMAND, static_cast<WPARAM>(numbers[0]), 0);
+}
+
+void selectFrame(const Words& /*words*/, const Numbers& numbers) {
+    SelectListedFrame(EditorDialog, numbers[0] - 1);
+    PostMessageA(EditorDialog, WM_COMMAND, FRAME_LIST, 0);
+}
+
+void fillField(const Words& words, const Numbers& /*numbers*/) {
+    SetDlgItemTextA(EditorDialog, std::atoi(words[0].c_str()), words[1].c_str());
+}
+
+/// A window that nobody sees is told of the picker's loop by a message that the loop takes.
+LRESULT pickerUserProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) {
+    if (message != WM_KEYDOWN) {
+        return DefWindowProcA(window, message, wParam, lParam);
+    }
+    SendMessageA(FindWindowA("PoseWndClass", nullptr), message, wParam, lParam);
+    DestroyWindow(window);
+    return 0;
+}
+
+void pickPose(const Words& /*words*/, const Numbers& numbers) {
+    WNDCLASSA windowClass{};
+    windowClass.lpfnWndProc = pickerUserProc;
+    windowClass.hInstance = GetModuleHandleA(nullptr);
+    windowClass.lpszClassName = "PickerUserClass";
+    RegisterClassA(&windowClass); // refused from the second time on
+    const HWND user = CreateWindowExA(0, windowClass.lpszClassName, "", WS_POPUP, 0, 0, 1, 1,
+                                      EditorDialog, nullptr, windowClass.hInstance, nullptr);
+    PostMessageA(EditorDialog, WM_COMMAND, poseButton, 0);
+    PostMessageA(user, WM_KEYDOWN, static_cast<WPARAM>('0' + numbers[0]), 0);
 }
 
 void click(const Words& /*words*/, const Numbers& at) {
@@ -66,8 +115,14 @@ constexpr Action actions[] = {
     {"minimise", 0, false, [](const Words&, const Numbers&) { press(MinimizeButton); }},
     {"close", 0, false, [](const Words&, const Numbers&) { press(CloseButton); }},
     {"command", 1, true, sendCommand},
-    {"open", 1, false, [](const Words& words, const Numbers&) { openFile(words[0]); }},
-    {"cancel", 0, false, [](const Words&, const Numbers&) { openFile(std::nullopt); }},
+    {"open", 1, false, [](const Words& words, const Numbers&) { chooseFile(keyOpen, words[0]); }},
+    {"save", 1, false, [](const Words& words, const Numbers&) { chooseFile(keySave, words[0]); }},
+    {"cancel", 0, false, [](const Words&, const Numbers&) { chooseFile(keyOpen, std::nullopt); }},
+    {"answer", 1, true, answer},
+    {"item", 1, true, sendItem},
+    {"frame", 1, true, selectFrame},
+    {"field", 2, false, fillField},
+    {"pose", 1, true, pickPose},
     {"edit", 0, false, [](const Words&, const Numbers&) { sendKey(keyEdit); }},
     {"activate", 0, false, [](const Words&, const Numbers&) { activate(WA_ACTIVE); }},
     {"deactivate", 0, false, [](const Words&, const Numbers&) { activate(WA_INACTIVE); }},
@@ -111,7 +166,9 @@ SceneStep stepOf(const Words& line, std::int64_t earliest) {
     for (const std::string& word : action->numbers ? words : Words{}) {
         numbers.push_back(numberOf(word, -0x8000, 0x7FFF)); // half a message's parameter
     }
-    if (action->act == sendCommand && (numbers[0] == keyFile || numbers[0] == itemAbout)) {
+    constexpr std::array unanswered{keyFile, itemAbout, itemConfigure, poseButton};
+    const bool sends = action->act == sendCommand || action->act == sendItem;
+    if (sends && std::ranges::find(unanswered, numbers[0]) != unanswered.end()) {
         throw std::runtime_error("what command " + words[0] + " opens can't be answered");
     }
     return {moment, [action, words, numbers] { action->act(words, numbers); }};

@@ -21,8 +21,15 @@ struct SceneStep {
 ///     command N      the command number N of a key reaches the main window; none that opens a menu
 ///                    or the about box, which a scene can't answer
 ///     open NAME      Ctrl+O, and the file dialog is answered with the name
+///     save NAME      Ctrl+S, and the same if it asks for a name
 ///     cancel         Ctrl+O, and the file dialog is cancelled
-///     edit           Ctrl+E
+///     edit           Ctrl+E, which opens the frame editor and closes it again
+///     answer N       questions from here on are answered so: 6 yes, 7 no, 2 cancel
+///     item N         the command number N of a menu item or button reaches the frame editor; none
+///                    that opens a dialog
+///     frame N        the frame number N is selected in its list
+///     field N TEXT   its field number N gets the text, a single word
+///     pose N         its pose button is pressed, and the key N in the picker, 1 to 8
 ///     activate  deactivate
 ///                    the main window gets, or loses, the keyboard
 ///     iconify  restore

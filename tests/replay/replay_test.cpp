@@ -147,7 +147,8 @@ TEST_P(Scene, RunsAsRecorded) {
 
 INSTANTIATE_TEST_SUITE_P(Editor, Scene,
                          testing::Values("early", "opening", "show", "stops", "other-window",
-                                         "another-toon", "no-pause", "iconified"));
+                                         "another-toon", "no-pause", "iconified", "new-toon",
+                                         "frame-editor"));
 
 TEST(Editor, ClosedAtAnyMomentItBeginsAnewAsInAFreshProcess) {
     const Lines show = readLines(here / "traces/editor-show.trace");
@@ -176,6 +177,7 @@ TEST(Editor, ALineOfASceneThatIsNoneIsNamed) {
         {"5 click 3", "a:1: click takes 2 arguments, not 1"},
         {"5 click 3 40000", "a:1: 40000 is no number that fits here"},
         {"5 command 122", "a:1: what command 122 opens can't be answered"},
+        {"5 item 1021", "a:1: what command 1021 opens can't be answered"},
     };
     for (const auto& [text, wrong] : cases) {
         std::istringstream in(text);
