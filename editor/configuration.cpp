@@ -44,7 +44,7 @@ void FillBackgroundList(HWND dialog) {
         ++number;
     }
     BackgroundItemCount = static_cast<DWORD>(number - 1);
-    TellList(dialog, CB_SETCURSEL, static_cast<WPARAM>(BackgroundIndex - 1), 0);
+    TellList(dialog, CB_SETCURSEL, static_cast<WPARAM>(BackgroundIndex) - 1, 0);
 }
 
 static HBITMAP BitmapOf(std::uintptr_t itemData) {
