@@ -7,7 +7,7 @@
 /// The main window; null while no editor is open. Written here.
 extern HWND EditorMainWindow;
 
-/// The cursor of the stage while the frame editor is open; null while no editor is.
+/// The cursor of the stage while the frame editor is open. Written at the start of a run.
 extern HCURSOR TargetCursor;
 
 /// Opens the editor over its owner and runs it until its main window goes. 0; also if it can't

@@ -78,8 +78,8 @@ int ExitFrameEditor(HWND dialog) {
 
 int CloseFrameEditor(HWND dialog) {
     const HWND owner = GetParent(dialog);
-    if (ToonDirty != 0) {
-        ToonReload(dialog); // the user wants none of the changes
+    if (ToonDirty != 0 && ToonReload(dialog) == 0) { // the user wants none of the changes
+        ToonFileName[0] = '\0'; // the file has failed: no later save may write over it
     }
     DestroyWindow(dialog);
     EditorDialog = nullptr;
@@ -105,11 +105,11 @@ int NewFrame(HWND dialog) {
         return RefuseFrame(dialog);
     }
     EndShow();
-    EditPose = 0;
     ++FrameCount;
     if (FrameStoreGrow() == 0) {
         return 0;
     }
+    EditPose = 0;
     AddFrameListItem(dialog, FrameCount);
     CurrentFrameIndex = FrameCount - 1;
     SelectListedFrame(dialog, CurrentFrameIndex);
@@ -183,6 +183,8 @@ static int ForgetFailedToon(HWND dialog) {
     FillFrameList(dialog);
     ShowEditorTitle(dialog);
     ToonSetDirty(dialog, 0);
+    SendMessageA(EditorMainWindow, TM_BACKGROUND, 0, 0);
+    SendMessageA(EditorMainWindow, TM_ENABLEPLAY, 0, 0); // its frame would hold a show for ever
     return 0;
 }
 

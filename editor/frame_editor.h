@@ -41,9 +41,12 @@ int DeleteFrame(HWND dialog);
 void ChoosePose(HINSTANCE instance, HWND dialog);
 
 int SaveToonAs(HWND dialog);
+
+/// Asks for a name if there is none. 0 also if there is nothing to save.
 int SaveToonCommand(HWND dialog);
 
 /// Opens another Toon. One that doesn't load leaves a new untitled one behind the fields, so that
 /// no save can write over its file.
 int OpenToonInEditor(HWND dialog);
+/// 1 also if the user has stopped it.
 int NewToonInEditor(HWND dialog);

@@ -89,9 +89,10 @@ int ShowCurrentFrame(HWND dialog) {
 
 /// Copies the name of a file without drive, directory and extension, in lower case.
 static void BaseName(char* name, const char* path) {
-    const char* start = path;
-    for (const char* at = path; *at != '\0'; ++at) {
-        start = *at == '\\' || *at == '/' || *at == ':' ? at + 1 : start;
+    const bool drive = path[0] != '\0' && path[1] == ':';
+    const char* start = drive ? path + 2 : path;
+    for (const char* at = start; *at != '\0'; ++at) {
+        start = *at == '\\' || *at == '/' ? at + 1 : start;
     }
     const char* dot = std::strrchr(start, '.');
     const std::size_t length =

@@ -5,7 +5,8 @@
 #include "platform/dialogs.h"
 #include "toon/toon_document.h"
 
-/// The pose that the pose button shows, 0 to 7: what goes into the frame at the next commit.
+/// The pose that the pose button shows, from 0, and as unchecked as a file's may be: what goes into
+/// the frame at the next commit.
 /// Written here and by the commands.
 extern LONG EditPose;
 

@@ -278,8 +278,8 @@ BOOL GetCursorPos(POINT* point);
 BOOL SetCursorPos(int x, int y);
 
 /// Keeps the pointer within a part of the screen, until it is called with null. FALSE where that
-/// can't be had: off X11, or while another program holds the pointer. It is free again when the
-/// program ends, however it does.
+/// can't be had: off X11, or while another program holds the pointer. Meanwhile no other program
+/// can hold it. It is free again when the program ends, however it does.
 BOOL ClipCursor(const RECT* area);
 
 constexpr int SM_CXSCREEN = 0; // of the primary monitor, in pixels

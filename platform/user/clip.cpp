@@ -5,11 +5,27 @@
 
 #include <cstdlib>
 #include <memory>
+#include <string_view>
 #include <xcb/xcb.h>
 
 using namespace seam;
 
 static xcb_window_t clipWindow = XCB_NONE;
+
+/// The pointer has the shape of the window that holds it: the arrow of the X server's cursor font.
+static void showArrow(xcb_connection_t* connection) {
+    constexpr std::string_view fontName = "cursor";
+    constexpr std::uint16_t arrow = 68;
+    constexpr std::uint16_t white = 0xFFFF;
+    const xcb_font_t font = xcb_generate_id(connection);
+    xcb_open_font(connection, font, fontName.size(), fontName.data());
+    const xcb_cursor_t cursor = xcb_generate_id(connection);
+    xcb_create_glyph_cursor(connection, cursor, font, font, arrow, arrow + 1, 0, 0, 0, white, white,
+                            white);
+    xcb_change_window_attributes(connection, clipWindow, XCB_CW_CURSOR, &cursor);
+    xcb_free_cursor(connection, cursor);
+    xcb_close_font(connection, font);
+}
 
 static void makeClipWindow(xcb_connection_t* connection, const RECT& area) {
     const xcb_screen_t& screen = *xcb_setup_roots_iterator(xcb_get_setup(connection)).data;
@@ -21,6 +37,7 @@ static void makeClipWindow(xcb_connection_t* connection, const RECT& area) {
         static_cast<std::int16_t>(corner.y()), static_cast<std::uint16_t>(area.right - area.left),
         static_cast<std::uint16_t>(area.bottom - area.top), 0, XCB_WINDOW_CLASS_INPUT_ONLY,
         XCB_COPY_FROM_PARENT, XCB_CW_OVERRIDE_REDIRECT, &overrides);
+    showArrow(connection);
     const std::uint32_t below = XCB_STACK_MODE_BELOW;
     xcb_configure_window(connection, clipWindow, XCB_CONFIG_WINDOW_STACK_MODE, &below);
     xcb_map_window(connection, clipWindow);

@@ -25,7 +25,7 @@ struct KeyStroke {
     friend bool operator==(const KeyStroke&, const KeyStroke&) = default;
 };
 
-/// Which key is pressed and what is held with it.
+/// Which key is pressed and what is held with it. Digits of the keypad have codes of their own.
 KeyStroke keyStroke(const QKeyEvent& event);
 
 /// The same of a message that queueKey has queued.

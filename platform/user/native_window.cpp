@@ -9,6 +9,7 @@
 #include "platform/user/window.h"
 
 #include <QExposeEvent>
+#include <QGuiApplication>
 #include <QImage>
 #include <QInputMethodQueryEvent>
 #include <QKeyEvent>
@@ -31,7 +32,7 @@ void activateHost(const QWindow& child) {
     while (host->parent() != nullptr) {
         host = host->parent();
     }
-    if (!host->isActive()) {
+    if (QGuiApplication::focusWindow() != host) {
         host->requestActivate();
     }
 }

@@ -335,6 +335,9 @@ LRESULT DispatchMessageA(const MSG* message) {
         return 0;
     }
     const InnerDepth inner;
+    if (message->message == WM_COMMAND && isDisabled(message->hwnd)) {
+        return 0; // what the user did before a dialog came up over the window
+    }
     if (message->message == WM_TIMER) {
         traceTick(message->wParam);
     } else if (isMouseMessage(message->message)) {

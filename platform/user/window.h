@@ -91,6 +91,9 @@ QWidget& widgetOf(const Window& window);
 /// It is then dealt with.
 bool inputIsBarred(HWND window, QEvent& event);
 
+/// Whether EnableWindow has shut the window, or one that it lies in.
+bool isDisabled(HWND window);
+
 /// Shows a window that isn't shown yet.
 void showWindow(HWND handle);
 

@@ -23,13 +23,12 @@ namespace {
 
 HWND focus;
 
-/// Whether the window or what it lies in is disabled.
+} // namespace
+
 bool isDisabled(HWND window) {
     const Window* found = findWindow(window);
     return found != nullptr && (!found->enabled || isDisabled(found->parent));
 }
-
-} // namespace
 
 QWidget& widgetOf(const Window& window) {
     if (window.frame) {

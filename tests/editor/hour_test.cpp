@@ -118,6 +118,9 @@ TEST_F(Hour, IsAlwaysInOneOfTheStatesAndPassesThroughEach) {
         if (EditorDialog != before && (EditorDialog || ToonFileName[0] != '\0')) {
             playIsAlive(!EditorDialog);
         }
+        if (EditorDialog && ToonFileName[0] == '\0') {
+            playIsAlive(false);
+        }
         if (EditorDialog) {
             expectInOrder(std::to_string(seam::clockNow()));
             edits += EditorDialog != before ? 1 : 0;

@@ -37,10 +37,12 @@ class Chrome : public Run, public testing::WithParamInterface<QSize> {
 
     void openEditor() {
         // The first keys may come before the dialog is there and has the keyboard.
-        ASSERT_TRUE(waitFor([&] {
-            ground.press("alt+e");
-            return waitFor([&] { return window(title); }, 1);
-        }));
+        ASSERT_TRUE(waitFor(
+            [&] {
+                ground.press("alt+e");
+                return waitFor([&] { return window(title); }, 2);
+            },
+            60));
     }
 
     /// Opens the first four frames of a Toon, with pauses of a second.
@@ -156,6 +158,9 @@ class Chrome : public Run, public testing::WithParamInterface<QSize> {
 TEST_P(Chrome, LooksAsDrawn) {
     auto setup = ground.start({"C"});
     openEditor();
+    if (HasFatalFailure()) {
+        return;
+    }
     expect({}, "at first");
     const QImage first = ground.grab();
     const std::pair ends = barEnds(first);
