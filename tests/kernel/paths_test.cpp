@@ -58,31 +58,23 @@ TEST_F(Paths, AreFoundByTheExactNameFirstThenWhateverTheCase) {
         make(name);
     }
     std::filesystem::create_symlink("nowhere", "Broken");
-    std::filesystem::create_symlink("UP/Mid", "link");
     const std::string here = root_.string();
     const std::vector<seam::Drive> drives{{'C', ""}, {'D', here + "/usb"}};
     // The current directory behind the root, a path, and what it finds behind the root: "!" stands
     // for an error, "+" in front of what is missing.
-
     const std::tuple<std::string, std::string, std::string> cases[] = {
         {"", "Toons\\intro.ZKT", "/Toons/Intro.zkt"},
         {"", "TOONS\\intro.zkt", "/Toons/Intro.zkt"}, // the first in the order of bytes
-        {"", "toons\\intro.zkt", "+/toons/intro.zkt"},
         {"", "up/mid\\\xe9t.TXT", "/UP/Mid/\xe9T.txt"},
         {"", "up/mid\\\xc9t.TXT", "+/UP/Mid/\xc9t.TXT"}, // A to Z only
         {"", ".\\up\\.\\..\\toons\\b.zkt", "/toons/b.zkt"},
-        {"", "link\\..\\toons", "/toons"}, // by the names alone
         {"", "BROKEN", "/Broken"},
         {"", "no\\new.zkt", "!"},
-        {"", "toons\\b.zkt\\x", "!"},
         {"", "a:b", "/a:b"},
         {"", "a:c", "!"},
         {"", "d:\\DEEP", "/usb/deep"},
-        {"", "D:deep", "/usb/deep"},
         {"", "d:\\..\\..\\deep", "/usb/deep"},
-        {"", "c:up", "/UP"},
         {"", "\\\\host\\share", "!"},
-        {"", "", "!"},
         {"", std::string(300, 'x'), "!"},
         {"/usb/deep", "d:ON.zkt", "/usb/deep/on.zkt"},
         {"/usb/deep", "\\deep", "/usb/deep"},

@@ -53,7 +53,6 @@ TEST(StringTable, GivesTextsCutToTheBuffer) {
 
 TEST(Program, PutsItsArgumentsTogether) {
     const std::pair<std::vector<const char*>, const char*> cases[] = {
-        {{}, "\"\""},
         {{"dorbo", "", "a b"}, "\"dorbo\"  a b"},
         {{"/a\" /s \"/dorbo", "-c"}, "\"/a /s /dorbo\" -c"}};
     for (const auto& [arguments, expected] : cases) {

@@ -9,6 +9,7 @@
 #include <sys/resource.h>
 
 #include <csignal>
+#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
@@ -67,6 +68,24 @@ class ScratchDirectory : public testing::Test {
     std::filesystem::path before_;
     seam::HandleCounts handles_;
 };
+
+/// One in which the user's settings lie.
+class ConfigDirectory : public ScratchDirectory {
+  protected:
+    ConfigDirectory() {
+        setenv("XDG_CONFIG_HOME", root_.c_str(), 1);
+    }
+
+    ~ConfigDirectory() override {
+        unsetenv("XDG_CONFIG_HOME");
+    }
+};
+
+/// Runs a line of the shell; gives its exit code, -1 if a signal ended it.
+inline int runLine(const std::string& line) {
+    const int status = std::system(line.c_str());
+    return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+}
 
 /// While it lives no file grows beyond a size, as on a full disk.
 class FullDisk {
