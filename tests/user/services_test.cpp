@@ -3,20 +3,9 @@
 #include "platform/user/grabs.h"
 #include "tests/user/test_window.h"
 
-#include <QGuiApplication>
 #include <QInputMethodQueryEvent>
-#include <QWindow>
-
-#include <gtest/gtest.h>
 
 namespace {
-
-using Associate = HIMC (*)(HWND, HIMC);
-
-Associate associate() {
-    return reinterpret_cast<Associate>(
-        GetProcAddress(GetModuleHandleA("imm32.dll"), "ImmAssociateContext"));
-}
 
 /// What an input method is told before it takes a key of the test's window.
 bool inputMethodWelcome() {
@@ -29,38 +18,36 @@ bool inputMethodWelcome() {
 
 TEST(InputContext, DecidesWhetherAnInputMethodTakesTheKeys) {
     test::handlers.clear();
-    ASSERT_NE(associate(), nullptr);
+    auto* const associate = reinterpret_cast<HIMC (*)(HWND, HIMC)>(
+        GetProcAddress(GetModuleHandleA("imm32.dll"), "ImmAssociateContext"));
+    ASSERT_NE(associate, nullptr);
     const HWND window = test::makeWindow();
     EXPECT_TRUE(inputMethodWelcome());
 
-    const HIMC before = associate()(window, nullptr);
+    const HIMC before = associate(window, nullptr);
     EXPECT_TRUE(before);
     EXPECT_FALSE(inputMethodWelcome());
-    EXPECT_FALSE(associate()(window, nullptr)) << "it has been taken off already";
-    EXPECT_FALSE(associate()(window, HIMC{77})) << "no context";
+    EXPECT_FALSE(associate(window, nullptr)) << "it has been taken off already";
+    EXPECT_FALSE(associate(window, HIMC{77})) << "no context";
     EXPECT_FALSE(inputMethodWelcome());
 
-    EXPECT_FALSE(associate()(window, before));
+    EXPECT_FALSE(associate(window, before));
     EXPECT_TRUE(inputMethodWelcome());
-    EXPECT_EQ(associate()(window, before), before);
+    EXPECT_EQ(associate(window, before), before);
     DestroyWindow(window);
-    EXPECT_FALSE(associate()(window, before));
+    EXPECT_FALSE(associate(window, before));
 }
 
 TEST(RebootDevice, HoldsTheInputWhileAPasswordStands) {
-    const struct {
-        DWORD code;
-        BOOL taken;
-        bool held;
-    } calls[] = {{1, TRUE, true}, {3, FALSE, true}, {2, TRUE, false}, {0, FALSE, false}};
+    const std::tuple<DWORD, BOOL, bool> calls[] = {
+        {1, TRUE, true}, {3, FALSE, true}, {2, TRUE, false}, {0, FALSE, false}};
 
     const HANDLE device =
         CreateFileA("\\\\.\\REBOOT", GENERIC_READ | GENERIC_WRITE,
                     FILE_SHARE_READ | FILE_SHARE_WRITE, nullptr, OPEN_EXISTING, 0, nullptr);
-    for (const auto& call : calls) {
-        EXPECT_EQ(DeviceIoControl(device, call.code, nullptr, 0, nullptr, 0, nullptr, nullptr),
-                  call.taken);
-        EXPECT_EQ(seam::inputIsHeld(), call.held) << call.code;
+    for (const auto& [code, taken, held] : calls) {
+        EXPECT_EQ(DeviceIoControl(device, code, nullptr, 0, nullptr, 0, nullptr, nullptr), taken);
+        EXPECT_EQ(seam::inputIsHeld(), held) << code;
     }
     EXPECT_TRUE(CloseHandle(device));
 }

@@ -5,9 +5,9 @@
 #include "platform/kernel.h"
 #include "platform/user.h"
 
-#include <QCoreApplication>
-#include <QGuiApplication>
+#include <QApplication>
 #include <QKeyEvent>
+#include <QTimer>
 #include <QWindow>
 
 #include <gtest/gtest.h>
@@ -85,6 +85,31 @@ inline QWindow* lastNative() {
 inline void press(QObject* target, Qt::Key key, Qt::KeyboardModifiers held = Qt::NoModifier) {
     QKeyEvent event(QEvent::KeyPress, key, held);
     QCoreApplication::sendEvent(target, &event);
+}
+
+/// Does something with the innermost box, dialog or menu of the toolkit's once it is up.
+template <class Widget>
+void whenUp(const std::function<void(Widget&)>& action) {
+    QTimer::singleShot(0, [action] {
+        QWidget* popup = QApplication::activePopupWidget();
+        QWidget* inner = popup != nullptr ? popup : QApplication::activeModalWidget();
+        auto* up = qobject_cast<Widget*>(inner);
+        if (up == nullptr || !up->isActiveWindow()) {
+            whenUp<Widget>(action);
+        } else {
+            action(*up);
+        }
+    });
+}
+
+/// Lets the window's timer do something, once.
+inline void onTimer(HWND window, const std::function<void()>& action) {
+    handlers[WM_TIMER] = [=](HWND, WPARAM timer, LPARAM) {
+        KillTimer(window, timer);
+        action();
+        return LRESULT{0};
+    };
+    SetTimer(window, 1, 1, nullptr);
 }
 
 /// One window that has been painted, and a clock moved by hand. At the end nothing may be left.
