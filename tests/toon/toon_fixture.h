@@ -12,11 +12,6 @@ namespace test {
 /// The text and the icon of a box; its caption is "Error".
 using Box = std::pair<std::string, UINT>;
 
-inline std::string readFile(const std::filesystem::path& path) {
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), std::istreambuf_iterator<char>()};
-}
-
 inline const std::filesystem::path badDirectory = DORBO_SOURCE_DIR "/tests/toon/bad";
 inline const std::filesystem::path toonDirectory = DORBO_TOONS;
 
@@ -64,16 +59,6 @@ class ToonTest : public ScratchDirectory {
             result.push_back(frame.x);
         }
         return result;
-    }
-
-    /// How many records the store takes.
-    static LONG storeSize() {
-        const ToonFrame frame{};
-        LONG size = 0;
-        while (FramePut(size, &frame)) {
-            ++size;
-        }
-        return size;
     }
 
     static void name(const std::string& path) {
