@@ -1,5 +1,6 @@
 #include "tests/film/film_readers.h"
 
+#include <arpa/inet.h>
 #include <gif_lib.h>
 #include <png.h>
 #include <zlib.h>
@@ -70,11 +71,8 @@ std::uint32_t number(const Text& bytes, std::size_t at, std::size_t count = 4) {
 }
 
 Text numberAsText(std::uint32_t value) {
-    Text bytes;
-    for (const unsigned shift : {24U, 16U, 8U, 0U}) {
-        bytes += static_cast<char>(value >> shift);
-    }
-    return bytes;
+    const std::uint32_t turned = htonl(value);
+    return {reinterpret_cast<const char*>(&turned), sizeof turned};
 }
 
 std::uint32_t sumOf(const Text& bytes) {
