@@ -62,19 +62,9 @@ int RunEditor(HINSTANCE instance, HWND owner, int showCommand) {
 }
 
 int EditorClassSetup(HINSTANCE instance) {
-    WNDCLASSA windowClass{};
-    windowClass.style = CS_HREDRAW | CS_VREDRAW;
-    windowClass.lpfnWndProc = MainWindowProc;
-    windowClass.hInstance = instance;
-    windowClass.hIcon = LoadIconA(instance, PROGRAM_ICON);
-    windowClass.hCursor = LoadCursorA(nullptr, IDC_ARROW);
-    windowClass.hbrBackground = HBRUSH{GetStockObject(LTGRAY_BRUSH)};
-    windowClass.lpszClassName = MAIN_CLASS;
-    const WORD mainClass = RegisterClassA(&windowClass);
-    windowClass.lpfnWndProc = StageWindowProc;
-    windowClass.hIcon = nullptr;
-    windowClass.lpszClassName = STAGE_CLASS;
-    const WORD stageClass = RegisterClassA(&windowClass);
+    const WORD mainClass =
+        RegisterGreyClass(MAIN_CLASS, MainWindowProc, instance, LoadIconA(instance, PROGRAM_ICON));
+    const WORD stageClass = RegisterGreyClass(STAGE_CLASS, StageWindowProc, instance, nullptr);
     return mainClass != 0 || stageClass != 0 ? 1 : 0;
 }
 

@@ -154,15 +154,8 @@ static void PoseKey(HWND window, WPARAM key) {
 
 int PoseClassSetup(HINSTANCE instance) {
     PoseClassInstance = instance;
-    WNDCLASSA windowClass{};
-    windowClass.style = CS_HREDRAW | CS_VREDRAW;
-    windowClass.lpfnWndProc = PoseWindowProc;
-    windowClass.hInstance = instance;
-    windowClass.hIcon = LoadIconA(nullptr, IDI_APPLICATION);
-    windowClass.hCursor = LoadCursorA(nullptr, IDC_ARROW);
-    windowClass.hbrBackground = HBRUSH{GetStockObject(LTGRAY_BRUSH)};
-    windowClass.lpszClassName = POSE_CLASS;
-    return RegisterClassA(&windowClass);
+    return RegisterGreyClass(POSE_CLASS, PoseWindowProc, instance,
+                             LoadIconA(nullptr, IDI_APPLICATION));
 }
 
 int CreatePoseWindow(HINSTANCE instance, HWND owner) {

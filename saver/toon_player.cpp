@@ -16,15 +16,7 @@ constexpr int PLAYER_ICON = 100;
 
 BOOL PlayerClassSetup(HINSTANCE instance) {
     PlayerClassInstance = instance;
-    WNDCLASSA windowClass{};
-    windowClass.style = CS_VREDRAW | CS_HREDRAW;
-    windowClass.lpfnWndProc = PlayerProc;
-    windowClass.hInstance = instance;
-    windowClass.hIcon = LoadIconA(instance, PLAYER_ICON);
-    windowClass.hCursor = LoadCursorA(nullptr, IDC_ARROW);
-    windowClass.hbrBackground = HBRUSH{GetStockObject(LTGRAY_BRUSH)};
-    windowClass.lpszClassName = PLAYER_CLASS;
-    return RegisterClassA(&windowClass);
+    return RegisterGreyClass(PLAYER_CLASS, PlayerProc, instance, LoadIconA(instance, PLAYER_ICON));
 }
 
 int CreatePlayerWindow(HINSTANCE instance, HWND parent) {

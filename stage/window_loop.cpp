@@ -1,5 +1,17 @@
 #include "stage/window_loop.h"
 
+WORD RegisterGreyClass(const char* name, WNDPROC procedure, HINSTANCE instance, HICON icon) {
+    WNDCLASSA windowClass{};
+    windowClass.style = CS_VREDRAW | CS_HREDRAW;
+    windowClass.lpfnWndProc = procedure;
+    windowClass.hInstance = instance;
+    windowClass.hIcon = icon;
+    windowClass.hCursor = LoadCursorA(nullptr, IDC_ARROW);
+    windowClass.hbrBackground = HBRUSH{GetStockObject(LTGRAY_BRUSH)};
+    windowClass.lpszClassName = name;
+    return RegisterClassA(&windowClass);
+}
+
 int RunWindowLoop(HWND window, MessageTranslator translate) {
     MSG message{};
     while (IsWindow(window)) {

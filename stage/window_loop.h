@@ -1,7 +1,12 @@
-// The message loop of a window that has one to itself: it ends when its window has gone.
+// Windows that have a message loop to themselves: their class, and the loop, which ends when its
+// window has gone.
 #pragma once
 
 #include "platform/user.h"
+
+/// Sets up a window class with the arrow on light grey ground, repainted at each new size; 0 if it
+/// can't be, as where the name is taken.
+WORD RegisterGreyClass(const char* name, WNDPROC procedure, HINSTANCE instance, HICON icon);
 
 /// Sees to a message before it is dispatched; nonzero if it is done with.
 using MessageTranslator = int (*)(const MSG* message);
