@@ -1,6 +1,7 @@
 #include "cli/scene.h"
 
 #include "editor/chrome.h"
+#include "editor/command_ids.h"
 #include "editor/editor_shell.h"
 #include "editor/frame_fields.h"
 #include "platform/harness.h"
@@ -31,13 +32,6 @@ struct Action {
 };
 
 constexpr std::int64_t longestScene = 24LL * 60 * 60 * 1000; // ms
-constexpr int keyOpen = 126;
-constexpr int keyEdit = 127;
-constexpr int keySave = 134;
-constexpr int itemConfigure = 108;
-constexpr int poseButton = 1021;
-constexpr int keyFile = 122;
-constexpr int itemAbout = 5003;
 
 void sendKey(int command) {
     PostMessageA(EditorMainWindow, WM_COMMAND, static_cast<WPARAM>(MAKELONG(command, 1)), 0);
@@ -96,7 +90,7 @@ void pickPose(const Words& /*words*/, const Numbers& numbers) {
     RegisterClassA(&windowClass); // refused from the second time on
     const HWND user = CreateWindowExA(0, windowClass.lpszClassName, "", WS_POPUP, 0, 0, 1, 1,
                                       EditorDialog, nullptr, windowClass.hInstance, nullptr);
-    PostMessageA(EditorDialog, WM_COMMAND, poseButton, 0);
+    PostMessageA(EditorDialog, WM_COMMAND, POSE_BUTTON, 0);
     PostMessageA(user, WM_KEYDOWN, static_cast<WPARAM>('0' + numbers[0]), 0);
 }
 
@@ -115,15 +109,15 @@ constexpr Action actions[] = {
     {"minimise", 0, false, [](const Words&, const Numbers&) { press(MinimizeButton); }},
     {"close", 0, false, [](const Words&, const Numbers&) { press(CloseButton); }},
     {"command", 1, true, sendCommand},
-    {"open", 1, false, [](const Words& words, const Numbers&) { chooseFile(keyOpen, words[0]); }},
-    {"save", 1, false, [](const Words& words, const Numbers&) { chooseFile(keySave, words[0]); }},
-    {"cancel", 0, false, [](const Words&, const Numbers&) { chooseFile(keyOpen, std::nullopt); }},
+    {"open", 1, false, [](const Words& words, const Numbers&) { chooseFile(KEY_OPEN, words[0]); }},
+    {"save", 1, false, [](const Words& words, const Numbers&) { chooseFile(KEY_SAVE, words[0]); }},
+    {"cancel", 0, false, [](const Words&, const Numbers&) { chooseFile(KEY_OPEN, std::nullopt); }},
     {"answer", 1, true, answer},
     {"item", 1, true, sendItem},
     {"frame", 1, true, selectFrame},
     {"field", 2, false, fillField},
     {"pose", 1, true, pickPose},
-    {"edit", 0, false, [](const Words&, const Numbers&) { sendKey(keyEdit); }},
+    {"edit", 0, false, [](const Words&, const Numbers&) { sendKey(KEY_EDIT); }},
     {"activate", 0, false, [](const Words&, const Numbers&) { activate(WA_ACTIVE); }},
     {"deactivate", 0, false, [](const Words&, const Numbers&) { activate(WA_INACTIVE); }},
     {"iconify", 0, false,
@@ -166,7 +160,7 @@ SceneStep stepOf(const Words& line, std::int64_t earliest) {
     for (const std::string& word : action->numbers ? words : Words{}) {
         numbers.push_back(numberOf(word, -0x8000, 0x7FFF)); // half a message's parameter
     }
-    constexpr std::array unanswered{keyFile, itemAbout, itemConfigure, poseButton};
+    constexpr std::array unanswered{KEY_FILE, POPUP_ABOUT, ITEM_CONFIGURE, POSE_BUTTON};
     const bool sends = action->act == sendCommand || action->act == sendItem;
     if (sends && std::ranges::find(unanswered, numbers[0]) != unanswered.end()) {
         throw std::runtime_error("what command " + words[0] + " opens can't be answered");

@@ -2,6 +2,7 @@
 
 #include "editor/button_states.h"
 #include "editor/chrome.h"
+#include "editor/command_ids.h"
 #include "editor/editor_shell.h"
 #include "editor/frame_editor.h"
 #include "platform/menus.h"
@@ -12,22 +13,6 @@
 #include "toon/toon_prompts.h"
 
 static HMENU FilePopup;
-
-// The keys' commands.
-constexpr int KEY_FILE = 122;
-constexpr int KEY_PLAY = 123;
-constexpr int KEY_CONTINUE = 124;
-constexpr int KEY_STOP = 125;
-constexpr int KEY_OPEN = 126;
-constexpr int KEY_EDIT = 127;
-constexpr int KEY_WALK = 135;
-
-// The menu's items.
-constexpr int ITEM_OPEN = 5000;
-constexpr int ITEM_EDIT = 5001;
-constexpr int ITEM_PLAY = 5002;
-constexpr int ITEM_ABOUT = 5003;
-constexpr int ITEM_EXIT = 5004;
 
 constexpr DWORD STATEMENTS_ALLOWED = 1;
 
@@ -51,14 +36,8 @@ static void CloseEditor(HWND mainWindow) {
     DestroyWindow(mainWindow);
 }
 
-void EditorCommand(HWND mainWindow, HINSTANCE instance, WPARAM wParam, LPARAM lParam) {
-    if (ControlCommand(mainWindow, lParam, instance) == 0 &&
-        AcceleratorCommand(mainWindow, wParam, instance) == 0) {
-        PopupCommand(mainWindow, wParam, instance);
-    }
-}
-
-int ControlCommand(HWND mainWindow, LPARAM control, HINSTANCE instance) {
+/// 1 if `control` is one of the five buttons, whose command has then run, else 0.
+static int ControlCommand(HWND mainWindow, LPARAM control, HINSTANCE instance) {
     const HWND sender{static_cast<DWORD>(control)};
     if (!sender) {
         return 0;
@@ -97,7 +76,9 @@ static HWND ButtonOfKey(int key) {
     }
 }
 
-int AcceleratorCommand(HWND mainWindow, WPARAM wParam, HINSTANCE instance) {
+/// 1 if this is a key that means something now; its command runs if the button that stands for it
+/// is enabled. Else 0.
+static int AcceleratorCommand(HWND mainWindow, WPARAM wParam, HINSTANCE instance) {
     const int key = LOWORD(static_cast<DWORD>(wParam));
     if (EditorDialog) {
         return FrameEditorAccelerator(instance, key);
@@ -129,21 +110,21 @@ int AcceleratorCommand(HWND mainWindow, WPARAM wParam, HINSTANCE instance) {
     return 1;
 }
 
-void PopupCommand(HWND mainWindow, WPARAM wParam, HINSTANCE instance) {
+static void PopupCommand(HWND mainWindow, WPARAM wParam, HINSTANCE instance) {
     switch (LOWORD(static_cast<DWORD>(wParam))) {
-    case ITEM_OPEN:
+    case POPUP_OPEN:
         OpenToon(mainWindow);
         break;
-    case ITEM_EDIT:
+    case POPUP_EDIT:
         OpenFrameEditor(mainWindow, instance);
         break;
-    case ITEM_PLAY:
+    case POPUP_PLAY:
         PlayCommand(mainWindow, instance);
         break;
-    case ITEM_ABOUT:
+    case POPUP_ABOUT:
         DialogBoxParamA(instance, "About", mainWindow, AboutProc, 0);
         break;
-    case ITEM_EXIT:
+    case POPUP_EXIT:
         DestroyWindow(mainWindow);
         break;
     default:
@@ -151,16 +132,23 @@ void PopupCommand(HWND mainWindow, WPARAM wParam, HINSTANCE instance) {
     }
 }
 
+void EditorCommand(HWND mainWindow, HINSTANCE instance, WPARAM wParam, LPARAM lParam) {
+    if (ControlCommand(mainWindow, lParam, instance) == 0 &&
+        AcceleratorCommand(mainWindow, wParam, instance) == 0) {
+        PopupCommand(mainWindow, wParam, instance);
+    }
+}
+
 // ---- The menu -----------------------------------------------------------------------------------
 
 void CreateFilePopup() {
     FilePopup = CreatePopupMenu();
-    AppendMenuA(FilePopup, MF_STRING, ITEM_OPEN, "&Open..\tCtrl+O");
-    AppendMenuA(FilePopup, MF_STRING, ITEM_EDIT, "&Edit..\tCtrl+E");
-    AppendMenuA(FilePopup, MF_STRING, ITEM_PLAY, "&Play\tAlt+P");
+    AppendMenuA(FilePopup, MF_STRING, POPUP_OPEN, "&Open..\tCtrl+O");
+    AppendMenuA(FilePopup, MF_STRING, POPUP_EDIT, "&Edit..\tCtrl+E");
+    AppendMenuA(FilePopup, MF_STRING, POPUP_PLAY, "&Play\tAlt+P");
     AppendMenuA(FilePopup, MF_SEPARATOR, 0, nullptr);
-    AppendMenuA(FilePopup, MF_STRING, ITEM_ABOUT, "&About..");
-    AppendMenuA(FilePopup, MF_STRING, ITEM_EXIT, "E&xit");
+    AppendMenuA(FilePopup, MF_STRING, POPUP_ABOUT, "&About..");
+    AppendMenuA(FilePopup, MF_STRING, POPUP_EXIT, "E&xit");
 }
 
 void DestroyFilePopup() {
@@ -189,9 +177,9 @@ void ShowFilePopup(HWND mainWindow) {
     const LONG height = MenuHeight(mainWindow);
     const UINT play = IsWindowEnabled(PlayButton) ? MF_ENABLED : MF_GRAYED;
     const UINT open = EditorDialog ? MF_GRAYED : MF_ENABLED;
-    EnableMenuItem(FilePopup, ITEM_PLAY, play);
-    EnableMenuItem(FilePopup, ITEM_OPEN, open);
-    EnableMenuItem(FilePopup, ITEM_EDIT, open);
+    EnableMenuItem(FilePopup, POPUP_PLAY, play);
+    EnableMenuItem(FilePopup, POPUP_OPEN, open);
+    EnableMenuItem(FilePopup, POPUP_EDIT, open);
     TrackPopupMenu(FilePopup, 0, place.left + fromLeft, place.bottom - height - fromBottom, 0,
                    mainWindow, nullptr);
 }

@@ -1,6 +1,7 @@
 #include "editor/frame_editor.h"
 
 #include "editor/button_states.h"
+#include "editor/command_ids.h"
 #include "editor/configuration.h"
 #include "editor/editor_shell.h"
 #include "editor/frame_fields.h"
@@ -10,33 +11,6 @@
 #include <algorithm>
 
 HWND EditorDialog;
-
-// The menu's items.
-constexpr int ITEM_NEW = 104;
-constexpr int ITEM_OPEN = 105;
-constexpr int ITEM_SAVE_AS = 106;
-constexpr int ITEM_CONFIGURE = 108; // and its key
-constexpr int ITEM_EXIT = 109;
-constexpr int ITEM_NEW_FRAME = 110;
-constexpr int ITEM_INSERT_FRAME = 111;
-constexpr int ITEM_DELETE_FRAME = 112;
-constexpr int ITEM_SAVE = 113;
-constexpr int ITEM_SAVE_FRAME = 114;
-
-// The buttons.
-constexpr int NEW_FRAME_BUTTON = 1015;
-constexpr int POSE_BUTTON = 1021;
-constexpr int WINK_CHECK = 1046;
-
-// The keys.
-constexpr int KEY_PAUSE = 125;
-constexpr int KEY_OPEN = 126;
-constexpr int KEY_EXIT = 127;
-constexpr int KEY_LIST = 128;
-constexpr int KEY_TEXT = 129;
-constexpr int KEY_X = 130;
-constexpr int KEY_Y = 131;
-constexpr int KEY_SAVE = 134;
 
 // ---- Open and close
 // -----------------------------------------------------------------------------
@@ -290,21 +264,21 @@ int FrameEditorAccelerator(HINSTANCE instance, int id) {
     case KEY_OPEN:
         OpenToonInEditor(EditorDialog);
         return 1;
-    case KEY_EXIT:
+    case KEY_LEAVE:
         ExitFrameEditor(EditorDialog);
         return 1;
     case KEY_SAVE:
         SaveToonCommand(EditorDialog);
         return 1;
-    case KEY_PAUSE:
+    case KEY_TO_PAUSE:
         return FocusField(PAUSE_FIELD);
-    case KEY_LIST:
+    case KEY_TO_LIST:
         return FocusField(FRAME_LIST);
-    case KEY_TEXT:
+    case KEY_TO_TEXT:
         return FocusField(TEXT_FIELD);
-    case KEY_X:
+    case KEY_TO_X:
         return FocusField(X_FIELD);
-    case KEY_Y:
+    case KEY_TO_Y:
         return FocusField(Y_FIELD);
     default:
         return 0;

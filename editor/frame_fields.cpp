@@ -1,5 +1,6 @@
 #include "editor/frame_fields.h"
 
+#include "editor/command_ids.h"
 #include "platform/kernel.h"
 #include "stage/editor_host.h"
 
@@ -7,9 +8,6 @@
 #include <cstring>
 
 LONG EditPose;
-
-constexpr int POSE_BUTTON = 1021;
-constexpr int WINK_CHECK = 1046;
 
 constexpr LONG BEYOND_STAGE = 150; // how far off the screen he may stand
 constexpr LONG DEFAULT_PAUSE = 5;  // seconds

@@ -10,13 +10,6 @@
 /// Written here and by the commands.
 extern LONG EditPose;
 
-// The controls that the keys lead to.
-constexpr int FRAME_LIST = 1016;
-constexpr int TEXT_FIELD = 1017;
-constexpr int X_FIELD = 1018;
-constexpr int Y_FIELD = 1019;
-constexpr int PAUSE_FIELD = 1020;
-
 // ---- The list
 // -------------------------------------------------------------------------------------
 

@@ -9,7 +9,6 @@
 
 namespace {
 
-constexpr int CONFIGURE = 108;
 constexpr int CAPTION_FIELD = 1023;
 constexpr int SPEED_BAR = 1030;
 constexpr int BACKGROUND_LIST = 1035;
@@ -52,7 +51,7 @@ class Configuration : public FrameEditorTest {
                  act();
                  QTimer::singleShot(0, [button] { answerWith(button); });
              });
-        command(CONFIGURE);
+        command(ITEM_CONFIGURE);
         EXPECT_FALSE(dialog());
         EXPECT_EQ(count("rebuild_backdrop"), 1U);
         EXPECT_EQ(saveIsGrey(), button == IDCANCEL);
@@ -185,7 +184,7 @@ TEST_F(Configuration, ATileIsChosenFromTheListAndShowsAtOnce) {
 
 TEST_F(Configuration, GoesWithTheEditorAndItsPicturesWithIt) {
     once([] { return dialog() != HWND{}; }, [] { PostMessageA(EditorMainWindow, WM_CLOSE, 0, 0); });
-    command(CONFIGURE);
+    command(ITEM_CONFIGURE);
     EXPECT_FALSE(EditorMainWindow);
 }
 

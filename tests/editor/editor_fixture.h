@@ -4,6 +4,7 @@
 
 #include "cli/replay.h"
 #include "editor/chrome.h"
+#include "editor/command_ids.h"
 #include "editor/editor_shell.h"
 #include "tests/recorded_stage.h"
 #include "toon/toon_document.h"
@@ -16,15 +17,6 @@
 #include <set>
 
 class QWidget;
-
-// What a key sends.
-constexpr int KEY_FILE = 122;
-constexpr int KEY_PLAY = 123;
-constexpr int KEY_CONTINUE = 124;
-constexpr int KEY_STOP = 125;
-constexpr int KEY_OPEN = 126;
-constexpr int KEY_EDIT = 127;
-constexpr int KEY_WALK = 135;
 
 enum class NextFrame { none, behind, at }; // 0; behind a frame of the Toon; at one
 

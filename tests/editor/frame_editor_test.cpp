@@ -6,11 +6,6 @@
 
 namespace {
 
-constexpr int INSERT_FRAME = 111;
-constexpr int DELETE_FRAME = 112;
-constexpr int NEW_FRAME = 110;
-constexpr int EXIT = 109;
-
 TEST_F(FrameEditorTest, NumbersAreHeldToTheirRanges) {
     struct Case {
         const char* typed;
@@ -79,7 +74,7 @@ TEST_F(FrameEditorTest, AFrameIsShownAsItIsAndWhatIsNotCommittedIsGone) {
     command(FRAME_LIST);
     EXPECT_EQ(CurrentFrameIndex, 0);
     SendDlgItemMessageA(EditorDialog, FRAME_LIST, CB_SETCURSEL, static_cast<WPARAM>(-1), 0);
-    for (const int id : {COMMIT, FRAME_LIST, INSERT_FRAME, DELETE_FRAME}) {
+    for (const int id : {COMMIT, FRAME_LIST, ITEM_INSERT_FRAME, ITEM_DELETE_FRAME}) {
         command(id);
         EXPECT_EQ(CurrentFrameIndex, 0) << id;
         EXPECT_EQ(joined(places()), "-7,0") << id;
@@ -121,11 +116,11 @@ TEST_F(FrameEditorTest, FramesComeAndGoInTheirPlaces) {
     };
 
     const Case cases[] = {
-        {3, 0, INSERT_FRAME, 0, "0,1,2,3"}, {3, 1, INSERT_FRAME, 1, "1,0,2,3"},
-        {3, 2, INSERT_FRAME, 2, "1,2,0,3"}, {1, 0, INSERT_FRAME, 0, "0,1"},
-        {3, 0, DELETE_FRAME, 0, "2,3"},     {3, 1, DELETE_FRAME, 1, "1,3"},
-        {3, 2, DELETE_FRAME, 1, "1,2"},     {1, 0, DELETE_FRAME, 0, "0"},
-        {3, 0, NEW_FRAME, 3, "1,2,3,0"},    {1, 0, 1015, 1, "1,0"},
+        {3, 0, ITEM_INSERT_FRAME, 0, "0,1,2,3"}, {3, 1, ITEM_INSERT_FRAME, 1, "1,0,2,3"},
+        {3, 2, ITEM_INSERT_FRAME, 2, "1,2,0,3"}, {1, 0, ITEM_INSERT_FRAME, 0, "0,1"},
+        {3, 0, ITEM_DELETE_FRAME, 0, "2,3"},     {3, 1, ITEM_DELETE_FRAME, 1, "1,3"},
+        {3, 2, ITEM_DELETE_FRAME, 1, "1,2"},     {1, 0, ITEM_DELETE_FRAME, 0, "0"},
+        {3, 0, ITEM_NEW_FRAME, 3, "1,2,3,0"},    {1, 0, 1015, 1, "1,0"},
     };
     for (const auto& [frames, at, id, then, all] : cases) {
         editFrames(frames);
@@ -144,7 +139,7 @@ TEST_F(FrameEditorTest, FramesComeAndGoInTheirPlaces) {
 }
 
 TEST_F(FrameEditorTest, AToonGrowsTo251Frames) {
-    for (const int id : {NEW_FRAME, INSERT_FRAME}) {
+    for (const int id : {ITEM_NEW_FRAME, ITEM_INSERT_FRAME}) {
         for (const LONG frames : {250, 251, 300}) {
             editFrames(frames);
             select(249);
@@ -159,7 +154,7 @@ TEST_F(FrameEditorTest, AToonGrowsTo251Frames) {
             expectInOrder(when);
         }
     }
-    command(DELETE_FRAME);
+    command(ITEM_DELETE_FRAME);
     EXPECT_EQ(FrameCount, 299);
     EXPECT_EQ(frame(249).x, 251);
     EXPECT_EQ(frame(298).x, 300);
@@ -170,8 +165,8 @@ TEST_F(FrameEditorTest, WhatChangesTheFramesEndsAShowAndLeavesPlayAsItIs) {
     constexpr int open = 105;
     constexpr int begin = 104;
     const std::tuple<int, const char*, bool> cases[] = {
-        {NEW_FRAME, "", false}, {INSERT_FRAME, "", false}, {DELETE_FRAME, "", false},
-        {begin, "", false},     {open, "one.zkt", true},   {open, "none.zkt", false},
+        {ITEM_NEW_FRAME, "", false}, {ITEM_INSERT_FRAME, "", false}, {ITEM_DELETE_FRAME, "", false},
+        {begin, "", false},          {open, "one.zkt", true},        {open, "none.zkt", false},
     };
     for (const auto& [id, file, plays] : cases) {
         for (const char* state : {"held", "at frame"}) {
@@ -188,7 +183,7 @@ TEST_F(FrameEditorTest, WhatChangesTheFramesEndsAShowAndLeavesPlayAsItIs) {
                 press(PlayButton);
                 runUntilEvent("timer_set timer=PAUSE");
                 EXPECT_EQ(stateNow(), "pause") << "it plays under the frame editor too";
-                command(INSERT_FRAME);
+                command(ITEM_INSERT_FRAME);
                 EXPECT_EQ(stateNow(), "idle");
             }
             expectInOrder(state);
@@ -204,7 +199,7 @@ TEST_F(FrameEditorTest, ItsEndIsARestWhateverTheStageWasAt) {
         reach(state.name);
         OpenFrameEditor(EditorMainWindow, GetModuleHandleA(nullptr));
         EXPECT_NE(SetClassLongA(EditorStage, GCL_HCURSOR, 0), DWORD{IDC_ARROW.number});
-        command(EXIT);
+        command(ITEM_EXIT);
         EXPECT_EQ(stateNow(), "idle") << state.name;
         EXPECT_EQ(SetClassLongA(EditorStage, GCL_HCURSOR, 0), DWORD{IDC_ARROW.number});
     }
@@ -212,7 +207,7 @@ TEST_F(FrameEditorTest, ItsEndIsARestWhateverTheStageWasAt) {
     openToon(""); // forgets the name
     key(KEY_EDIT);
     EXPECT_EQ(joined(places()), "0");
-    command(EXIT);
+    command(ITEM_EXIT);
     EXPECT_FALSE(IsWindowEnabled(PlayButton)) << "no Toon is open";
 }
 
@@ -279,7 +274,7 @@ TEST_F(Leaving, AsksAboutChangesAndDoesWhatIsAnswered) {
     };
     for (const auto& [toon, name, answered, exit, begin, open] : cases) {
         const std::tuple<const char*, std::function<void()>, const char*> ways[] = {
-            {"Exit", [] { command(EXIT); }, exit},
+            {"Exit", [] { command(ITEM_EXIT); }, exit},
             {"the close box",
              [] {
                  PostMessageA(EditorDialog, WM_CLOSE, 0, 0);
@@ -313,10 +308,10 @@ TEST_F(Leaving, TheEditorsOwnEndAsksNothing) {
 
 TEST_F(Leaving, WithoutSavingTakesAddedFramesBackAndTheNextOpeningShowsOneThatThereIs) {
     edit("two.zkt");
-    command(NEW_FRAME);
-    command(NEW_FRAME);
+    command(ITEM_NEW_FRAME);
+    command(ITEM_NEW_FRAME);
     answerGiven = IDNO;
-    command(EXIT);
+    command(ITEM_EXIT);
     EXPECT_EQ(joined(places()), "200,300");
     key(KEY_EDIT);
     EXPECT_TRUE(saveIsGrey());

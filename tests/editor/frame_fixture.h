@@ -17,8 +17,6 @@
 
 class FrameEditorTest : public EditorTest {
   protected:
-    static constexpr int WINK_CHECK = 1046;
-    static constexpr int POSE_BUTTON = 1021;
     static constexpr int COMMIT = 1012;
 
     /// An editor at rest, a Toon in it, "" for none, and the frame editor over it.

@@ -11,8 +11,6 @@
 
 namespace {
 
-constexpr int ABOUT = 5003;
-
 class Keys : public EditorTest {
   protected:
     static QMenu* openMenu() {
@@ -49,7 +47,7 @@ TEST_F(Keys, ReachTheEditorWhereverTheFocusIsButNotBehindADialog) {
                  type(Qt::Key_O, Qt::ControlModifier);
                  once([] { return filesAsked == 2; },
                       [] {
-                          PostMessageA(EditorMainWindow, WM_COMMAND, ABOUT, 0);
+                          PostMessageA(EditorMainWindow, WM_COMMAND, POPUP_ABOUT, 0);
                           once(dialogStands, [] {
                               type(Qt::Key_O, Qt::ControlModifier);
                               QTimer::singleShot(50, closeSoon);
@@ -85,13 +83,6 @@ TEST_F(Keys, TheMenuStandsAboveTheFileButtonAndGreysWhatCantBeChosen) {
         EXPECT_EQ(filesAsked, before + 1);
         close();
     }
-}
-
-TEST_F(Keys, TheMenuGoesWithItsWindow) {
-    openAtRest();
-    once(menuStands, closeSoon);
-    press(FileButton);
-    EXPECT_EQ(EditorMainWindow, HWND{});
 }
 
 } // namespace

@@ -25,9 +25,6 @@ void postCommand(HWND window, int command) {
     PostMessageA(window, WM_COMMAND, static_cast<WPARAM>(command), 0);
 }
 
-constexpr int ABOUT = 5003;
-constexpr int EXIT = 5004;
-
 int runEditor() {
     return RunEditor(GetModuleHandleA(nullptr), nullptr, SW_SHOWNORMAL);
 }
@@ -45,14 +42,14 @@ TEST_F(EditorTest, ARunEndsWithItsWindowHoweverThatGoes) {
          [] {
              PostMessageA(EditorMainWindow, WM_COMMAND, 0, static_cast<LPARAM>(CloseButton.number));
          }},
-        {"Exit", [] { postCommand(EditorMainWindow, EXIT); }},
+        {"Exit", [] { postCommand(EditorMainWindow, POPUP_EXIT); }},
         {"the window manager", [] { PostMessageA(EditorMainWindow, WM_CLOSE, 0, 0); }},
         {"the stage", [] { PostMessageA(EditorStage, WM_CLOSE, 0, 0); }},
         {"the setup", CloseEditorIfOpen},
         {"the session", [] { PostMessageA(EditorMainWindow, WM_ENDSESSION, TRUE, 0); }},
         {"behind the about box",
          [] {
-             postCommand(EditorMainWindow, ABOUT);
+             postCommand(EditorMainWindow, POPUP_ABOUT);
              once(dialogStands, [] { PostMessageA(EditorMainWindow, WM_CLOSE, 0, 0); });
          }},
     };
