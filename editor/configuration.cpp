@@ -27,8 +27,7 @@ int ConfigureToon(HINSTANCE instance, HWND editorDialog) {
     return 1;
 }
 
-// ---- The background
-// -----------------------------------------------------------------------------
+// ---- The background -----------------------------------------------------------------------------
 
 static LRESULT TellList(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam) {
     return SendDlgItemMessageA(dialog, BACKGROUND_LIST, message, wParam, lParam);
@@ -71,8 +70,7 @@ static void DrawBackgroundItem(const DRAWITEMSTRUCT* item) {
     }
 }
 
-// ---- The speed
-// ----------------------------------------------------------------------------------
+// ---- The speed ----------------------------------------------------------------------------------
 
 /// A page is one step, like a line. Meant: a dragged thumb goes back to its place.
 static void MoveSpeed(HWND dialog, WORD code) {
@@ -87,8 +85,7 @@ static void MoveSpeed(HWND dialog, WORD code) {
     }
 }
 
-// ---- The dialog
-// ---------------------------------------------------------------------------------
+// ---- The dialog ---------------------------------------------------------------------------------
 
 int ConfigureInit(HWND dialog, const ToonHeader* header) {
     CentreDialog(dialog);

@@ -12,8 +12,7 @@
 
 HWND EditorDialog;
 
-// ---- Open and close
-// -----------------------------------------------------------------------------
+// ---- Open and close -----------------------------------------------------------------------------
 
 void OpenFrameEditor(HWND mainWindow, HINSTANCE instance) {
     if (EditorDialog) {
@@ -65,8 +64,7 @@ int CloseFrameEditor(HWND dialog) {
     return 1;
 }
 
-// ---- Frames
-// -------------------------------------------------------------------------------------
+// ---- Frames -------------------------------------------------------------------------------------
 
 static int RefuseFrame(HWND dialog) {
     MessageBeep(0);
@@ -129,8 +127,7 @@ void ChoosePose(HINSTANCE instance, HWND dialog) {
     ToonSetDirty(dialog, 1);
 }
 
-// ---- Files
-// --------------------------------------------------------------------------------------
+// ---- Files --------------------------------------------------------------------------------------
 
 int SaveToonAs(HWND dialog) {
     ToonFileDialog.lpstrTitle = "Save Toon File";
@@ -195,8 +192,7 @@ int NewToonInEditor(HWND dialog) {
     return 1;
 }
 
-// ---- The dialog
-// ---------------------------------------------------------------------------------
+// ---- The dialog ---------------------------------------------------------------------------------
 
 static int RunCommand(HWND dialog, HINSTANCE instance, int command) {
     switch (command) {

@@ -13,8 +13,7 @@ constexpr LONG BEYOND_STAGE = 150; // how far off the screen he may stand
 constexpr LONG DEFAULT_PAUSE = 5;  // seconds
 constexpr LONG LONGEST_PAUSE = 20;
 
-// ---- The list
-// -----------------------------------------------------------------------------------
+// ---- The list -----------------------------------------------------------------------------------
 
 static LRESULT TellList(HWND dialog, UINT message, WPARAM wParam, LPARAM lParam) {
     return SendDlgItemMessageA(dialog, FRAME_LIST, message, wParam, lParam);
@@ -57,8 +56,7 @@ int FrameSelectionChanged(HWND dialog) {
     return FrameListSelection(dialog) == CurrentFrameIndex ? 1 : SelectFrame(dialog);
 }
 
-// ---- The fields
-// ---------------------------------------------------------------------------------
+// ---- The fields ---------------------------------------------------------------------------------
 
 static void ShowNumber(HWND dialog, int field, LONG number) {
     SetDlgItemInt(dialog, field, static_cast<UINT>(number), TRUE);

@@ -10,8 +10,7 @@
 /// Written here and by the commands.
 extern LONG EditPose;
 
-// ---- The list
-// -------------------------------------------------------------------------------------
+// ---- The list -----------------------------------------------------------------------------------
 
 /// Fills it with the numbers 1 to FrameCount and selects the current frame.
 void FillFrameList(HWND dialog);
@@ -30,8 +29,7 @@ int SelectFrame(HWND dialog);
 /// The same, unless it is the current one already.
 int FrameSelectionChanged(HWND dialog);
 
-// ---- The fields
-// -----------------------------------------------------------------------------------
+// ---- The fields ---------------------------------------------------------------------------------
 
 /// Shows a frame, and the Toon's name in the title. Always 1.
 int ShowFrameFields(HWND dialog, const ToonFrame* frame);

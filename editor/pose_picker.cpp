@@ -18,8 +18,7 @@ static HBITMAP PosePictures[POSES];
 constexpr const char* POSE_CLASS = "PoseWndClass";
 constexpr COLORREF NUMBER_COLOUR = RGB(0, 0, 255);
 
-// ---- Pictures and places
-// ------------------------------------------------------------------------
+// ---- Pictures and places ------------------------------------------------------------------------
 
 static void LoadPosePictures(HINSTANCE instance) {
     for (int pose = 0; pose < POSES; ++pose) {
@@ -67,8 +66,7 @@ static void ClipToPoseWindow(HWND window) {
     ClipCursor(&place);
 }
 
-// ---- Painting
-// -----------------------------------------------------------------------------------
+// ---- Painting -----------------------------------------------------------------------------------
 
 static void BevelCell(HDC dc, const RECT& cell, int width) {
     DrawBevel(dc, cell.left, cell.top, cell.right, cell.bottom, width);
@@ -118,8 +116,7 @@ static void PaintPoseWindow(HWND window) {
     EndPaint(window, &paint);
 }
 
-// ---- The choice
-// ---------------------------------------------------------------------------------
+// ---- The choice ---------------------------------------------------------------------------------
 
 /// Meant: a press beside all cells chooses the first pose.
 static void PickPoseAt(HWND window, LPARAM point) {
@@ -149,8 +146,7 @@ static void PoseKey(HWND window, WPARAM key) {
     }
 }
 
-// ---- The window
-// ---------------------------------------------------------------------------------
+// ---- The window ---------------------------------------------------------------------------------
 
 int PoseClassSetup(HINSTANCE instance) {
     PoseClassInstance = instance;
