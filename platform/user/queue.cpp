@@ -4,6 +4,7 @@
 #include "platform/user/accelerators.h"
 #include "platform/user/clock.h"
 #include "platform/user/ending.h"
+#include "platform/user/ordered_input.h"
 #include "platform/user/overlay.h"
 #include "platform/user/timers.h"
 #include "platform/user/toolkit.h"
@@ -126,6 +127,8 @@ void pump() {
     ownLevel = toolkitLevel();
     flushWindows();
     QCoreApplication::processEvents();
+    while (!messagesWait() && handOverInput()) {
+    }
 }
 
 /// Sleeps until the toolkit has something or a timer is due, or moves the clock there.
@@ -182,6 +185,10 @@ void rethrowFromToolkitLoop() {
     }
 }
 
+bool messagesWait() {
+    return !posted.empty() || !input.empty();
+}
+
 bool toolkitLoopIsInnermost() {
     return QCoreApplication::instance() != nullptr && toolkitLevel() > ownLevel;
 }
@@ -191,6 +198,8 @@ void drainWithinToolkitLoop() {
         return;
     }
     const int level = ownLevel; // a handler may run a loop of the program's, which sets it
+    while (handOverInput()) {   // in the order in which this loop would have had it
+    }
     MSG message{};
     int handled = 0;
     while (handled < batch && !thrown && takeWithinToolkitLoop(message)) {

@@ -10,6 +10,9 @@ namespace seam {
 void queuePosted(const MSG& message);
 void queueInput(const MSG& message);
 
+/// Whether any message waits, posted or input.
+bool messagesWait();
+
 /// Waits for the next message of any window and takes it, but no quit.
 void waitForMessage(MSG& message);
 

@@ -1,10 +1,10 @@
 #include "platform/user/toolkit.h"
 
 #include "platform/user/ending.h"
+#include "platform/user/ordered_input.h"
 #include "platform/user/queue.h"
 #include "platform/user/window.h"
 
-#include <QApplication>
 #include <QPalette>
 #include <QProxyStyle>
 #include <QScreen>
@@ -98,7 +98,7 @@ bool makeToolkit() {
     QApplication::setStyle(new ClassicStyle);
     QApplication::setPalette(classicPalette());
     // It lives as long as the process: windows may be destroyed by handlers of static objects.
-    new QApplication(argumentCount, static_cast<char**>(arguments));
+    new OrderedApplication(argumentCount, static_cast<char**>(arguments));
     QApplication::setQuitOnLastWindowClosed(false);
     QObject::connect(qGuiApp, &QGuiApplication::applicationStateChanged, tellOfActivation);
     catchSignals();
