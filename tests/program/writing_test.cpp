@@ -1,22 +1,16 @@
 // A Toon is written from nothing, saved, opened again, played and edited, as a user does it: by
 // clicks and keys on a real screen.
-#include "tests/program/run.h"
+#include "tests/program/editing.h"
 
 #include <csignal>
 #include <cstring>
 #include <sstream>
 
-#include <QPainter>
-
 namespace {
 
 using namespace ground;
 
-// Places on the screen.
-constexpr QRect stage(25, 42, 590, 380);
 constexpr QPoint barEnd(528, 440); // of the show's progress
-constexpr QPoint picker(35, 95);
-constexpr const char* editor = "Fenky Dorbo Toon File Editor";
 
 /// A frame as it is typed, clicked and picked.
 struct Entry {
@@ -65,31 +59,8 @@ std::vector<std::string> told(const std::filesystem::path& toon) {
     return lines;
 }
 
-class Writing : public Run {
+class Writing : public Editing {
   protected:
-    Writing() : Run({640, 480}) {}
-
-    /// Waits until the window has the keyboard; opens it by a key, which may come too early.
-    void waitForWindow(const std::string& title, const std::string& key = "") {
-        std::string active;
-        const std::string ask = "xdotool getactivewindow getwindowname 2>&1";
-        const auto comesUp = [&] {
-            return (active = ground.launch({"sh", "-c", ask}).readLine()) == title;
-        };
-        const auto opened = [&] {
-            return (key.empty() || ground.command({"xdotool", "key", key}) == 0) &&
-                   waitFor(comesUp, 1);
-        };
-        if (!waitFor(opened)) {
-            throw std::runtime_error(title + ", not " + active);
-        }
-    }
-
-    void keys(std::vector<std::string> words) {
-        words.insert(words.begin(), {"xdotool", "key"});
-        ground.command(words);
-    }
-
     void fill(const std::string& text) {
         keys({"ctrl+a", "BackSpace"});
         std::istringstream lines(text);
@@ -101,11 +72,6 @@ class Writing : public Run {
         }
     }
 
-    void click(QPoint at) {
-        const auto [x, y] = std::pair(std::to_string(at.x()), std::to_string(at.y()));
-        ground.command({"xdotool", "mousemove", x, y, "click", "1"});
-    }
-
     void write(const Entry& entry, const std::string& title) {
         click(stage.topLeft() + entry.place);
         waitForWindow(editor);
@@ -115,9 +81,10 @@ class Writing : public Run {
         keys({"Tab", "Tab", "Tab"});
         fill(entry.pause);
         keys({"Tab", entry.wink ? "space" : "Tab", "alt+o"});
-        waitForWindow("dorbo"); // the picker, which has no title of its own
+        waitForWindow(pickersTitle);
         if (entry.byMouse) {
-            click(picker + QPoint(74 + (entry.pose - 1) % 4 * 140, 74 + entry.pose / 5 * 141));
+            click(picker.topLeft() +
+                  QPoint(74 + (entry.pose - 1) % 4 * 140, 74 + entry.pose / 5 * 141));
         } else {
             keys({std::to_string(entry.pose)});
         }
@@ -129,13 +96,6 @@ class Writing : public Run {
         const auto file = ground.toons() / "mine.zkt";
         EXPECT_TRUE(waitFor([&] { return told(file) == expected; }))
             << testing::PrintToString(told(file));
-    }
-
-    /// Whether nothing but the tile shows on the stage, or on a part of it.
-    bool isEmpty(const std::string& tile, QRect part = stage) const {
-        QImage empty(stage.size(), QImage::Format_RGB32);
-        QPainter(&empty).fillRect(empty.rect(), QBrush(loadPicture(tile)));
-        return ground.grab().copy(part) == empty.copy(part.translated(-stage.topLeft()));
     }
 
     void playToTheEnd() {
@@ -150,13 +110,7 @@ class Writing : public Run {
 
 TEST_F(Writing, AToonComesToBeAndIsPlayed) {
     auto setup = ground.start({});
-    ground.command({"xdotool", "search", "--sync", "--name", "Rematch", "windowactivate"});
-    waitForWindow(editor, "alt+e");
-    const QRect leftEdge(25, 142, 40, 180);
-    ASSERT_TRUE(waitFor([&] { return isEmpty("bg01", leftEdge); }));
-    click(stage.topLeft() + QPoint(60, 190)); // to spare us his long hello
-    ASSERT_TRUE(waitFor([&] { return !isEmpty("bg01", leftEdge); })) << "he comes in";
-    waitForWindow("File: [Untitled]", "ctrl+e"); // which does nothing while he says hello
+    openFrameEditor();
     for (const Entry& entry : entries) {
         write(entry, "File: [Untitled]");
         keys({&entry == &entries[5] ? "ctrl+g" : "alt+n"});

@@ -1,0 +1,66 @@
+// What runs of the editor have in common: its windows are found by their titles, and used by clicks
+// and keys.
+#pragma once
+
+#include "tests/program/run.h"
+
+#include <QPainter>
+
+namespace ground {
+
+class Editing : public Run {
+  protected:
+    static constexpr QRect screen{0, 0, 640, 480};
+    static constexpr QRect stage{25, 42, 590, 380};
+    static constexpr QRect picker{35, 95, 570, 290};
+    static constexpr const char* editor = "Fenky Dorbo Toon File Editor";
+    static constexpr const char* pickersTitle = "dorbo"; // it has none of its own
+
+    Editing() : Run(screen.size()) {}
+
+    /// Waits until the window has the keyboard; opens it by a key, which may come too early.
+    void waitForWindow(const std::string& title, const std::string& key = "") {
+        std::string active;
+        const std::string ask = "xdotool getactivewindow getwindowname 2>&1";
+        const auto comesUp = [&] {
+            return (active = ground.launch({"sh", "-c", ask}).readLine()) == title;
+        };
+        const auto opened = [&] {
+            return (key.empty() || ground.command({"xdotool", "key", key}) == 0) &&
+                   waitFor(comesUp, 1);
+        };
+        if (!waitFor(opened)) {
+            throw std::runtime_error(title + ", not " + active);
+        }
+    }
+
+    void keys(std::vector<std::string> words) {
+        words.insert(words.begin(), {"xdotool", "key"});
+        ground.command(words);
+    }
+
+    void click(QPoint at) {
+        const auto [x, y] = std::pair(std::to_string(at.x()), std::to_string(at.y()));
+        ground.command({"xdotool", "mousemove", x, y, "click", "1"});
+    }
+
+    /// Whether nothing but the tile shows on the stage, or on a part of it.
+    bool isEmpty(const std::string& tile, QRect part = stage) const {
+        QImage empty(stage.size(), QImage::Format_RGB32);
+        QPainter(&empty).fillRect(empty.rect(), QBrush(loadPicture(tile)));
+        return ground.grab().copy(part) == empty.copy(part.translated(-stage.topLeft()));
+    }
+
+    /// From the setup, which has been started.
+    void openFrameEditor() {
+        ground.command({"xdotool", "search", "--sync", "--name", "Rematch", "windowactivate"});
+        waitForWindow(editor, "alt+e");
+        const QRect leftEdge(25, 142, 40, 180);
+        ASSERT_TRUE(waitFor([&] { return isEmpty("bg01", leftEdge); }));
+        click(stage.topLeft() + QPoint(60, 190)); // to spare us his long hello
+        ASSERT_TRUE(waitFor([&] { return !isEmpty("bg01", leftEdge); })) << "he comes in";
+        waitForWindow("File: [Untitled]", "ctrl+e"); // which does nothing while he says hello
+    }
+};
+
+} // namespace ground
