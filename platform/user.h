@@ -277,9 +277,10 @@ BOOL GetCursorPos(POINT* point);
 /// A window of this program that has that place gets a WM_MOUSEMOVE, and so sets its cursor anew.
 BOOL SetCursorPos(int x, int y);
 
-/// Keeps the pointer within a part of the screen, until it is called with null. FALSE where that
-/// can't be had: off X11, or while another program holds the pointer. Meanwhile no other program
-/// can hold it. It is free again when the program ends, however it does.
+/// Keeps the pointer within a part of the screen, until it is called with null. Meanwhile no other
+/// program can hold it. FALSE if the pointer isn't kept yet: while another program holds it, until
+/// a window of this one sees it move after that; or off X11, where it never is. It is free again
+/// when the program ends, however it does.
 BOOL ClipCursor(const RECT* area);
 
 constexpr int SM_CXSCREEN = 0; // of the primary monitor, in pixels

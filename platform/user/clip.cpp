@@ -3,6 +3,9 @@
 #include "platform/user.h"
 #include "platform/user/toolkit.h"
 
+#include <QCoreApplication>
+#include <QEvent>
+
 #include <cstdlib>
 #include <memory>
 #include <string_view>
@@ -61,18 +64,43 @@ static void release(xcb_connection_t* connection) {
     }
 }
 
+namespace {
+
+/// Another program may hold the pointer for a moment, as an open menu does: this tries again
+/// whenever a window of ours sees the pointer.
+class SecondTry : public QObject {
+  protected:
+    bool eventFilter(QObject* watched, QEvent* event) override {
+        const bool sees = event->type() == QEvent::Enter || event->type() == QEvent::MouseMove ||
+                          event->type() == QEvent::MouseButtonRelease;
+        if (sees && watched->isWindowType() && confine(xConnection())) {
+            QCoreApplication::instance()->removeEventFilter(this);
+        }
+        return false;
+    }
+};
+
+} // namespace
+
+/// Kept, like the application object, until the process ends.
+static SecondTry& secondTry() {
+    static auto* const instance = new SecondTry;
+    return *instance;
+}
+
 BOOL ClipCursor(const RECT* area) {
     xcb_connection_t* connection = xConnection();
     if (connection == nullptr) {
         return FALSE;
     }
     release(connection);
+    QCoreApplication::instance()->removeEventFilter(&secondTry());
     bool done = true;
     if (area != nullptr) {
         makeClipWindow(connection, *area);
         done = confine(connection);
         if (!done) {
-            release(connection);
+            QCoreApplication::instance()->installEventFilter(&secondTry());
         }
     }
     xcb_flush(connection);

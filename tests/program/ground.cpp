@@ -233,19 +233,28 @@ bool Ground::takeInput() const {
                                 xcb_grab_keyboard(connection_, 0, screen_->root, XCB_CURRENT_TIME,
                                                   XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC),
                                 nullptr));
+    return keyboard != nullptr && keyboard->status == XCB_GRAB_STATUS_SUCCESS && takePointer();
+}
+
+bool Ground::takePointer() const {
     const auto pointer = owned(xcb_grab_pointer_reply(
         connection_,
         xcb_grab_pointer(connection_, 0, screen_->root, 0, XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC,
                          XCB_NONE, XCB_NONE, XCB_CURRENT_TIME),
         nullptr));
-    return keyboard != nullptr && keyboard->status == XCB_GRAB_STATUS_SUCCESS &&
-           pointer != nullptr && pointer->status == XCB_GRAB_STATUS_SUCCESS;
+    return pointer != nullptr && pointer->status == XCB_GRAB_STATUS_SUCCESS;
 }
 
 void Ground::giveInputBack() const {
     xcb_ungrab_keyboard(connection_, XCB_CURRENT_TIME);
     xcb_ungrab_pointer(connection_, XCB_CURRENT_TIME);
     xcb_flush(connection_);
+}
+
+QPoint Ground::pointer() const {
+    const auto asked = xcb_query_pointer(connection_, screen_->root);
+    const auto told = owned(xcb_query_pointer_reply(connection_, asked, nullptr));
+    return told == nullptr ? QPoint(-1, -1) : QPoint(told->root_x, told->root_y);
 }
 
 void Ground::loseDisplay() {

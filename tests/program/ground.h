@@ -82,6 +82,7 @@ class Ground {
 
     /// Takes keyboard and pointer, as an open menu does; false if somebody else holds them.
     bool takeInput() const;
+    bool takePointer() const;
     void giveInputBack() const;
 
     bool inputIsFree() const {
@@ -89,6 +90,8 @@ class Ground {
         giveInputBack();
         return taken;
     }
+
+    QPoint pointer() const; ///< where on the screen it is
 
     /// The X server dies.
     void loseDisplay();
