@@ -8,6 +8,7 @@
 #include <QPalette>
 #include <QProxyStyle>
 #include <QScreen>
+#include <QStyleOption>
 
 #include <cstdio>
 #include <memory>
@@ -37,8 +38,10 @@ Probe probeDisplay() {
     return {xcb_connect(nullptr, nullptr), &xcb_disconnect};
 }
 
-/// The toolkit's classic look, but for the room between a check box and its text: texts are cut to
-/// the dialog units that they have.
+/// The toolkit's classic look, but for two things: the room between a check box and its text, as
+/// texts are cut to the dialog units that they have; and what pictures of arrows are kept by. That
+/// would be the palette's number, which is another for each widget, and each opening of a dialog
+/// would leave its pictures and their names behind.
 class ClassicStyle : public QProxyStyle {
   public:
     ClassicStyle() : QProxyStyle(QStringLiteral("windows")) {}
@@ -49,6 +52,18 @@ class ClassicStyle : public QProxyStyle {
         return metric == PM_CheckBoxLabelSpacing || metric == PM_RadioButtonLabelSpacing
                    ? spacing
                    : QProxyStyle::pixelMetric(metric, option, widget);
+    }
+
+    void drawPrimitive(PrimitiveElement element, const QStyleOption* option, QPainter* painter,
+                       const QWidget* widget) const override {
+        if (element < PE_IndicatorArrowDown || element > PE_IndicatorArrowUp) {
+            QProxyStyle::drawPrimitive(element, option, painter, widget);
+            return;
+        }
+        QStyleOption arrow(*option);
+        arrow.palette = QGuiApplication::palette();
+        arrow.palette.setCurrentColorGroup(option->palette.currentColorGroup());
+        QProxyStyle::drawPrimitive(element, &arrow, painter, widget);
     }
 };
 
