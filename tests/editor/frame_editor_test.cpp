@@ -374,4 +374,29 @@ TEST_F(Leaving, AnOpenThatFailsLeavesAnUntitledToonBehindTheFields) {
     EXPECT_TRUE(std::getline(in, text) && text == "no Toon");
 }
 
+TEST_F(Leaving, AFileThatCannotBeReadAgainLosesItsName) {
+    const std::pair<const char*, std::function<void(const std::filesystem::path&)>> fates[] = {
+        {"gone", [](const auto& file) { std::filesystem::remove(file); }},
+        {"another's", [](const auto& file) { std::ofstream(file) << "no Toon"; }},
+    };
+    for (const auto& [fate, befall] : fates) {
+        change("two.zkt", true);
+        befall(toons() / "two.zkt");
+        answerGiven = IDNO;
+        command(ITEM_EXIT);
+        EXPECT_FALSE(EditorDialog) << fate;
+        EXPECT_EQ(boxes.size(), 2U) << fate << ": the question, and what is wrong";
+        EXPECT_FALSE(IsWindowEnabled(PlayButton)) << fate;
+        key(KEY_EDIT);
+        EXPECT_EQ(title(), "File: [Untitled]") << fate;
+        command(COMMIT);
+        nameGiven = "";
+        command(ITEM_SAVE);
+        EXPECT_EQ(filesAsked, 1) << fate;
+        std::string text;
+        EXPECT_EQ(std::getline(std::ifstream(toons() / "two.zkt"), text).fail(), *fate == 'g');
+        EXPECT_EQ(text, *fate == 'g' ? "" : "no Toon");
+    }
+}
+
 } // namespace

@@ -137,6 +137,45 @@ TEST_F(FrameKeys, EnterAndEscapeDoNothingInItsFields) {
     }
 }
 
+TEST_F(FrameKeys, OfTwoCommandsAtOnceADialogOfTheFirstDropsTheSecond) {
+    struct Case {
+        int first, second;
+        const char* outcome; // frames, dialogs that came up, questions
+    };
+
+    const Case cases[] = {
+        {ITEM_NEW_FRAME, ITEM_NEW_FRAME, "4 0 0"}, {ITEM_DELETE_FRAME, ITEM_NEW_FRAME, "2 0 0"},
+        {ITEM_CONFIGURE, ITEM_CONFIGURE, "2 1 0"}, {ITEM_CONFIGURE, ITEM_NEW_FRAME, "2 1 0"},
+        {ITEM_CONFIGURE, ITEM_EXIT, "2 1 0"},      {ITEM_NEW_FRAME, ITEM_CONFIGURE, "3 1 0"},
+        {POSE_BUTTON, POSE_BUTTON, "2 1 0"},       {ITEM_EXIT, ITEM_EXIT, "closed 0 1"},
+        {ITEM_EXIT, ITEM_CONFIGURE, "closed 0 1"},
+    };
+    std::set<DWORD> stood;
+    QTimer timer;
+    QObject::connect(&timer, &QTimer::timeout, [&stood] {
+        seam::forEachWindow([&stood](const seam::Window& window) {
+            if (window.handle == picker() || (window.dialog && window.handle != EditorDialog)) {
+                stood.insert(window.handle.number);
+                SendMessageA(window.handle, window.dialog ? WM_COMMAND : WM_CLOSE, IDCANCEL, 0);
+            }
+        });
+    });
+    for (const auto& [first, second, outcome] : cases) {
+        edit("two.zkt");
+        ToonSetDirty(EditorDialog, first == ITEM_EXIT ? 1 : 0);
+        answerGiven = IDNO;
+        stood.clear();
+        timer.start(5);
+        PostMessageA(EditorDialog, WM_COMMAND, static_cast<WPARAM>(first), 0);
+        command(second);
+        timer.stop();
+        const std::string frames = EditorDialog ? std::to_string(FrameCount) : "closed";
+        EXPECT_EQ(frames + ' ' + std::to_string(stood.size()) + ' ' + std::to_string(boxes.size()),
+                  outcome)
+            << first << ", " << second;
+    }
+}
+
 TEST_F(FrameKeys, FiftyOpeningsLeaveNothingBehind) {
     constexpr std::size_t rounds = 50;
     constexpr std::size_t noArrow = 2000; // bytes a round, as the toolkit's heap settles

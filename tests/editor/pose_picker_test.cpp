@@ -143,4 +143,30 @@ TEST_F(Picker, GoesWithItsOwnersAndLeavesNoQuitBehind) {
     }
 }
 
+TEST_F(Picker, LeavesTheListOfFramesToTheUser) {
+    struct Case {
+        int frame;
+        WORD code;
+        const char* x; // that is shown then
+    };
+
+    const Case cases[] = {{0, CBN_SETFOCUS, "111"},  {0, CBN_KILLFOCUS, "111"},
+                          {0, CBN_SELCHANGE, "111"}, {1, CBN_DROPDOWN, "300"},
+                          {1, CBN_SELCHANGE, "300"}, {1, CBN_CLOSEUP, "300"}};
+    for (const auto& [index, code, x] : cases) {
+        edit("two.zkt");
+        type(X_FIELD, "111");
+        const std::string taken = pick(6, [index = index, code = code] {
+            SelectListedFrame(EditorDialog, index);
+            const auto told = static_cast<WPARAM>(MAKELONG(FRAME_LIST, code));
+            const MSG message{EditorDialog, WM_COMMAND, told, 0, 0};
+            DispatchMessageA(&message);
+            sendKey('4');
+        });
+        EXPECT_EQ(taken, "4") << index << ' ' << code;
+        EXPECT_EQ(shown(X_FIELD), x) << index << ' ' << code;
+        EXPECT_EQ(joined({frame(0).pose, frame(1).pose}), "1,2") << "nothing is committed";
+    }
+}
+
 } // namespace
