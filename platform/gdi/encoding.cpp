@@ -43,8 +43,12 @@ QString fromWindows1252(const char* text, std::size_t length) {
 
 std::string toWindows1252(const QString& text) {
     std::string result;
+    bool high = false; // the first half of a pair has gone in, which is one character
     for (const QChar character : text) {
-        result += byteOf(character).value_or('?');
+        if (!high || !character.isLowSurrogate()) {
+            result += byteOf(character).value_or('?');
+        }
+        high = character.isHighSurrogate();
     }
     return result;
 }

@@ -178,6 +178,10 @@ TEST_F(Dialogs, HoldWhatIsTypedToItsLimitAndGiveItAsBytes) {
     EXPECT_EQ(text(10), "\x80"
                         "a?b");
     EXPECT_EQ(child<QLineEdit>().text(), QStringLiteral("\u20ACa?b")) << "what is kept shows";
+    child<QLineEdit>().setSelection(0, 3);
+    child<QLineEdit>().insert(QStringLiteral("\U0001F600")); // one character, though two units
+    EXPECT_EQ(child<QLineEdit>().text(), QStringLiteral("?b"));
+    EXPECT_EQ(child<QLineEdit>().cursorPosition(), 1);
     SetDlgItemTextA(dialog, 10, "longer"); // the program may
     EXPECT_EQ(text(10), "longer");
     SendDlgItemMessageA(dialog, 11, EM_LIMITTEXT, 5, 0);
@@ -190,6 +194,9 @@ TEST_F(Dialogs, HoldWhatIsTypedToItsLimitAndGiveItAsBytes) {
     EXPECT_EQ(lines.toPlainText(), QStringLiteral("ab\n?d"));
     lines.undo();
     EXPECT_EQ(lines.toPlainText(), QStringLiteral("ab\ncd")) << "whole";
+    lines.selectAll();
+    lines.insertPlainText(QStringLiteral("\U0001F600x\U0001F600\U0001F600yz"));
+    EXPECT_EQ(text(11), "?x??y") << "as much as there is room for";
     SetDlgItemTextA(dialog, 11, "a\xA0\x62\r\r"); // a hard blank stays one
     EXPECT_EQ(text(11), "a\xA0\x62\r\r");
     SetDlgItemTextA(dialog, 11, "\xC3\xA9\rx"); // two letters, not one of UTF-8

@@ -13,8 +13,8 @@ namespace seam {
 
 namespace {
 
-/// What stays of a text in the program's character set: as long as it was, with a question mark for
-/// whatever has no byte there. The user sees at once what is kept.
+/// What stays of a text in the program's character set, with a question mark for each character
+/// that has no byte there. The user sees at once what is kept.
 QString keptText(const QString& typed) {
     const std::string bytes = toWindows1252(typed);
     return fromWindows1252(bytes.data(), bytes.size());
@@ -24,7 +24,8 @@ class KeptText : public QValidator {
   public:
     using QValidator::QValidator;
 
-    State validate(QString& typed, int& /*cursor*/) const override {
+    State validate(QString& typed, int& cursor) const override {
+        cursor = static_cast<int>(keptText(typed.left(cursor)).size());
         typed = keptText(typed);
         return Acceptable;
     }
@@ -115,29 +116,33 @@ class TextEdit : public Control {
   private:
     /// What was typed or pasted goes in as far as there is room for it. Undo takes it out whole.
     void holdToLimit() {
-        const qsizetype size = edit_->toPlainText().size();
-        const qsizetype excess = limit_ > 0 ? std::min(size - limit_, size - accepted_) : 0;
         const QSignalBlocker quiet(edit_);
         QTextCursor cursor = edit_->textCursor();
         cursor.joinPreviousEditBlock();
+        keepBytes(edit_->textCursor());
+        const qsizetype size = edit_->toPlainText().size();
+        const qsizetype excess = limit_ > 0 ? std::min(size - limit_, size - accepted_) : 0;
         if (excess > 0) {
             cursor.movePosition(QTextCursor::Left, QTextCursor::KeepAnchor,
                                 static_cast<int>(excess));
             cursor.removeSelectedText();
         }
-        keepBytes(cursor);
         cursor.endEditBlock();
         accepted_ = edit_->toPlainText().size();
     }
 
+    /// From the end, as a character may become shorter.
     void keepBytes(QTextCursor cursor) const {
         const QString typed = edit_->toPlainText();
-        const QString kept = keptText(typed);
-        for (qsizetype at = 0; at < typed.size(); ++at) {
-            if (typed[at] != kept[at]) {
+        for (qsizetype end = typed.size(), at = 0; end > 0; end = at) {
+            const bool pair =
+                end > 1 && typed[end - 1].isLowSurrogate() && typed[end - 2].isHighSurrogate();
+            at = end - (pair ? 2 : 1);
+            const QString one = typed.mid(at, end - at);
+            if (const QString kept = keptText(one); kept != one) {
                 cursor.setPosition(static_cast<int>(at));
-                cursor.deleteChar();
-                cursor.insertText(kept.mid(at, 1));
+                cursor.setPosition(static_cast<int>(end), QTextCursor::KeepAnchor);
+                cursor.insertText(kept);
             }
         }
     }
