@@ -285,6 +285,11 @@ TEST_F(Dialogs, TellWhoCannotSeeWhatTheyAre) {
     };
     EXPECT_EQ(nameOf(button("&Tick")), QStringLiteral("Tick"));
     EXPECT_EQ(nameOf(child<QListView>()), QStringLiteral("Names"));
+    SendDlgItemMessageA(dialog, 13, CB_ADDSTRING, 0, 71);
+    SendDlgItemMessageA(dialog, 13, CB_ADDSTRING, 0, 72);
+    SendDlgItemMessageA(dialog, 13, CB_SETCURSEL, 1, 0);
+    EXPECT_EQ(nameOf(*widget->findChildren<QComboBox*>().at(1)), QStringLiteral("2"))
+        << "a picture, by its number";
     EXPECT_EQ(QAccessible::queryAccessibleInterface(&button("&Left"))->role(),
               QAccessible::RadioButton);
 }
