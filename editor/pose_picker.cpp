@@ -160,6 +160,7 @@ int CreatePoseWindow(HINSTANCE instance, HWND owner) {
     if (!PoseWindow) {
         return 0;
     }
+    SetWindowTextA(PoseWindow, "Choose a Pose, 1 to 8"); // for lists of windows: it shows no title
     ShowWindow(PoseWindow, SW_SHOWNORMAL);
     UpdateWindow(PoseWindow);
     return 1;

@@ -14,7 +14,7 @@ class Editing : public Run {
     static constexpr QRect stage{25, 42, 590, 380};
     static constexpr QRect picker{35, 95, 570, 290};
     static constexpr const char* editor = "Fenky Dorbo Toon File Editor";
-    static constexpr const char* pickersTitle = "dorbo"; // it has none of its own
+    static constexpr const char* pickersTitle = "Choose a Pose, 1 to 8";
 
     Editing() : Run(screen.size()) {}
 
