@@ -17,6 +17,7 @@
 #include <QCloseEvent>
 #include <QKeyEvent>
 #include <QLabel>
+#include <QMenu>
 #include <QMenuBar>
 #include <QPushButton>
 #include <QRadioButton>
@@ -259,6 +260,13 @@ bool DialogWindow::hasDefaultButton() const {
                        [](const QPushButton* button) { return button->isDefault(); });
 }
 
+/// As the underlined letter does: with its first item marked.
+void DialogWindow::openFirstMenu() {
+    QAction* const first = menuBar_->actions().value(0);
+    menuBar_->setActiveAction(first);
+    first->menu()->setActiveAction(first->menu()->actions().value(0));
+}
+
 void DialogWindow::keyPressEvent(QKeyEvent* event) {
     const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
     if (enter && !hasDefaultButton()) {
@@ -268,7 +276,7 @@ void DialogWindow::keyPressEvent(QKeyEvent* event) {
     }
     if (event->key() == Qt::Key_F10 && event->modifiers() == Qt::NoModifier &&
         menuBar_ != nullptr) {
-        menuBar_->setActiveAction(menuBar_->actions().value(0));
+        openFirstMenu();
         return;
     }
     QDialog::keyPressEvent(event);

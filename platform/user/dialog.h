@@ -46,6 +46,7 @@ class DialogWindow : public QDialog {
 
   private:
     bool hasDefaultButton() const;
+    void openFirstMenu();
     void command(int id);
 
     HWND handle_;

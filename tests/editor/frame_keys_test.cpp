@@ -137,6 +137,16 @@ TEST_F(FrameKeys, EnterAndEscapeDoNothingInItsFields) {
     }
 }
 
+TEST_F(FrameKeys, F10OpensTheFirstMenuWithItsFirstItemMarked) {
+    edit("two.zkt");
+    QTest::keyClick(&field(X_FIELD), Qt::Key_F10);
+    QWidget* const menu = QApplication::activePopupWidget();
+    ASSERT_NE(menu, nullptr);
+    QTest::keyClick(menu, Qt::Key_Return);
+    pass(0);
+    EXPECT_EQ(title(), "File: [Untitled]") << "New";
+}
+
 TEST_F(FrameKeys, OfTwoCommandsAtOnceADialogOfTheFirstDropsTheSecond) {
     struct Case {
         int first, second;
