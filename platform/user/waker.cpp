@@ -5,6 +5,7 @@
 
 #include <QApplication>
 #include <QDialog>
+#include <QDrag>
 #include <QTimer>
 
 #include <algorithm>
@@ -71,6 +72,8 @@ void rejectToolkitModal() {
         popup->close();
     } else if (auto* dialog = qobject_cast<QDialog*>(QApplication::activeModalWidget())) {
         dialog->reject();
+    } else {
+        QDrag::cancel(); // text that is dragged out of a field
     }
 }
 

@@ -17,7 +17,8 @@ void wakeToolkitLoop();
 /// does nothing. The queue supplies it; the waker calls it.
 void drainWithinToolkitLoop();
 
-/// Closes the menu of the toolkit that is open, or else ends its innermost box as its Cancel would.
+/// Closes the menu of the toolkit that is open, or else ends its innermost box as its Cancel would,
+/// or else a drag.
 void rejectToolkitModal();
 
 } // namespace seam
