@@ -24,22 +24,26 @@ int StartFrameEditor(HWND dialog);
 /// Asks about unsaved changes, and closes.
 int ExitFrameEditor(HWND dialog);
 
-/// Closes without a question. Changes that are still unsaved give way to the file's state.
+/// Closes without a question. Changes that are still unsaved give way to the file's state; if that
+/// can't be read the Toon has no name any more.
 int CloseFrameEditor(HWND dialog);
 
 /// Adds a frame of zeros at the end and shows it; above 250 frames a message instead.
 int NewFrame(HWND dialog);
 
-/// Adds a frame of zeros before the current one and shows it; above 250 frames a message instead.
+/// Adds a frame of zeros before the one that the list names and shows it; above 250 frames a message
+/// instead.
 int InsertFrame(HWND dialog);
 
-/// Takes the current frame out and shows the one that takes its place, or the last; the only frame
-/// is cleared instead.
+/// Takes the frame that the list names out and shows the one that takes its place, or the last; the
+/// only frame is cleared instead.
 int DeleteFrame(HWND dialog);
 
 /// Has the user pick a pose. Marks the Toon as changed whatever comes of it.
 void ChoosePose(HINSTANCE instance, HWND dialog);
 
+/// Asks for a name and writes the Toon under it, without the fields. The name stays also if the
+/// write fails. 1 if it has been written.
 int SaveToonAs(HWND dialog);
 
 /// Asks for a name if there is none. 0 also if there is nothing to save.
@@ -48,5 +52,6 @@ int SaveToonCommand(HWND dialog);
 /// Opens another Toon. One that doesn't load leaves a new untitled one behind the fields, so that
 /// no save can write over its file.
 int OpenToonInEditor(HWND dialog);
-/// 1 also if the user has stopped it.
+
+/// Begins a new Toon, once the user has been asked about unsaved changes. 1, also if he stopped it.
 int NewToonInEditor(HWND dialog);

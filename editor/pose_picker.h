@@ -5,7 +5,8 @@
 #include "platform/user.h"
 
 /// Runs the picker and gives the chosen pose, 0 to 7; the current one, held to that range, if the
-/// window was closed without a choice, and 0 if it can't be made.
+/// window was closed without a choice, and 0 if it can't be made. With a picker up already, the
+/// current one as it is.
 LONG RunPosePicker(HINSTANCE instance, HWND owner, LONG currentPose);
 
 int PoseClassSetup(HINSTANCE instance);

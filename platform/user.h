@@ -88,7 +88,9 @@ BOOL PeekMessageA(MSG* message, HWND window, UINT lowest, UINT highest, UINT rem
 /// Stands in every loop; gives FALSE: text is typed into controls, which translate for themselves.
 BOOL TranslateMessage(const MSG* message);
 
-/// Hands the message to the window's procedure and gives its result; 0 if the window has gone.
+/// Hands the message to the window's procedure and gives its result; 0 if the window has gone, and
+/// for a WM_COMMAND to a window that a dialog has disabled since: it came from what the user did
+/// before.
 LRESULT DispatchMessageA(const MSG* message);
 
 /// Runs the window's procedure on this stack and gives its result.

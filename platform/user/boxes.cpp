@@ -7,7 +7,9 @@
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
 
+#include <QAbstractButton>
 #include <QApplication>
+#include <QKeyEvent>
 #include <QMessageBox>
 
 #include <cstdio>
@@ -30,6 +32,39 @@ QMessageBox::Icon iconOf(UINT type) {
         return QMessageBox::NoIcon;
     }
 }
+
+/// A key presses its buttons at once. The toolkit would show them down for a tenth of a second
+/// first, and the keys that come within that time would be the box's, too.
+class Box : public Overlay<QMessageBox> {
+  public:
+    using Overlay::Overlay;
+
+    bool eventFilter(QObject* watched, QEvent* event) override {
+        auto* const button = qobject_cast<QAbstractButton*>(watched);
+        if (button == nullptr || event->type() != QEvent::Shortcut) {
+            return Overlay::eventFilter(watched, event);
+        }
+        button->click();
+        return true;
+    }
+
+  protected:
+    void showEvent(QShowEvent* event) override {
+        Overlay::showEvent(event);
+        for (QAbstractButton* button : buttons()) {
+            button->installEventFilter(this);
+        }
+    }
+
+    void keyPressEvent(QKeyEvent* event) override {
+        Overlay::keyPressEvent(event);
+        for (QAbstractButton* button : buttons()) {
+            if (button->isDown() && event->key() != Qt::Key_Space) {
+                button->click();
+            }
+        }
+    }
+};
 
 /// A box that was closed without a button counts as cancelled where it asks.
 int answerOf(int button, bool asks) {
@@ -63,7 +98,7 @@ int MessageBoxA(HWND owner, const char* text, const char* caption, UINT type) {
         return 0;
     }
     // On the heap and without a parent: the owner may be destroyed while the box is up.
-    const auto box = std::make_unique<Overlay<QMessageBox>>(topLevelOf(owner));
+    const auto box = std::make_unique<Box>(topLevelOf(owner));
     box->setWindowTitle(shownText(title));
     box->setText(shownText(text));
     box->setTextFormat(Qt::PlainText);

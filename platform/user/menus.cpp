@@ -64,6 +64,7 @@ QAction* runMenu(QMenu& shown, const Window& window, QPoint at) {
     QObject::connect(&objectOf(window), &QObject::destroyed, &shown, &QWidget::close);
     flushWindows();
     wakeToolkitLoop();
+    const ToolkitLoop loop(shown);
     return shown.exec(at);
 }
 

@@ -1,6 +1,8 @@
 #include "platform/user/ordered_input.h"
 
+#include "platform/user/activation.h"
 #include "platform/user/queue.h"
+#include "platform/user/waker.h"
 
 #include <QKeyEvent>
 #include <QPointer>
@@ -22,7 +24,7 @@ namespace seam {
 namespace {
 
 struct WaitingEvent {
-    QPointer<QWindow> window;
+    QPointer<QWindow> window; // null for composed text, which goes where the keyboard is
     std::unique_ptr<QEvent> event;
 };
 
@@ -36,28 +38,42 @@ bool isKey(const QEvent& event) {
     return event.type() == QEvent::KeyPress || event.type() == QEvent::KeyRelease;
 }
 
-bool isButton(const QEvent& event) {
-    return event.type() == QEvent::MouseButtonPress ||
-           event.type() == QEvent::MouseButtonDblClick ||
-           event.type() == QEvent::MouseButtonRelease || event.type() == QEvent::Wheel;
+/// Whether it goes where the keyboard is.
+bool isTyped(const QEvent& event) {
+    return isKey(event) || event.type() == QEvent::ShortcutOverride ||
+           event.type() == QEvent::InputMethod;
+}
+
+bool isClick(const QEvent& event) {
+    switch (event.type()) {
+    case QEvent::MouseButtonPress:
+    case QEvent::MouseButtonDblClick:
+    case QEvent::MouseButtonRelease:
+    case QEvent::Wheel:
+        return true;
+    case QEvent::Close:
+        return !toolkitLoopIsInnermost(); // a box that has its answer closes by one, too
+    case QEvent::MouseMove:
+        return !waiting().empty(); // only so that it doesn't overtake a button
+    default:
+        return false;
+    }
 }
 
 /// Whether something that came before this has yet to be seen to.
 bool isBehind() {
-    return !toolkitLoopIsInnermost() && (!waiting().empty() || messagesWait());
+    return !waiting().empty() || (toolkitLoopIsInnermost() ? toolkitLoopIsOver() : messagesWait());
 }
 
-/// A move waits only so that it doesn't overtake a button.
 bool hasToWait(const QEvent& event) {
-    const bool move = event.type() == QEvent::MouseMove && !waiting().empty();
-    return (isKey(event) || isButton(event) || move) && isBehind();
+    return isTyped(event) ? isBehind() || keyboardIsOnItsWay() : isClick(event) && isBehind();
 }
 
-/// The window that a key is for by now. A box that has just come up may not have the keyboard yet,
-/// but nobody else gets a key meanwhile.
-QWindow* keyWindow() {
+/// Whether the toolkit's box that is up keeps the user from this window. Menus see to theirs.
+bool isBarred(const QWindow& window) {
     const QWidget* box = QApplication::activeModalWidget();
-    return box != nullptr ? box->windowHandle() : QGuiApplication::focusWindow();
+    return box != nullptr && box->windowHandle() != &window &&
+           QApplication::activePopupWidget() == nullptr;
 }
 
 /// Whether an underlined letter or a shortcut took the key.
@@ -69,40 +85,54 @@ bool takenAsShortcut(QWindow& window, const QKeyEvent& key) {
 }
 
 /// Not sendEvent: fields take the focus only for what the user himself did.
-void handOver(QWindow& window, QEvent& event) {
-    qApp->QApplication::notify(&window, &event);
+void handOver(QObject& receiver, QEvent& event) {
+    qApp->QApplication::notify(&receiver, &event);
+}
+
+void handOverKey(QWindow& window, QKeyEvent& key) {
+    if (!takenAsShortcut(window, key)) {
+        handOver(window, key);
+    }
 }
 
 } // namespace
 
 bool OrderedApplication::notify(QObject* receiver, QEvent* event) {
-    if (!event->spontaneous() || !receiver->isWindowType()) {
+    const bool fromUser =
+        (event->spontaneous() && receiver->isWindowType()) || event->type() == QEvent::InputMethod;
+    if (!fromUser || !hasToWait(*event)) {
         return QApplication::notify(receiver, event);
     }
-    if (event->type() == QEvent::ShortcutOverride && isBehind()) {
+    if (event->type() == QEvent::ShortcutOverride) {
         event->accept(); // the press itself comes next
         return true;
     }
-    if (hasToWait(*event)) {
-        waiting().push_back(
-            {static_cast<QWindow*>(receiver), std::unique_ptr<QEvent>(event->clone())});
-        return true;
-    }
-    return QApplication::notify(receiver, event);
+    waiting().push_back(
+        {qobject_cast<QWindow*>(receiver), std::unique_ptr<QEvent>(event->clone())});
+    event->setAccepted(event->type() != QEvent::Close);
+    wake();
+    return true;
 }
 
 bool handOverInput() {
-    if (waiting().empty()) {
+    if (waiting().empty() || (isTyped(*waiting().front().event) && keyboardIsOnItsWay())) {
         return false;
     }
     const WaitingEvent next = std::move(waiting().front());
     waiting().pop_front();
-    const bool key = isKey(*next.event);
-    QWindow* const wanted = key ? keyWindow() : nullptr;
-    QWindow* const window = wanted != nullptr ? wanted : next.window.data();
-    if (window != nullptr && window->isVisible() &&
-        !(key && takenAsShortcut(*window, static_cast<QKeyEvent&>(*next.event)))) {
-        handOver(*window, *next.event);
+    QEvent& event = *next.event;
+    QWindow* const focused = QGuiApplication::focusWindow();
+    QWindow* const window = isKey(event) && focused != nullptr ? focused : next.window.data();
+    if (event.type() == QEvent::InputMethod) {
+        if (QObject* const object = QGuiApplication::focusObject()) {
+            handOver(*object, event);
+        }
+    } else if (window == nullptr || !window->isVisible() || isBarred(*window)) {
+        return true; // it goes to nobody
+    } else if (isKey(event)) {
+        handOverKey(*window, static_cast<QKeyEvent&>(event));
+    } else {
+        handOver(*window, event);
     }
     return true;
 }

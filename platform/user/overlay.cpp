@@ -1,5 +1,6 @@
 #include "platform/user/overlay.h"
 
+#include "platform/user/activation.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
 #include "platform/user/waker.h"
@@ -83,8 +84,9 @@ int execOver(QDialog& dialog, QWindow* under) {
     dialog.winId();                       // makes its window
     bringForward(*dialog.windowHandle()); // before it is seen, to hear of that
     dialog.show();
-    dialog.activateWindow();
+    activate(*dialog.windowHandle());
     wakeToolkitLoop();
+    const ToolkitLoop loop(dialog);
     return dialog.exec();
 }
 

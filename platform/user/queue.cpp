@@ -198,7 +198,8 @@ void drainWithinToolkitLoop() {
         return;
     }
     const int level = ownLevel; // a handler may run a loop of the program's, which sets it
-    while (handOverInput()) {   // in the order in which this loop would have had it
+    while (!toolkitLoopIsOver() &&
+           handOverInput()) { // in the order in which this loop would have had it
     }
     MSG message{};
     int handled = 0;

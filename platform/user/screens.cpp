@@ -1,5 +1,6 @@
 #include "platform/user/screens.h"
 
+#include "platform/user/activation.h"
 #include "platform/user/cursors.h"
 #include "platform/user/grabs.h"
 #include "platform/user/native_window.h"
@@ -244,10 +245,10 @@ void raiseInFront(QWindow& window) {
     const std::vector<QWindow*>& windows = windowsInFront();
     if (screens && std::find(windows.begin(), windows.end(), &window) != windows.end()) {
         screens->raise();
-        windows.back()->requestActivate();
+        windows.back()->requestActivate(); // it holds the keyboard anyway
     } else {
         window.raise();
-        window.requestActivate();
+        activate(window);
     }
 }
 

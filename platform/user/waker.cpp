@@ -10,6 +10,7 @@
 
 #include <algorithm>
 #include <limits>
+#include <vector>
 
 namespace seam {
 
@@ -51,6 +52,12 @@ class Waker : public QObject {
     std::optional<std::int64_t> deadline_;
 };
 
+/// What the running loops show, the innermost one last.
+std::vector<const QWidget*>& shownInLoops() {
+    static auto* const widgets = new std::vector<const QWidget*>;
+    return *widgets;
+}
+
 /// Made after the application object and, like it, kept until the process ends.
 Waker& waker() {
     static auto* const instance = new Waker;
@@ -65,6 +72,18 @@ void armWaker(std::optional<std::int64_t> deadline) {
 
 void wakeToolkitLoop() {
     QCoreApplication::postEvent(&waker(), new QEvent(QEvent::User));
+}
+
+ToolkitLoop::ToolkitLoop(const QWidget& shown) {
+    shownInLoops().push_back(&shown);
+}
+
+ToolkitLoop::~ToolkitLoop() {
+    shownInLoops().pop_back();
+}
+
+bool toolkitLoopIsOver() {
+    return !shownInLoops().empty() && !shownInLoops().back()->isVisible();
 }
 
 void rejectToolkitModal() {

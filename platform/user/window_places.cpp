@@ -2,6 +2,7 @@
 #include "platform/user/window.h"
 
 #include "platform/harness.h"
+#include "platform/user/activation.h"
 #include "platform/user/controls/control.h"
 #include "platform/user/cursors.h"
 #include "platform/user/dialog.h"
@@ -90,7 +91,7 @@ void showWindow(HWND handle) {
         invalidate(*window, {0, 0, window->width(), window->height()}, true);
         widget.show();
         if (!window->control) {
-            widget.activateWindow();
+            activate(*widget.windowHandle());
         }
         return;
     }
@@ -101,7 +102,7 @@ void showWindow(HWND handle) {
     }
     window->native->show();
     if (!window->parent && !window->topmost) {
-        window->native->requestActivate(); // without a window manager nobody else sees to that
+        activate(*window->native); // without a window manager nobody else sees to that
     }
 }
 
@@ -288,7 +289,7 @@ HWND SetFocus(HWND window) {
     if (found != nullptr && found->control) {
         QWidget& widget = found->control->widget();
         if (!widget.isActiveWindow()) {
-            widget.activateWindow();
+            activate(*widget.window()->windowHandle());
         }
         widget.setFocus();
     } else if (focus && topLevelOf(control) == topLevelOf(focus)) {

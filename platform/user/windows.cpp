@@ -4,6 +4,7 @@
 #include "platform/gdi/surface.h"
 #include "platform/harness.h"
 #include "platform/trace.h"
+#include "platform/user/activation.h"
 #include "platform/user/controls/control.h"
 #include "platform/user/dialog.h"
 #include "platform/user/foreign.h"
@@ -127,7 +128,7 @@ void passActivationOn(const Window& window) {
         }
     });
     if (next != nullptr) {
-        next->requestActivate();
+        activate(*next);
     }
 }
 

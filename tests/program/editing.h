@@ -4,9 +4,34 @@
 
 #include "tests/program/run.h"
 
+#include <cstring>
+#include <fstream>
+
 #include <QPainter>
 
 namespace ground {
+
+/// A Toon's file: length|caption|stage|frames|speed|tile, and "x,y pose pause wink text" of each
+/// frame.
+inline std::vector<std::string> told(const std::filesystem::path& toon) {
+    std::ifstream file(toon, std::ios::binary);
+    std::string bytes{std::istreambuf_iterator<char>(file), {}};
+    const std::string length = std::to_string(bytes.size());
+    bytes.resize(std::max<std::size_t>(bytes.size(), 104) / 92 * 92 + 12);
+    const auto number = [&](std::size_t at, std::size_t size = 4) {
+        std::int32_t value = 0;
+        std::memcpy(&value, &bytes[at], size);
+        return std::to_string(value);
+    };
+    std::vector<std::string> lines{length + "|" + &bytes[36] + "|" + number(88, 2) + "x" +
+                                   number(90, 2) + "|" + number(92) + "|" + number(96) + "|" +
+                                   number(100)};
+    for (std::size_t at = 104; at < bytes.size(); at += 92) {
+        lines.push_back(number(at) + "," + number(at + 4) + " " + number(at + 8) + " " +
+                        number(at + 12) + " " + number(at + 16) + " " + &bytes[at + 20]);
+    }
+    return lines;
+}
 
 class Editing : public Run {
   protected:
@@ -49,6 +74,12 @@ class Editing : public Run {
         QImage empty(stage.size(), QImage::Format_RGB32);
         QPainter(&empty).fillRect(empty.rect(), QBrush(loadPicture(tile)));
         return ground.grab().copy(part) == empty.copy(part.translated(-stage.topLeft()));
+    }
+
+    void expectFile(const std::vector<std::string>& expected) {
+        const auto file = ground.toons() / "mine.zkt";
+        EXPECT_TRUE(waitFor([&] { return told(file) == expected; }))
+            << testing::PrintToString(told(file));
     }
 
     /// From the setup, which has been started.

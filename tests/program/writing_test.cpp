@@ -3,7 +3,6 @@
 #include "tests/program/editing.h"
 
 #include <csignal>
-#include <cstring>
 #include <sstream>
 
 namespace {
@@ -30,7 +29,6 @@ const Entry entries[] = {{"Good morning!", {160, 200}, 2, false, true, "1"},
                          {"Or there, in three\n\nlines?", {140, 120}, 7, true, true, "1"},
                          {"Bye", {200, 180}, 4, false, false, " 1"}};
 
-/// The file: length|caption|stage|frames|speed|tile, and "x,y pose pause wink text" of each frame.
 const std::vector<std::string> written{"656|Tea for one|590x380|6|5|3",
                                        "160,200 1 1 1 Good morning!",
                                        "170,260 4 1 0 Two\rlines",
@@ -38,26 +36,6 @@ const std::vector<std::string> written{"656|Tea for one|590x380|6|5|3",
                                        "210,200 0 1 0 Here?",
                                        "140,120 6 1 1 Or there, in three\r\rlines?",
                                        "200,180 3 1 0 Bye"};
-
-std::vector<std::string> told(const std::filesystem::path& toon) {
-    std::ifstream file(toon, std::ios::binary);
-    std::string bytes{std::istreambuf_iterator<char>(file), {}};
-    const std::string length = std::to_string(bytes.size());
-    bytes.resize(std::max<std::size_t>(bytes.size(), 104) / 92 * 92 + 12);
-    const auto number = [&](std::size_t at, std::size_t size = 4) {
-        std::int32_t value = 0;
-        std::memcpy(&value, &bytes[at], size);
-        return std::to_string(value);
-    };
-    std::vector<std::string> lines{length + "|" + &bytes[36] + "|" + number(88, 2) + "x" +
-                                   number(90, 2) + "|" + number(92) + "|" + number(96) + "|" +
-                                   number(100)};
-    for (std::size_t at = 104; at < bytes.size(); at += 92) {
-        lines.push_back(number(at) + "," + number(at + 4) + " " + number(at + 8) + " " +
-                        number(at + 12) + " " + number(at + 16) + " " + &bytes[at + 20]);
-    }
-    return lines;
-}
 
 class Writing : public Editing {
   protected:
@@ -90,12 +68,6 @@ class Writing : public Editing {
         }
         waitForWindow(title);
         keys({"alt+v"});
-    }
-
-    void expectFile(const std::vector<std::string>& expected) {
-        const auto file = ground.toons() / "mine.zkt";
-        EXPECT_TRUE(waitFor([&] { return told(file) == expected; }))
-            << testing::PrintToString(told(file));
     }
 
     void playToTheEnd() {

@@ -188,8 +188,10 @@ class ComboBox : public Control {
         const int place = row < 0 ? box_->count() : std::min(row, box_->count());
         const int before = box_->currentIndex();
         if (drawn_) {
-            box_->insertItem(place, QString::number(box_->count() + 1), // for screen readers alone
-                             QVariant::fromValue<qulonglong>(static_cast<std::uintptr_t>(item)));
+            box_->insertItem(
+                place,
+                QString::number(box_->count() + 1), // for screen readers, and to find it by digits
+                QVariant::fromValue<qulonglong>(static_cast<std::uintptr_t>(item)));
         } else {
             box_->insertItem(place, shownText(reinterpret_cast<const char*>(item)));
         }
