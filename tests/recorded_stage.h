@@ -5,10 +5,13 @@
 #include "platform/harness.h"
 #include "platform/trace.h"
 #include "platform/user.h"
+#include "toon/toon_document.h"
 
 #include <gmock/gmock.h>
 
 #include <algorithm>
+#include <filesystem>
+#include <fstream>
 #include <string>
 #include <vector>
 
@@ -60,6 +63,17 @@ class RecordedStage : public testing::Test {
 
     static std::size_t count(const std::string& event) {
         return events({event}).size();
+    }
+
+    /// Makes a Toon that plays: background 3, speed 5, places scaled by the size if there is one.
+    static void writeToon(const std::filesystem::path& path, const std::vector<ToonFrame>& frames,
+                          const std::string& caption = "", DWORD windowSize = 0) {
+        ToonHeader header{"", TOON_VERSION, "", windowSize, 0, 5, 3};
+        CopyText(header.caption, caption.c_str(), sizeof header.caption);
+        std::ofstream file(path, std::ios::binary);
+        file.write(reinterpret_cast<const char*>(&header), sizeof header);
+        file.write(reinterpret_cast<const char*>(frames.data()),
+                   static_cast<std::streamsize>(frames.size() * sizeof(ToonFrame)));
     }
 
     /// The stage's picture.
