@@ -13,8 +13,6 @@
 std::vector<std::string> HostCalls;
 DWORD RepaintFlag = 1;
 
-// ---- The host -----------------------------------------------------------------------------------
-
 HWND EditorStage;
 HWND EditorDialog;
 
@@ -36,8 +34,6 @@ void DrawProgress(HWND /*mainWindow*/) {}
 void FrameFromClick(LONG x, LONG y) {
     HostCalls.push_back("FrameFromClick " + std::to_string(x) + " " + std::to_string(y));
 }
-
-// ---- The window ---------------------------------------------------------------------------------
 
 static const char* const className = "StageTestClass";
 
