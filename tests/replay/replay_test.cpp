@@ -147,8 +147,7 @@ TEST_P(Scene, RunsAsRecorded) {
 
 INSTANTIATE_TEST_SUITE_P(Editor, Scene,
                          testing::Values("early", "opening", "show", "stops", "other-window",
-                                         "another-toon", "no-pause", "iconified", "new-toon",
-                                         "frame-editor"));
+                                         "another-toon", "no-pause", "new-toon", "frame-editor"));
 
 TEST(Editor, ClosedAtAnyMomentItBeginsAnewAsInAFreshProcess) {
     const Lines show = readLines(here / "traces/editor-show.trace");
