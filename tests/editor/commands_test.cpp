@@ -1,4 +1,4 @@
-// What can be pressed when, and what each command does.
+// What can be pressed when, what each command does, and what drags the window.
 #include "tests/editor/editor_fixture.h"
 
 #include "platform/user/window.h"
@@ -76,38 +76,47 @@ TEST_F(Command, AnItemOfTheMenuDoesWhatItSays) {
 TEST_F(EditorTest, OnlyOkClosesTheAboutBox) {
     openAtRest();
     int asked = 0;
-    const auto answer = [&] {
+    QTimer timer;
+    QObject::connect(&timer, &QTimer::timeout, [&] {
         seam::forEachWindow([&](const seam::Window& window) {
             if (window.dialog) {
                 PostMessageA(window.handle, WM_COMMAND, ++asked == 1 ? IDCANCEL : IDOK, 0);
             }
         });
-    };
-    QTimer timer;
-    QObject::connect(&timer, &QTimer::timeout, answer);
+    });
     timer.start(0);
     key(5003);
     EXPECT_GE(asked, 2);
 }
 
-TEST_F(EditorTest, OpeningAToonShowsItAndWhatFailsChangesNothing) {
+TEST_F(EditorTest, OpeningWhatIsNoToonChangesNothing) {
     openAtRest();
-    EXPECT_EQ(events({"rebuild_backdrop"}).back(), "rebuild_backdrop index=0 tile=bg01");
     for (const char* name : {"", "missing.zkt", "none.zkt"}) {
         openToon(name);
         EXPECT_EQ(IsWindowEnabled(PlayButton), FALSE) << name;
         EXPECT_STREQ(ToonFileName, "") << name;
     }
     EXPECT_EQ(boxes.size(), 2U);
-    openToon("two.zkt");
-    EXPECT_EQ(events({"rebuild_backdrop"}).back(), "rebuild_backdrop index=3 tile=bg03");
-    reach("at frame");
-    openToon("");
-    EXPECT_EQ(stateNow(), "at frame");
-    EXPECT_EQ(FrameCount, 2);
-    openToon("one.zkt");
-    EXPECT_EQ(stateNow(), "idle");
-    EXPECT_EQ(FrameCount, 1);
+}
+
+TEST_F(EditorTest, BarsAndCaptionDragTheWindowAndNothingElseDoes) {
+    openAtRest();
+    const LONG text = CaptionTextRect.left;
+    const LONG end = CaptionTextRect.right;
+    const std::tuple<LONG, LONG, LRESULT> cases[] = {
+        {43, 10, HTNOWHERE},       {44, 10, HTCAPTION},       {100, 2, HTNOWHERE},
+        {100, 3, HTCAPTION},       {100, 19, HTCAPTION},      {100, 20, HTNOWHERE},
+        {text - 6, 10, HTCAPTION}, {text - 5, 10, HTNOWHERE}, {text, 2, HTCAPTION},
+        {end - 1, 21, HTCAPTION},  {end, 10, HTNOWHERE},      {end + 5, 10, HTCAPTION},
+        {726, 10, HTCAPTION},      {727, 10, HTNOWHERE},      {300, 740, HTNOWHERE},
+    };
+    for (const auto& [x, y, what] : cases) {
+        RECT window{};
+        GetWindowRect(EditorMainWindow, &window); // with a border of one pixel
+        const auto point = static_cast<LPARAM>(MAKELONG(window.left + 1 + x, window.top + 1 + y));
+        EXPECT_EQ(SendMessageA(EditorMainWindow, WM_NCHITTEST, 0, point), what) << x << ' ' << y;
+    }
+    EXPECT_EQ(SendMessageA(EditorStage, WM_NCHITTEST, 0, 0), HTCLIENT);
 }
 
 } // namespace

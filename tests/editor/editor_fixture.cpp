@@ -9,6 +9,7 @@
 
 #include <QCoreApplication>
 #include <QMouseEvent>
+#include <QTest>
 #include <QTimer>
 #include <QWidget>
 #include <QWindow>
@@ -103,18 +104,6 @@ void EditorTest::TearDown() {
     seam::answerBoxes(nullptr);
     seam::answerFileDialogs(nullptr);
     ground_.reset();
-}
-
-void EditorTest::putToon(const std::string& name, const std::vector<ToonFrame>& frames) const {
-    ToonHeader header{};
-    header.version = TOON_VERSION;
-    header.speed = 5;
-    header.background = 3;
-    header.windowSize = MAKELONG(1500, 1400); // twice the stage
-    std::ofstream file(toons() / name, std::ios::binary);
-    file.write(reinterpret_cast<const char*>(&header), sizeof header);
-    file.write(reinterpret_cast<const char*>(frames.data()),
-               static_cast<std::streamsize>(frames.size() * sizeof(ToonFrame)));
 }
 
 void EditorTest::putToons() const {
@@ -217,26 +206,20 @@ std::string EditorTest::stateNow() {
     return found.str();
 }
 
-template <class Target>
-static void sendMouse(Target* target, QEvent::Type type, QPoint point) {
-    const bool up = type == QEvent::MouseButtonRelease;
-    QMouseEvent event(type, point, target->mapToGlobal(point), Qt::LeftButton,
-                      up ? Qt::NoButton : Qt::LeftButton, Qt::NoModifier);
-    QCoreApplication::sendEvent(target, &event);
-}
-
 QWidget& widgetOf(HWND window) {
     return seam::widgetOf(*seam::findWindow(window));
 }
 
 void sendMouse(HWND window, QEvent::Type type, QPoint point) {
-    sendMouse(seam::toolkitWindow(*seam::findWindow(window)), type, point);
+    const auto held = type == QEvent::MouseButtonRelease ? Qt::NoButton : Qt::LeftButton;
+    auto* target = seam::toolkitWindow(*seam::findWindow(window));
+    QMouseEvent event(type, point, target->mapToGlobal(point), Qt::LeftButton, held,
+                      Qt::NoModifier);
+    QCoreApplication::sendEvent(target, &event);
 }
 
 void EditorTest::press(HWND button) {
-    QWidget& widget = widgetOf(button);
-    sendMouse(&widget, QEvent::MouseButtonPress, QPoint(6, 6));
-    sendMouse(&widget, QEvent::MouseButtonRelease, QPoint(6, 6));
+    QTest::mouseClick(&widgetOf(button), Qt::LeftButton);
     pass(0);
 }
 

@@ -74,7 +74,11 @@ class EditorTest : public RecordedStage {
         return ground_->toons();
     }
 
-    void putToon(const std::string& name, const std::vector<ToonFrame>& frames) const;
+    /// Recorded on a stage of twice the size.
+    void putToon(const std::string& name, const std::vector<ToonFrame>& frames) const {
+        writeToon(toons() / name, frames, "", MAKELONG(1500, 1400));
+    }
+
     void putToons() const; ///< two.zkt, one.zkt, still.zkt, and none.zkt, which is none
 
     static inline int filesAsked;

@@ -2,7 +2,6 @@
 // openings of the dialogs leave behind.
 #include "tests/editor/frame_fixture.h"
 
-#include "platform/kernel.h"
 #include "platform/user/window.h"
 
 #include <QApplication>
@@ -92,31 +91,24 @@ TEST_F(FrameKeys, AreTheFrameEditorsWhereverTheFocusIs) {
     for (const auto& [code, held, expected] : cases) {
         for (const bool inside : {true, false}) {
             std::string found;
-            run({[] {
-                     ToonFileName[0] = '\0'; // for Save to ask for one
-                     CopyText(ToonDocHeader.magic, ToonMagic, sizeof ToonMagic);
-                     fileGiven = "";
-                     filesAsked = 0;
-                     SetFocus(GetDlgItem(EditorDialog, WINK_CHECK));
-                     return focused() == WINK_CHECK;
-                 },
-                 [inside] {
-                     if (!inside) {
-                         SetFocus(FileButton);
-                     }
-                     return focused() == (inside ? int{WINK_CHECK} : 0);
-                 },
-                 [code = code, held = held] {
-                     record.clear();
-                     QTest::sendKeyEvent(QTest::Click, QApplication::focusWindow(), code, '\0',
-                                         held);
-                     return true;
-                 },
-                 [] { return true; },
-                 [&found] {
-                     found = effect();
-                     return true;
-                 }});
+            const auto focus = [inside] {
+                ToonFileName[0] = '\0'; // for Save to ask for one
+                CopyText(ToonDocHeader.magic, ToonMagic, sizeof ToonMagic);
+                fileGiven = "";
+                filesAsked = 0;
+                SetFocus(inside ? GetDlgItem(EditorDialog, WINK_CHECK) : FileButton);
+                return focused() == (inside ? int{WINK_CHECK} : 0);
+            };
+            const auto press = [code = code, held = held] {
+                record.clear();
+                QTest::sendKeyEvent(QTest::Click, QApplication::focusWindow(), code, '\0', held);
+                return true;
+            };
+            const auto look = [&found] {
+                found = effect();
+                return true;
+            };
+            run({focus, press, [] { return true; }, look});
             const std::string stays = inside ? "" : "to 0";
             EXPECT_EQ(found, *expected == '\0' ? stays : expected)
                 << code << " with the focus " << (inside ? "inside" : "outside");
@@ -189,29 +181,26 @@ TEST_F(FrameKeys, OfTwoCommandsAtOnceADialogOfTheFirstDropsTheSecond) {
 TEST_F(FrameKeys, FiftyOpeningsLeaveNothingBehind) {
     constexpr std::size_t rounds = 50;
     constexpr std::size_t noArrow = 2000; // bytes a round, as the toolkit's heap settles
-    const auto round = [] {
+    constexpr std::size_t warmUp = 30;
+    openAtRest();
+    seam::HandleCounts handles{};
+    std::size_t heap = 0;
+    for (std::size_t i = 0; i < warmUp + rounds; ++i) {
+        handles = i == warmUp ? seam::liveHandles() : handles;
+        heap = i == warmUp ? mallinfo2().uordblks : heap;
         key(KEY_EDIT);
         once([] { return picker() != HWND{}; }, [] { SendMessageA(picker(), WM_KEYDOWN, '4', 0); });
         command(POSE_BUTTON);
         once(configurationStands,
              [] { PostMessageA(FindWindowA("dialog", ToonMagic), WM_COMMAND, IDOK, 0); });
-        command(108);
+        command(ITEM_CONFIGURE);
         answerGiven = IDNO;
         key(KEY_EDIT);
         EXPECT_FALSE(EditorDialog);
         record.clear();
         boxes.clear();
-    };
-    openAtRest();
-    for (int i = 0; i < 30; ++i) {
-        round();
     }
-    const seam::HandleCounts before = seam::liveHandles();
-    const std::size_t heap = mallinfo2().uordblks;
-    for (std::size_t i = 0; i < rounds; ++i) {
-        round();
-    }
-    EXPECT_EQ(seam::liveHandles(), before);
+    EXPECT_EQ(seam::liveHandles(), handles);
     EXPECT_LT(mallinfo2().uordblks, heap + rounds * noArrow);
 }
 

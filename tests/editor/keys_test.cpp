@@ -1,11 +1,9 @@
 // The keys and the menu of the main window, pressed on the toolkit's own windows.
 #include "tests/editor/editor_fixture.h"
 
-#include "platform/kernel.h"
-
 #include <QApplication>
+#include <QDialog>
 #include <QMenu>
-#include <QMessageBox>
 #include <QTest>
 #include <QTimer>
 
@@ -17,10 +15,6 @@ class Keys : public EditorTest {
         return qobject_cast<QMenu*>(QApplication::activePopupWidget());
     }
 
-    static bool menuStands() {
-        return openMenu() != nullptr;
-    }
-
     static bool dialogStands() {
         return qobject_cast<QDialog*>(QApplication::activeWindow()) != nullptr;
     }
@@ -29,32 +23,27 @@ class Keys : public EditorTest {
         return editorStands() && QApplication::focusWindow() != nullptr;
     }
 
-    static void type(Qt::Key key, Qt::KeyboardModifiers held) {
-        QTest::sendKeyEvent(QTest::Click, QApplication::focusWindow(), key, '\0', held);
-    }
-
-    static void closeSoon() {
-        PostMessageA(EditorMainWindow, WM_CLOSE, 0, 0);
+    static void typeOpen() {
+        QTest::sendKeyEvent(QTest::Click, QApplication::focusWindow(), Qt::Key_O, '\0',
+                            Qt::ControlModifier);
     }
 };
 
 TEST_F(Keys, ReachTheEditorWhereverTheFocusIsButNotBehindADialog) {
-    once(hasKeyboard, [] {
-        type(Qt::Key_O, Qt::ControlModifier);
-        once([] { return filesAsked == 1; },
-             [] {
-                 SetFocus(FileButton);
-                 type(Qt::Key_O, Qt::ControlModifier);
-                 once([] { return filesAsked == 2; },
-                      [] {
-                          PostMessageA(EditorMainWindow, WM_COMMAND, POPUP_ABOUT, 0);
-                          once(dialogStands, [] {
-                              type(Qt::Key_O, Qt::ControlModifier);
-                              QTimer::singleShot(50, closeSoon);
-                          });
-                      });
+    once(hasKeyboard, typeOpen);
+    once([] { return filesAsked == 1; },
+         [] {
+             SetFocus(FileButton);
+             typeOpen();
+         });
+    once([] { return filesAsked == 2; },
+         [] {
+             PostMessageA(EditorMainWindow, WM_COMMAND, POPUP_ABOUT, 0);
+             once(dialogStands, [] {
+                 typeOpen();
+                 QTimer::singleShot(50, [] { PostMessageA(EditorMainWindow, WM_CLOSE, 0, 0); });
              });
-    });
+         });
     RunEditor(GetModuleHandleA(nullptr), nullptr, SW_SHOWNORMAL);
     EXPECT_EQ(filesAsked, 2);
 }
@@ -66,17 +55,16 @@ TEST_F(Keys, TheMenuStandsAboveTheFileButtonAndGreysWhatCantBeChosen) {
             openToon("two.zkt");
         }
         std::string shown;
-        once(menuStands, [&] {
-            for (const QAction* item : openMenu()->actions()) {
-                shown += item->isSeparator() ? "-" : item->isEnabled() ? "o" : ".";
-            }
-            EXPECT_EQ(openMenu()->x(), 14 + 11);
-            const int height = 783 - 44 - openMenu()->y();
-            EXPECT_EQ(height % 6, 0) << height;
-            EXPECT_GE(height, 6 * 12);
-            openMenu()->setActiveAction(openMenu()->actions().first());
-            QTest::keyClick(openMenu(), Qt::Key_Return);
-        });
+        once([] { return openMenu() != nullptr; },
+             [&] {
+                 for (const QAction* item : openMenu()->actions()) {
+                     shown += item->isSeparator() ? "-" : item->isEnabled() ? "o" : ".";
+                 }
+                 EXPECT_EQ(openMenu()->x(), 14 + 11);
+                 EXPECT_GE(783 - 44 - openMenu()->y(), 6 * 12);
+                 openMenu()->setActiveAction(openMenu()->actions().first());
+                 QTest::keyClick(openMenu(), Qt::Key_Return);
+             });
         const int before = filesAsked;
         press(FileButton);
         EXPECT_EQ(shown, toonIsOpen ? "ooo-oo" : "oo.-oo");
