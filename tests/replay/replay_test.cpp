@@ -91,12 +91,11 @@ INSTANTIATE_TEST_SUITE_P(Shipped, Toon, testing::Values("intro", "lost-thought",
 // on-the-spot: twice the same place, so that the second walk is one stride; a speed, poses and a
 //     background beyond their range, texts too short to talk in time.
 // no-pause: a frame that was never filled in; the show stands there for good.
-// no-stage: places are used as they stand, one of them half off the stage.
 // half-a-stage: only the height was recorded, and only that axis is scaled.
 // far-away: a walk of more strides than the table holds, and back.
 INSTANTIATE_TEST_SUITE_P(Odd, Toon,
-                         testing::Values("one-frame", "on-the-spot", "no-pause", "no-stage",
-                                         "half-a-stage", "far-away"));
+                         testing::Values("one-frame", "on-the-spot", "no-pause", "half-a-stage",
+                                         "far-away"));
 
 TEST(WalkAbout, RunsAsRecordedWithStatementsAndWithout) {
     ReplayOptions options;
