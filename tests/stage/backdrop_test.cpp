@@ -1,9 +1,4 @@
-#include "stage/backdrop.h"
-
-#include "platform/kernel.h"
-#include "stage/character.h"
 #include "tests/stage/stage_fixture.h"
-#include "toon/settings.h"
 
 namespace {
 
@@ -80,14 +75,15 @@ TEST_F(Backdrop, ShowsTheBigTitleOnceAndThenTheCaptionInTheSaverOnly) {
     repaint();
     EXPECT_NE(pixels(), bare);
     EXPECT_EQ(TitleShown, 0U);
+    PreviewMode = 0;
 }
 
 TEST_F(Backdrop, SavesWhatLiesUnderHimOnlyWhenAsked) {
     const std::vector<DWORD> bare = pixels();
     stand(300, 300);
-    RepaintFlag = 1;
+    StageRepaintFlag = 1;
     repaint();
-    EXPECT_EQ(RepaintFlag, 0U);
+    EXPECT_EQ(StageRepaintFlag, 0U);
     const std::vector<DWORD> standing = pixels();
     EXPECT_NE(standing, bare);
     repaint();

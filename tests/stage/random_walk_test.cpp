@@ -1,10 +1,7 @@
-#include "stage/random_walk.h"
-
 #include "stage/editor_host.h"
 #include "stage/player.h"
 #include "stage/walk.h"
 #include "tests/stage/stage_fixture.h"
-#include "toon/settings.h"
 
 #include <cstring>
 #include <set>
@@ -64,7 +61,6 @@ TEST_F(RandomWalk, ChoosesPlacesWithinTheStageOnBothSidesOfTheMiddle) {
 TEST_F(RandomWalk, NeverSaysTheSameTwiceInARow) {
     int paces = 0;
     int winks = 0;
-    PreviousStatement = 0;
     for (int walk = 0; walk < 500; ++walk) {
         const LONG before = PreviousStatement;
         pick(1);

@@ -1,37 +1,27 @@
 // The Toons that come with the program, as somebody sees them who watches.
 #include "stage/bubble.h"
-#include "stage/character.h"
 #include "stage/player.h"
 #include "stage/walk.h"
 #include "tests/stage/stage_fixture.h"
 
 #include <cstdio>
-#include <filesystem>
 #include <set>
 
 namespace {
-
-namespace fs = std::filesystem;
 
 class ShippedToons : public StageTest {
   protected:
     void SetUp() override {
         StageTest::SetUp();
-        before_ = fs::current_path();
-        fs::current_path(DORBO_TOONS);
-        for (const auto& entry : fs::directory_iterator(fs::path(DORBO_SOURCE_DIR) / "toons")) {
+        for (const auto& entry : std::filesystem::directory_iterator(DORBO_SOURCE_DIR "/toons")) {
             if (entry.path().extension() == ".json") {
                 names.insert(entry.path().stem().string() + ".zkt");
             }
         }
     }
 
-    void TearDown() override {
-        fs::current_path(before_);
-        StageTest::TearDown();
-    }
-
     std::vector<ToonFrame> open(const std::string& name) const {
+        std::filesystem::current_path(DORBO_TOONS);
         EXPECT_EQ(ToonOpenNamed(stage, name.c_str()), 1) << name;
         std::vector<ToonFrame> frames(static_cast<std::size_t>(FrameCount));
         for (LONG index = 0; index < FrameCount; ++index) {
@@ -65,9 +55,6 @@ class ShippedToons : public StageTest {
     }
 
     std::set<std::string> names;
-
-  private:
-    fs::path before_;
 };
 
 /// How much of him is to be seen along one axis, of 130 pixels.

@@ -1,6 +1,5 @@
 // What he shows at a frame beyond himself: the cells of his face, and the bubble.
 #include "stage/bubble.h"
-#include "stage/character.h"
 #include "stage/face.h"
 #include "stage/player.h"
 #include "stage/walk.h"
@@ -73,7 +72,7 @@ TEST_F(Speech, TheBubbleComesOnAndOffWithoutATraceAndOffOnlyOnce) {
     HideBubble(stage);
     EXPECT_EQ(BubbleHidden, 1U);
     EXPECT_EQ(pixels(), before);
-    RepaintFlag = 1;
+    StageRepaintFlag = 1;
     repaint(); // which shows him
     const std::vector<DWORD> drawn = pixels();
     HideBubble(stage);

@@ -2,7 +2,6 @@
 // way stands in the recorded shows.
 #include "stage/walk.h"
 
-#include "stage/character.h"
 #include "tests/stage/stage_fixture.h"
 
 #include <cstdint>
