@@ -15,11 +15,7 @@ TEST_F(EditorTest, ButtonsLabelAndTimersAreThoseOfEachState) {
         EXPECT_EQ(stateNow(), state.name);
         press(PlayButton);
         EXPECT_EQ(stateNow(), state.afterPlay) << state.name;
-    }
-}
-
-TEST_F(EditorTest, OnlyAWalkToAFrameStopsWhenAnotherWindowIsActive) {
-    for (const EditorState& state : editorStates) {
+        // Only a walk to a frame stops when another window is active.
         reach(state.name);
         SendMessageA(EditorMainWindow, WM_ACTIVATE, WA_ACTIVE, 0);
         SendMessageA(EditorMainWindow, WM_ACTIVATE, WA_CLICKACTIVE, 0);
@@ -66,11 +62,11 @@ TEST_F(Command, AKeyDoesWhatItsButtonMayDoAndElseNothing) {
 }
 
 TEST_F(Command, AnItemOfTheMenuDoesWhatItSays) {
-    EXPECT_EQ(effect("idle", 5000), "asks");
-    EXPECT_EQ(effect("idle", 5001), "edits");
-    EXPECT_EQ(effect("idle", 5002), "to a frame");
-    EXPECT_EQ(effect("pause", 5004), "closes");
-    EXPECT_EQ(effect("idle", 5005), "");
+    EXPECT_EQ(effect("idle", POPUP_OPEN), "asks");
+    EXPECT_EQ(effect("idle", POPUP_EDIT), "edits");
+    EXPECT_EQ(effect("idle", POPUP_PLAY), "to a frame");
+    EXPECT_EQ(effect("pause", POPUP_EXIT), "closes");
+    EXPECT_EQ(effect("idle", POPUP_EXIT + 1), "");
 }
 
 TEST_F(EditorTest, OnlyOkClosesTheAboutBox) {
