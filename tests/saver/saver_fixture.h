@@ -38,8 +38,11 @@ class SaverTest : public RecordedStage {
             std::filesystem::remove_all(entry);
         }
         for (const std::string& name : names) {
-            name.back() == '/' ? std::filesystem::create_directories(name)
-                               : std::ofstream(name).is_open();
+            if (name.back() == '/') {
+                std::filesystem::create_directories(name);
+            } else {
+                EXPECT_TRUE(std::ofstream(name)) << name;
+            }
         }
     }
 
