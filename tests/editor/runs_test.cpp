@@ -83,6 +83,7 @@ TEST_F(EditorTest, ClosedInAnyStateItsStageBeginsClean) {
         EXPECT_EQ(SetClassLongA(EditorStage, GCL_HCURSOR, LONG{IDC_ARROW.number}),
                   IDC_ARROW.number);
         EXPECT_EQ(ToonFileName + std::to_string(FrameCount), "1");
+        EXPECT_EQ(CurrentFrameIndex + BackgroundIndex, 0);
         EXPECT_STREQ(CaptionText, "Fenky Dorbo's Rematch");
         record.clear();
         pass(1200);

@@ -50,7 +50,8 @@ TEST_F(ShowChoice, DrawsNoNameThatWouldBeCut) {
 }
 
 TEST_F(ShowChoice, DrawsEveryToonAndNoneTwiceInARow) {
-    for (const Names& entries : {Names{"a.zkt"}, Names{"a.zkt", "A.ZKT", "b.zkt", "intro.zkt"}}) {
+    for (const Names& entries :
+         {Names{"a.zkt"}, Names{"a.zkt", "A.ZKT"}, Names{"a.zkt", "b.zkt", "intro.zkt"}}) {
         setEntries(entries);
         CountToonFiles();
         std::set<std::string> drawn;
