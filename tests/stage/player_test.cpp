@@ -54,13 +54,11 @@ TEST_F(Player, TellsHowFarTheShowHasCome) {
 }
 
 TEST_F(Player, AStageBeginsAtRestWhateverTheLastOneLeft) {
-    openToon({{500, 400, 3, 2, 1, "Hello you there", 0}});
-    PlayNextFrame(stage);
-    ASSERT_TRUE(runUntilEvent("tick timer=TALK"));
-    WalkTimerRunning = AwaitingArrival = RandomWalkActive = WalkingOut = 1;
-    WalkStepIndex = PendingPause = 3;
-    openStage();
-    BubbleHidden = 0;
+    WalkTimerRunning = AwaitingArrival = ShowStarted = Talking = 1;
+    RandomWalkActive = WalkingOut = 1;
+    NextFrameIndex = PendingPause = WalkStepIndex = 3;
+    CopyText(PendingText, "Hello", sizeof PendingText);
+    BubbleHidden = PlayIdle = 0;
     StageBegin();
     EXPECT_EQ(WalkTimerRunning + AwaitingArrival + ShowStarted + Talking, 0U);
     EXPECT_EQ(RandomWalkActive + WalkingOut, 0U);
