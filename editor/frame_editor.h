@@ -31,8 +31,8 @@ int CloseFrameEditor(HWND dialog);
 /// Adds a frame of zeros at the end and shows it; above 250 frames a message instead.
 int NewFrame(HWND dialog);
 
-/// Adds a frame of zeros before the one that the list names and shows it; above 250 frames a message
-/// instead.
+/// Adds a frame of zeros before the one that the list names and shows it; above 250 frames a
+/// message instead.
 int InsertFrame(HWND dialog);
 
 /// Takes the frame that the list names out and shows the one that takes its place, or the last; the

@@ -46,7 +46,7 @@ TEST_F(Busy, KeysAndClicksGoWhereTheyGoInAnIdleProgram) {
     atOneGo({"ctrl+e", "Escape", "ctrl+s"});
     expectFile(fileOf(named, "295,190 0 5 0 2")); // the key behind the answer is the frame editor's
     atOneGo({"ctrl+g", "a", "b", "c", "Return", "ctrl+s"});
-    expectFile(fileOf("abc", "295,190 0 5 0 2")); // the dialog gets what was meant for it
+    expectFile(fileOf("abc", "295,190 0 5 0 2"));     // the dialog gets what was meant for it
     atOneGo({"ctrl+e", "alt+f", "Escape", "ctrl+e"}); // the File menu, between
     waitForWindow(mine);
     atOneGo({"ctrl+e", "ctrl+e", "alt+t", "ctrl+a", "h", "i", "alt+v", "ctrl+s"});
