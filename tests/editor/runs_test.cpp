@@ -25,23 +25,30 @@ void expectNothingLeft(const std::string& what) {
 }
 
 TEST_F(EditorTest, ARunEndsWithItsWindowHoweverThatGoes) {
-    const std::tuple<HWND*, UINT, WPARAM, bool> ways[] = {
+    struct Way {
+        HWND* window;
+        UINT message;
+        WPARAM wParam;
+        bool behindAboutBox;
+    };
+
+    const Way ways[] = {
         {&EditorMainWindow, WM_COMMAND, POPUP_EXIT, false},
         {&EditorMainWindow, WM_CLOSE, 0, false},
         {&EditorStage, WM_CLOSE, 0, false},
         {&EditorMainWindow, WM_ENDSESSION, TRUE, false},
         {&EditorMainWindow, WM_CLOSE, 0, true},
     };
-    for (const auto& [window, message, wParam, behindAboutBox] : ways) {
-        once(editorStands, [&] {
-            if (behindAboutBox) {
+    for (const Way& way : ways) {
+        once(editorStands, [&way] {
+            if (way.behindAboutBox) {
                 postCommand(EditorMainWindow, POPUP_ABOUT);
             }
-            once(behindAboutBox ? dialogStands : editorStands,
-                 [&] { PostMessageA(*window, message, wParam, 0); });
+            once(way.behindAboutBox ? dialogStands : editorStands,
+                 [&way] { PostMessageA(*way.window, way.message, way.wParam, 0); });
         });
         EXPECT_EQ(RunEditor(GetModuleHandleA(nullptr), nullptr, SW_SHOWNORMAL), 0);
-        expectNothingLeft(std::to_string(message));
+        expectNothingLeft(std::to_string(way.message));
     }
 }
 
