@@ -141,6 +141,7 @@ constexpr DWORD WS_CLIPCHILDREN =
     0x02000000; // what is invalidated in it doesn't reach its children
 constexpr DWORD WS_BORDER =
     0x00800000; // a black line round it; of a child of a native window: none
+constexpr DWORD WS_DISABLED = 0x08000000; // of a child in another program's window: no input at all
 constexpr DWORD WS_EX_TOPMOST = 0x00000008;
 
 struct CREATESTRUCTA {
@@ -163,8 +164,11 @@ struct CREATESTRUCTA {
 /// of another. A top-level window with WS_BORDER gives a pixel on each side to that line, and can
 /// hold children of the class "button", which are controls (platform/dialogs.h). A WS_EX_TOPMOST
 /// window that fills the primary monitor goes on filling it when that changes, stays above windows
-/// that appear later, and turns the other monitors black; input there is input to it. Null if the
-/// class is unknown, the parent is no window, WM_CREATE gave -1, or there is no display.
+/// that appear later, and turns the other monitors black; input there is input to it. A child in
+/// another program's window follows that window's size and closes when it goes. If it has
+/// WS_DISABLED too, keys, mouse and pointer pass through it, as if it weren't there, to the window
+/// that it lies in; on the desktop it lies below all other windows. Null if the class is unknown,
+/// the parent is no window, WM_CREATE gave -1, or there is no display.
 HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DWORD style, int x,
                      int y, int width, int height, HWND parent, HMENU menu, HINSTANCE instance,
                      void* parameter);
@@ -226,6 +230,10 @@ HWND SetFocus(HWND window);
 
 /// The window with the keyboard, of this program or another; null if there is none.
 HWND GetForegroundWindow();
+
+/// The window that all others lie in: the display's root window, or the one that a window manager
+/// has put in its place. Null if there is no display.
+HWND GetDesktopWindow();
 
 /// Raises a top-level window and gives it the keyboard; also one that FindWindowA found in another
 /// process of this program.
@@ -305,7 +313,9 @@ constexpr int IDNO = 7;
 
 /// Shows a box over `owner` and waits for its answer; the owner takes no input meanwhile, timers
 /// and paints go on, and the pointer shows. A null caption is the platform's "Error". Bytes that
-/// are valid UTF-8, as in names of files, are shown as that. 0 if it can't be shown.
+/// are valid UTF-8, as in names of files, are shown as that. 0 if it can't be shown. Over a child
+/// in another program's window none is shown, for nobody could answer it: its text goes to stderr,
+/// and it is cancelled.
 int MessageBoxA(HWND owner, const char* text, const char* caption, UINT type);
 
 /// Runs `body` and gives its result; on an exception that nobody caught runs `handler` and gives

@@ -2,6 +2,7 @@
 #include "platform/harness.h"
 #include "platform/kernel.h"
 #include "platform/trace.h"
+#include "platform/user/foreign.h"
 #include "platform/user/overlay.h"
 #include "platform/user/text.h"
 #include "platform/user/toolkit.h"
@@ -66,6 +67,12 @@ class Box : public Overlay<QMessageBox> {
     }
 };
 
+/// Whether the window, or one that it lies in, is a child in another program's window.
+bool liesInHost(HWND window) {
+    const Window* outermost = findWindow(topLevelOf(window));
+    return outermost != nullptr && mayBeForeign(outermost->parent);
+}
+
 /// A box that was closed without a button counts as cancelled where it asks.
 int answerOf(int button, bool asks) {
     switch (button) {
@@ -97,13 +104,17 @@ int MessageBoxA(HWND owner, const char* text, const char* caption, UINT type) {
     if (!toolkit()) {
         return 0;
     }
+    const bool asks = (type & 0xFU) == MB_YESNOCANCEL;
+    if (liesInHost(owner)) {
+        std::fprintf(stderr, "dorbo: %s\n", text);
+        return asks ? IDCANCEL : IDOK;
+    }
     // On the heap and without a parent: the owner may be destroyed while the box is up.
     const auto box = std::make_unique<Box>(topLevelOf(owner));
     box->setWindowTitle(shownText(title));
     box->setText(shownText(text));
     box->setTextFormat(Qt::PlainText);
     box->setIcon(iconOf(type));
-    const bool asks = (type & 0xFU) == MB_YESNOCANCEL;
     box->setStandardButtons(asks ? QMessageBox::Yes | QMessageBox::No | QMessageBox::Cancel
                                  : QMessageBox::StandardButtons(QMessageBox::Ok));
     return answerOf(runOver(*box, owner), asks);

@@ -11,6 +11,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <memory>
+#include <string_view>
 #include <vector>
 #include <xcb/xcb.h>
 
@@ -95,6 +96,47 @@ HostFilter& hostFilter() {
     return *filter;
 }
 
+xcb_window_t rootOf(xcb_connection_t* connection) {
+    return xcb_setup_roots_iterator(xcb_get_setup(connection)).data->root;
+}
+
+/// The number of a name; XCB_ATOM_NONE if nobody has used it yet.
+xcb_atom_t atomOf(xcb_connection_t* connection, std::string_view name) {
+    const auto request =
+        xcb_intern_atom(connection, 1, static_cast<std::uint16_t>(name.size()), name.data());
+    const auto atom = own(xcb_intern_atom_reply(connection, request, nullptr));
+    return atom == nullptr ? xcb_atom_t{XCB_ATOM_NONE} : atom->atom;
+}
+
+/// The window that a property names; 0 if there is none.
+xcb_window_t windowProperty(xcb_connection_t* connection, xcb_window_t window, xcb_atom_t name) {
+    if (name == XCB_ATOM_NONE) {
+        return 0;
+    }
+    const auto request = xcb_get_property(connection, 0, window, name, XCB_ATOM_WINDOW, 0, 1);
+    const auto property = own(xcb_get_property_reply(connection, request, nullptr));
+    xcb_window_t named = 0;
+    if (property != nullptr && xcb_get_property_value_length(property.get()) == sizeof named) {
+        std::memcpy(&named, xcb_get_property_value(property.get()), sizeof named);
+    }
+    return named;
+}
+
+/// Asks to be told of a window's size and end, beside what this connection is told of it already:
+/// the toolkit follows the root window. Whether there is such a window.
+bool watchStructure(xcb_connection_t* connection, xcb_window_t window) {
+    const auto now = own(xcb_get_window_attributes_reply(
+        connection, xcb_get_window_attributes(connection, window), nullptr));
+    if (now == nullptr) {
+        return false;
+    }
+    const std::uint32_t mask = now->your_event_mask | XCB_EVENT_MASK_STRUCTURE_NOTIFY;
+    const auto request =
+        xcb_change_window_attributes_checked(connection, window, XCB_CW_EVENT_MASK, &mask);
+    // It may have gone since we looked: the error is ours to take, not the toolkit's to print.
+    return own(xcb_request_check(connection, request)) == nullptr;
+}
+
 } // namespace
 
 bool foreignExists(HWND window) {
@@ -128,22 +170,31 @@ bool windowsAreManaged() {
     }
     // A window manager tells of itself by a property of the root window, which outlives it: the id
     // of a window that doesn't.
-    constexpr std::string_view name = "_NET_SUPPORTING_WM_CHECK";
-    const auto atom = own(xcb_intern_atom_reply(
-        connection, xcb_intern_atom(connection, 1, name.size(), name.data()), nullptr));
-    if (atom == nullptr || atom->atom == XCB_ATOM_NONE) {
-        return false;
+    const xcb_atom_t check = atomOf(connection, "_NET_SUPPORTING_WM_CHECK");
+    return foreignExists(HWND{windowProperty(connection, rootOf(connection), check)});
+}
+
+HWND foreignDesktop() {
+    xcb_connection_t* connection = xConnection();
+    if (connection == nullptr) {
+        return {};
     }
-    const xcb_window_t root = xcb_setup_roots_iterator(xcb_get_setup(connection)).data->root;
-    const auto property = own(xcb_get_property_reply(
-        connection, xcb_get_property(connection, 0, root, atom->atom, XCB_ATOM_WINDOW, 0, 1),
-        nullptr));
-    if (property == nullptr || xcb_get_property_value_length(property.get()) != 4) {
-        return false;
+    const xcb_window_t root = rootOf(connection);
+    const xcb_atom_t virtualRoot = atomOf(connection, "__SWM_VROOT");
+    if (virtualRoot != XCB_ATOM_NONE) {
+        // It stands on the window itself, a child of the root window.
+        const auto tree =
+            own(xcb_query_tree_reply(connection, xcb_query_tree(connection, root), nullptr));
+        const int count = tree == nullptr ? 0 : xcb_query_tree_children_length(tree.get());
+        for (int i = 0; i < count; ++i) {
+            const xcb_window_t child = xcb_query_tree_children(tree.get())[i];
+            const HWND named{windowProperty(connection, child, virtualRoot)};
+            if (foreignExists(named)) {
+                return named;
+            }
+        }
     }
-    xcb_window_t check = 0;
-    std::memcpy(&check, xcb_get_property_value(property.get()), sizeof check);
-    return foreignExists(HWND{check});
+    return HWND{root};
 }
 
 HWND foreignFocus() {
@@ -163,14 +214,10 @@ void followHost(HWND parent, HWND child) {
     if (connection == nullptr || window == nullptr || !window->native) {
         return;
     }
-    const std::uint32_t mask = XCB_EVENT_MASK_STRUCTURE_NOTIFY;
-    const auto request =
-        xcb_change_window_attributes_checked(connection, parent.number, XCB_CW_EVENT_MASK, &mask);
-    // It may have gone since we looked: the error is ours to take, not the toolkit's to print.
-    const auto error = own(xcb_request_check(connection, request));
+    const bool watched = watchStructure(connection, parent.number);
     hostFilter().follow({parent.number, static_cast<xcb_window_t>(window->native->winId()), child});
     SIZE size{};
-    if (error != nullptr || !foreignSize(parent, size)) {
+    if (!watched || !foreignSize(parent, size)) {
         queuePosted({child, WM_CLOSE, 0, 0, 0});
         return;
     }

@@ -27,6 +27,10 @@ void leaveHost(HWND child);
 /// so where the platform of the toolkit is another one than X11.
 bool windowsAreManaged();
 
+/// The root window, or the one that a window manager has put in its place; null where there is
+/// none.
+HWND foreignDesktop();
+
 /// The window with the keyboard, by the X server's word.
 HWND foreignFocus();
 

@@ -43,18 +43,10 @@ QRect toQt(const RECT& area) {
 
 } // namespace
 
-NativeWindow::NativeWindow(HWND owner, const QRect& place, bool topmost, QWindow* parent)
+NativeWindow::NativeWindow(HWND owner, const QRect& place, Qt::WindowFlags flags, QWindow* parent)
     : QWindow(parent), WindowPicture(owner), store_(this) {
     setSurfaceType(QSurface::RasterSurface);
-    if (parent == nullptr) {
-        Qt::WindowFlags flags = Qt::Window | Qt::FramelessWindowHint;
-        if (topmost) {
-            flags |= Qt::WindowStaysOnTopHint | Qt::X11BypassWindowManagerHint;
-        }
-        setFlags(flags);
-    } else if (parent->type() != Qt::ForeignWindow) {
-        setFlag(Qt::WindowDoesNotAcceptFocus); // the keyboard stays with the top-level window
-    }
+    setFlags(flags);
     setGeometry(place);
     create();
     resizePicture(place.size());

@@ -15,7 +15,7 @@ namespace seam {
 class NativeWindow : public QWindow, public WindowPicture {
   public:
     /// A top-level window at a place of the screen, or a child of another window.
-    NativeWindow(HWND owner, const QRect& place, bool topmost, QWindow* parent);
+    NativeWindow(HWND owner, const QRect& place, Qt::WindowFlags flags, QWindow* parent);
 
     PixelView pixels() override;
     void touch(const RECT& area) override;

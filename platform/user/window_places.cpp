@@ -309,6 +309,10 @@ HWND GetForegroundWindow() {
     return result ? result : foreignFocus();
 }
 
+HWND GetDesktopWindow() {
+    return foreignDesktop();
+}
+
 BOOL SetForegroundWindow(HWND window) {
     if (isRemote(window)) {
         return raiseRemote(window) ? TRUE : FALSE;

@@ -59,6 +59,23 @@ std::unique_ptr<FrameWindow> makeFrame(const Window& window) {
     return frame;
 }
 
+Qt::WindowFlags flagsOf(const Window& window) {
+    Qt::WindowFlags flags = Qt::Window;
+    if (!window.parent) {
+        flags |= Qt::FramelessWindowHint;
+        if (window.topmost) {
+            flags |= Qt::WindowStaysOnTopHint | Qt::X11BypassWindowManagerHint;
+        }
+    } else if (!mayBeForeign(window.parent)) {
+        flags |= Qt::WindowDoesNotAcceptFocus; // the keyboard stays with the top-level window
+    } else if (!window.enabled) {
+        // On the desktop a window manager would take it for a window of its own to look after.
+        flags |= Qt::WindowTransparentForInput | Qt::WindowDoesNotAcceptFocus |
+                 Qt::X11BypassWindowManagerHint;
+    }
+    return flags;
+}
+
 std::unique_ptr<NativeWindow> makeNative(const Window& window) {
     const Window* parent = findWindow(window.parent);
     const QRect place = placeOnScreen(window);
@@ -66,8 +83,11 @@ std::unique_ptr<NativeWindow> makeNative(const Window& window) {
     if (parent == nullptr && window.parent) {
         host = QWindow::fromWinId(window.parent.number);
     }
-    auto native = std::make_unique<NativeWindow>(window.handle, place, window.topmost, host);
+    auto native = std::make_unique<NativeWindow>(window.handle, place, flagsOf(window), host);
     native->setTitle(shownText(window.title));
+    if (!window.enabled && window.parent == GetDesktopWindow()) {
+        native->lower();
+    }
     if (!window.parent && !window.topmost) { // no window manager would show that of a topmost one
         native->setIcon(iconOf(window.windowClass->icon));
     }
@@ -313,6 +333,7 @@ HWND CreateWindowExA(DWORD exStyle, const char* className, const char* title, DW
     window.parent = child ? parent : HWND{};
     window.owner = !child && findWindow(parent) != nullptr ? topLevelOf(parent) : HWND{};
     window.style = style;
+    window.enabled = (style & WS_DISABLED) == 0;
     window.topmost = (exStyle & WS_EX_TOPMOST) != 0;
     window.title = title == nullptr ? "" : title;
     const bool framed = !child && !window.topmost && (style & WS_BORDER) != 0;
