@@ -150,7 +150,7 @@ void ForgetEarlierStages() {
     BackgroundCount = 0;
     LastBackground = 0;
     StageRepaintFlag = 1;
-    PreviewMode = 0;
+    PreviewMode = PREVIEW_NONE;
     SaverVerifying = 0;
     SaverClosing = 0;
 }

@@ -26,7 +26,7 @@ constexpr int DROPPED_TIMERS = 2; // timer messages thrown away before the passw
 enum class GuardState { NORMAL, PREVIEW, VERIFYING, CLOSING };
 
 static GuardState StateOfGuard() {
-    if (PreviewMode != 0) {
+    if (PreviewMode != PREVIEW_NONE) {
         return GuardState::PREVIEW;
     }
     if (SaverClosing != 0) {
@@ -54,7 +54,7 @@ static void DetachInputMethod(HWND window) {
 static void OnCreate(HWND window) {
     DetachInputMethod(window);
     GetCursorPos(&MouseStartPos);
-    if (PreviewMode == 0) {
+    if (PreviewMode == PREVIEW_NONE) {
         SetCursor(nullptr);
     }
 }
@@ -108,19 +108,19 @@ LRESULT SaverGuardProc(HWND window, UINT message, WPARAM wParam, LPARAM lParam) 
     case WM_SETTEXT:
         return 0; // the title stays: another saver finds this one by it
     case WM_PAINT:
-        if (PreviewMode == 0) {
+        if (PreviewMode == PREVIEW_NONE) {
             SetCursor(nullptr);
         }
         break;
     case WM_HELP:
     case WM_CONTEXTMENU:
-        if (PreviewMode != 0) {
+        if (PreviewMode != PREVIEW_NONE) {
             PassToParent(window, message, lParam);
             return 1;
         }
         break;
     case WM_SYSCOMMAND:
-        if (PreviewMode == 0 && LeavesTheSaver(wParam)) {
+        if (PreviewMode == PREVIEW_NONE && LeavesTheSaver(wParam)) {
             return 0;
         }
         break;

@@ -13,6 +13,7 @@ constexpr int EXIT_REFUSED = -1;
 constexpr int SAVER_ICON = 100;
 
 static const char* CommandText; // what RunCommand works on, inside the guard
+static HWND HostWindow;         // and RunInHost
 
 const char* SkipProgramName(const char* line) {
     if (*line == '"') {
@@ -141,40 +142,60 @@ static BOOL RegisterSaverClass() {
 static HWND CreateSaverWindow(HWND parent) {
     constexpr DWORD fullScreenStyle = WS_POPUP | WS_VISIBLE | WS_CLIPSIBLINGS | WS_CLIPCHILDREN;
     constexpr DWORD previewStyle = WS_CHILD | WS_VISIBLE | WS_CLIPCHILDREN;
+    constexpr DWORD hostedStyle = previewStyle | WS_DISABLED; // input is the host's affair
 
-    if (PreviewMode == 0) {
+    if (PreviewMode == PREVIEW_NONE) {
         return CreateWindowExA(WS_EX_TOPMOST, SAVER_CLASS, SAVER_TITLE, fullScreenStyle, 0, 0,
                                GetSystemMetrics(SM_CXSCREEN), GetSystemMetrics(SM_CYSCREEN),
                                nullptr, nullptr, SaverInstance, nullptr);
     }
     RECT area{};
     GetClientRect(parent, &area);
-    return CreateWindowExA(0, SAVER_CLASS, "Preview", previewStyle, 0, 0, area.right, area.bottom,
+    const bool whole = PreviewMode == PREVIEW_WHOLE;
+    return CreateWindowExA(0, SAVER_CLASS, whole ? SAVER_TITLE : "Preview",
+                           whole ? hostedStyle : previewStyle, 0, 0, area.right, area.bottom,
                            parent, nullptr, SaverInstance, nullptr);
 }
 
-int RunSaver(HWND parent) {
-    if (parent) {
-        PreviewMode = 1;
-    } else {
-        const HWND running = FindWindowA(SAVER_CLASS, SAVER_TITLE);
-        if (running && IsWindow(running)) {
-            SetForegroundWindow(running);
-            return 0;
-        }
-        LoadPasswordModule();
-    }
+/// Makes the saver window, a child where PreviewMode says so, and runs until it has gone.
+static int RunSaverWindow(HWND parent) {
     int result = EXIT_REFUSED;
     SaverWindow = nullptr;
     if (RegisterSaverClass()) {
         SaverWindow = CreateSaverWindow(parent);
     }
     if (SaverWindow) {
-        if (PreviewMode == 0) {
+        if (PreviewMode == PREVIEW_NONE) {
             SetForegroundWindow(SaverWindow);
         }
         result = RunWindowLoop(SaverWindow, nullptr);
     }
+    return result;
+}
+
+int RunSaver(HWND parent) {
+    if (parent) {
+        PreviewMode = PREVIEW_WALK;
+        return RunSaverWindow(parent);
+    }
+    const HWND running = FindWindowA(SAVER_CLASS, SAVER_TITLE);
+    if (running && IsWindow(running)) {
+        SetForegroundWindow(running);
+        return 0;
+    }
+    LoadPasswordModule();
+    const int result = RunSaverWindow(nullptr);
     UnloadPasswordModule();
     return result;
+}
+
+static int RunInHost() {
+    PreviewMode = PREVIEW_WHOLE;
+    return RunSaverWindow(HostWindow);
+}
+
+int RunHostedShow(HWND host) {
+    SaverInstance = GetModuleHandleA(nullptr);
+    HostWindow = host;
+    return RunGuarded(RunInHost, AfterException);
 }

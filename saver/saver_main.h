@@ -41,6 +41,11 @@ HWND ParseWindowHandle(const char* text);
 /// and -1 if the window can't be made.
 int RunSaver(HWND parent);
 
+/// The whole show as a child of a window that another program owns, the desktop among them. It
+/// takes no input, asks for no password and looks for no saver that runs already: there may be one
+/// for each monitor. Runs until it or that window has gone, and gives 0, or -1 if it can't be made.
+int RunHostedShow(HWND host);
+
 /// The preview in the window that the text names; -1 if it names none.
 int RunPreview(const char* text);
 

@@ -61,7 +61,7 @@ void ShowSetup(HWND window, HINSTANCE instance) {
     ShowReset(window);
     RebuildBackdrop(window, instance);
     SetTimer(window, TIMER_SHOWSTART, SHOWSTART_MS, nullptr);
-    if (PreviewMode == 0) {
+    if (PreviewMode != PREVIEW_WALK) {
         ShowCursor(FALSE);
     }
 }
@@ -81,7 +81,7 @@ void ShowTeardown(HWND window) {
     OpeningDone = 0;
     TitleShown = 0;
     SettingsSave();
-    if (PreviewMode == 0) {
+    if (PreviewMode != PREVIEW_WALK) {
         ShowCursor(TRUE);
     }
 }
@@ -241,21 +241,31 @@ static void Repaint(HWND window) {
     InvalidateRect(window, nullptr, FALSE);
 }
 
+static void StartWalkAbout(HWND window, HINSTANCE instance) {
+    if (Backgrounds != 0) {
+        RebuildBackdrop(window, instance);
+    }
+    Repaint(window);
+    PickRandomWalk(window, static_cast<DWORD>(Statements));
+}
+
+static void StartToon(HWND window, HINSTANCE instance) {
+    if (ToonOpenNamed(window, NextToonFile)) {
+        PlayNextFrame(window);
+        RebuildBackdrop(window, instance);
+        Repaint(window);
+    } else if (PreviewMode == PREVIEW_WHOLE) {
+        StartWalkAbout(window, instance); // nobody is asked there, and no key comes to end it
+    }
+}
+
 void StartNextShow(HWND window, HINSTANCE instance) {
-    if (PreviewMode != 0) {
+    if (PreviewMode == PREVIEW_WALK) {
         StartPreviewWalk(window);
     } else if (NextToonFile[0] != '\0') {
-        if (ToonOpenNamed(window, NextToonFile)) {
-            PlayNextFrame(window);
-            RebuildBackdrop(window, instance);
-            Repaint(window);
-        }
+        StartToon(window, instance);
     } else {
-        if (Backgrounds != 0) {
-            RebuildBackdrop(window, instance);
-        }
-        Repaint(window);
-        PickRandomWalk(window, static_cast<DWORD>(Statements));
+        StartWalkAbout(window, instance);
     }
 }
 

@@ -47,7 +47,8 @@ void ShowReset(HWND window);
 /// Decides what the next show is, and starts nothing. Without any Toon WalkingStyle becomes 0.
 void ChooseNextShow(HWND window);
 
-/// Starts what was decided. A Toon that doesn't load leaves the stage still.
+/// Starts what was decided. A Toon that doesn't load leaves the stage still; in a window of a
+/// program that hosts savers he walks about instead.
 void StartNextShow(HWND window, HINSTANCE instance);
 
 /// Counts the entries of the current directory that match "*.zkt", whatever they are. Names that

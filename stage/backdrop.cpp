@@ -189,7 +189,7 @@ LRESULT PaintStage(HWND stage, DWORD* repaintFlag) {
         SpriteRestoreUnder(dc, &CharacterSprite);
     }
     BlitBackdrop(dc, stage, BackdropBitmap);
-    if (PreviewMode == 1) {
+    if (PreviewMode == PREVIEW_WALK) {
         DrawPreviewTitle(dc, stage);
     } else {
         DrawTitles(dc, stage);

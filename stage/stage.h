@@ -32,7 +32,12 @@ const char* StageTimerName(UINT_PTR timer);
 /// alone, else 0. Written by the saver's start and end of a show.
 extern DWORD SaverActive;
 
-/// 1 once the saver runs as a child of a given window. Written by the saver.
+// What PreviewMode says.
+constexpr DWORD PREVIEW_NONE = 0;  // the whole show on the whole screen
+constexpr DWORD PREVIEW_WALK = 1;  // one walk in a window of the program that shows the preview
+constexpr DWORD PREVIEW_WHOLE = 2; // the whole show in a window of a program that hosts savers
+
+/// Other than PREVIEW_NONE once the saver runs as a child of a given window. Written by the saver.
 extern DWORD PreviewMode;
 
 /// Puts the whole stage at rest before a new stage window has set a timer, and forgets the stage on

@@ -63,10 +63,10 @@ class Guard : public SaverTest {
     }
 
     /// A fresh saver window, or a preview.
-    void open(bool preview = false) {
+    void open(DWORD mode = PREVIEW_NONE) {
         closeStage();
         ForgetEarlierStages();
-        PreviewMode = preview ? 1 : 0;
+        PreviewMode = mode;
         openStage();
         pass(0);
     }
@@ -113,8 +113,10 @@ TEST_F(Guard, EndsOnInputAndOnTheLossOfActivation) {
     for (const auto& [message, wParam, endsSaver, endsPreview] : cases) {
         open();
         EXPECT_EQ(endsOn(message, wParam), endsSaver) << message;
-        open(true);
-        EXPECT_EQ(endsOn(message, wParam), endsPreview) << message;
+        for (const DWORD mode : {PREVIEW_WALK, PREVIEW_WHOLE}) {
+            open(mode);
+            EXPECT_EQ(endsOn(message, wParam), endsPreview) << message << ", " << mode;
+        }
     }
 }
 
@@ -135,14 +137,14 @@ TEST_F(Guard, FourPixelsOfTravelEndIt) {
         }
         EXPECT_EQ(ended, ends) << moves.front().x << ' ' << moves.front().y;
     }
-    open(true);
+    open(PREVIEW_WALK);
     moveMouse(50, 50);
     EXPECT_FALSE(endsOn(WM_MOUSEMOVE)) << "a preview";
 }
 
 TEST_F(Guard, HelpOnAPreviewGoesToItsParent) {
     const HWND parent = createWindow("GuardParentClass", DefWindowProcA, {99, 99});
-    PreviewMode = 1;
+    PreviewMode = PREVIEW_WALK;
     openStage(90, 90, parent);
     for (const UINT help : {WM_HELP, WM_CONTEXTMENU}) {
         EXPECT_EQ(SendMessageA(stage, help, 0, 0), 1);

@@ -61,7 +61,7 @@ TEST_F(ShowStage, ThePreviewWalksOnceAndNeverLoadsWhatItChose) {
                                                                  {{}, "", "0"}};
     const HWND parent = createWindow("SaverTestParent", DefWindowProcA, {300, 200});
     const int cursorBefore = cursorCount();
-    PreviewMode = 1;
+    PreviewMode = PREVIEW_WALK;
     for (const auto& [entries, file, styleSaved] : cases) {
         setEntries(entries);
         WalkingStyle = 1;
@@ -79,6 +79,28 @@ TEST_F(ShowStage, ThePreviewWalksOnceAndNeverLoadsWhatItChose) {
         EXPECT_EQ(savedSetting("Walking Style"), styleSaved);
     }
     DestroyWindow(parent);
+}
+
+TEST_F(ShowStage, InAWindowOfAHostTheWholeShowGoesOnWhateverTheToons) {
+    const int cursorBefore = cursorCount();
+    PreviewMode = PREVIEW_WHOLE;
+    writeToon("a.zkt", {{300, 200, 0, 5, 0, "Hello you there, all of you", 1}}, "Whole");
+    openStage(565, 317);
+    EXPECT_EQ(cursorCount(), cursorBefore - 1) << "no arrow over the host's pointer";
+    EXPECT_TRUE(runUntilEvent("bubble_show"));
+    EXPECT_TRUE(runUntilEvent("show_done"));
+    EXPECT_TRUE(runUntilEvent("bubble_show")) << "and once more";
+    closeStage();
+    EXPECT_EQ(cursorCount(), cursorBefore);
+
+    setEntries({"empty.zkt"});
+    WalkingStyle = 1;
+    seam::answerBoxes([](auto&&...) { return IDOK; });
+    openStage(565, 317);
+    for (int show = 0; show < 3; ++show) {
+        EXPECT_TRUE(runUntilEvent("show_done")) << "he walks about instead";
+    }
+    seam::answerBoxes(nullptr);
 }
 
 TEST_F(ShowStage, AStageOfAnotherSizeShowsNoTraceOfTheOldOne) {

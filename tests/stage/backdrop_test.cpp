@@ -70,7 +70,7 @@ TEST_F(Backdrop, ShowsTheBigTitleOnceAndThenTheCaptionInTheSaverOnly) {
     SaverActive = 0;
     repaint();
     EXPECT_EQ(pixels(), bare) << "the editor's stage has no caption";
-    PreviewMode = 1;
+    PreviewMode = PREVIEW_WALK;
     TitleShown = 0;
     repaint();
     EXPECT_NE(pixels(), bare);
