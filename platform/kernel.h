@@ -189,6 +189,7 @@ DWORD GetPrivateProfileStringA(const char* section, const char* key, const char*
                                char* buffer, DWORD size, const char* file);
 
 /// Sets the key's value. FALSE, and the file as it was, if it can't be written whole, or if the
-/// value holds a line end. A value that stands already is not written again.
+/// value holds a line end. A value that stands already is not written again. Of several processes
+/// that write at once none loses what another has written.
 BOOL WritePrivateProfileStringA(const char* section, const char* key, const char* value,
                                 const char* file);

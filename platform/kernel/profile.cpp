@@ -2,13 +2,17 @@
 
 #include "platform/kernel.h"
 #include "platform/kernel/config_directory.h"
+#include "platform/kernel/descriptor.h"
 #include "platform/kernel/paths.h"
 #include "platform/kernel/profile_text.h"
 #include "platform/kernel/text.h"
 #include "platform/kernel/transfer.h"
 
 #include <cerrno>
+#include <ctime>
+#include <fcntl.h>
 #include <optional>
+#include <sys/file.h>
 
 namespace {
 
@@ -44,6 +48,19 @@ std::optional<std::string> valueIn(const char* file, const char* section, const 
     return seam::profileValue(readProfile(file).text, orEmpty(section), orEmpty(key));
 }
 
+/// Makes this process the only one to change profiles in a directory: two that write at once what
+/// each has read lose keys. It goes on without after a while, for who has it may have been stopped.
+seam::Descriptor lockBeside(const std::string& path) {
+    constexpr int tries = 60;
+    constexpr timespec pause{0, 5'000'000}; // 5 ms
+    const std::string directory = path.substr(0, path.rfind('/') + 1);
+    seam::Descriptor lock(open(directory.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    for (int i = 0; lock && i < tries && flock(lock.number(), LOCK_EX | LOCK_NB) != 0; ++i) {
+        nanosleep(&pause, nullptr);
+    }
+    return lock;
+}
+
 } // namespace
 
 UINT GetPrivateProfileIntA(const char* section, const char* key, int otherwise, const char* file) {
@@ -73,15 +90,16 @@ BOOL WritePrivateProfileStringA(const char* section, const char* key, const char
         !seam::canStandInProfile(section, key, value)) {
         return FALSE;
     }
+    if (!hasDirectory(orEmpty(file)) && !seam::makeConfigDirectory()) {
+        return FALSE;
+    }
+    const seam::Descriptor lock = lockBeside(profilePath(file));
     const seam::WholeFile old = readProfile(file);
     if (old.error != 0 && old.error != ENOENT) {
         return FALSE;
     }
     if (seam::profileValue(old.text, section, key) == value) {
         return TRUE;
-    }
-    if (!hasDirectory(orEmpty(file)) && !seam::makeConfigDirectory()) {
-        return FALSE;
     }
     const std::string text = seam::profileWithValue(old.text, section, key, value);
     return seam::replaceFile(profilePath(file), text) ? TRUE : FALSE;

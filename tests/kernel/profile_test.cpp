@@ -3,6 +3,8 @@
 #include "tests/kernel/scratch_directory.h"
 
 #include <sys/stat.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
 #include <cstdlib>
 
@@ -142,6 +144,21 @@ TEST_F(Profile, IsLeftAloneWhereItCannotBeWritten) {
         pipe ? mkfifo(ini, 0600) : mkdir(ini, 0700);
         EXPECT_EQ(value("k"), "none");
         EXPECT_FALSE(write("k", "new"));
+    }
+}
+
+TEST_F(Profile, KeepsWhatTwoProcessesWriteAtOnce) {
+    for (int round = 0; round < 50; ++round) {
+        const std::string now = std::to_string(round);
+        const pid_t other = fork();
+        if (other == 0) {
+            _exit(write("theirs", now.c_str()) ? 0 : 1);
+        }
+        EXPECT_TRUE(write("ours", now.c_str()));
+        int status = -1;
+        waitpid(other, &status, 0);
+        EXPECT_EQ(status, 0);
+        ASSERT_EQ(value("theirs") + value("ours"), now + now);
     }
 }
 
