@@ -113,7 +113,8 @@ xcb_window_t windowProperty(xcb_connection_t* connection, xcb_window_t window, x
     if (name == XCB_ATOM_NONE) {
         return 0;
     }
-    const auto request = xcb_get_property(connection, 0, window, name, XCB_ATOM_WINDOW, 0, 1);
+    const auto request =
+        xcb_get_property(connection, 0, window, name, XCB_GET_PROPERTY_TYPE_ANY, 0, 1);
     const auto property = own(xcb_get_property_reply(connection, request, nullptr));
     xcb_window_t named = 0;
     if (property != nullptr && xcb_get_property_value_length(property.get()) == sizeof named) {

@@ -5,6 +5,7 @@
 #include "platform/user/input_contexts.h"
 #include "platform/user/keys.h"
 #include "platform/user/queue.h"
+#include "platform/user/screens.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
 
@@ -88,6 +89,7 @@ void NativeWindow::flush() {
     }
     store_.flush(area);
     flushed_ = clockNow();
+    pictureShown(owner_);
 }
 
 void NativeWindow::resizePicture(QSize size) {

@@ -4,6 +4,7 @@
 #include "platform/user/cursors.h"
 #include "platform/user/grabs.h"
 #include "platform/user/native_window.h"
+#include "platform/user/sleep_lock.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
 
@@ -250,6 +251,18 @@ void raiseInFront(QWindow& window) {
         window.raise();
         activate(window);
     }
+}
+
+void pictureShown(HWND window) {
+    const Window* shown = sleepLockIsHeld() ? findWindow(window) : nullptr;
+    if (shown == nullptr || !screens || screens->owner() != window || shown->paintNeeded) {
+        return;
+    }
+    if (xcb_connection_t* connection = xConnection()) {
+        // Once the X server answers it has done all that it was told before.
+        std::free(xcb_get_input_focus_reply(connection, xcb_get_input_focus(connection), nullptr));
+    }
+    releaseSleepLock();
 }
 
 QWindow* screenCover() {

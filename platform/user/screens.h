@@ -22,6 +22,10 @@ void leaveScreens(HWND window);
 /// above it and the foremost gets the keyboard.
 void raiseInFront(QWindow& window);
 
+/// To be told whenever a window has shown what has been drawn in it. When one that has the screens
+/// shows its picture, nothing of the session can be seen any more, and the machine may sleep.
+void pictureShown(HWND window);
+
 /// The black on the other monitors; null while there is none.
 QWindow* screenCover();
 

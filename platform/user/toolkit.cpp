@@ -3,6 +3,7 @@
 #include "platform/user/ending.h"
 #include "platform/user/ordered_input.h"
 #include "platform/user/queue.h"
+#include "platform/user/sleep_lock.h"
 #include "platform/user/window.h"
 
 #include <QPalette>
@@ -98,6 +99,7 @@ void tellOfActivation(Qt::ApplicationState state) {
 }
 
 bool makeToolkit() {
+    takeSleepLock();
     const Probe probe = probeDisplay();
     if (probe != nullptr && xcb_connection_has_error(probe.get()) != 0) {
         std::fputs("dorbo: there is no display to show anything on\n", stderr);
