@@ -6,7 +6,7 @@ import subprocess
 import sys
 
 FLOORS = ["platform", "toon", "stage", "editor", "saver"]  # from the ground up
-ASIDE = ["tests", "bench", "cli", "tools", "resources"]  # stand beside the house
+ASIDE = ["tests", "bench", "cli", "launch", "tools", "resources"]  # stand beside the house
 
 TOKEN = re.compile(
     r"""

@@ -101,7 +101,8 @@ void Process::signal(int number) {
 }
 
 std::string Process::readLine() {
-    process_.waitForReadyRead();
+    while (!process_.canReadLine() && process_.waitForReadyRead()) {
+    }
     return process_.readLine().trimmed().toStdString();
 }
 
@@ -109,16 +110,17 @@ Ground::Ground(int width, int height) {
     fs::create_directories(settings().parent_path());
     fs::create_directories(toons());
     environment_ = environmentFor("");
-    environment_.insert(text("HOME"), text(root()));
-    environment_.insert(text("XDG_CONFIG_HOME"), text(root() / "config"));
-    environment_.insert(text("XDG_RUNTIME_DIR"), text(root()));
+    environment_.insert(text("HOME"), text(home()));
+    environment_.insert(text("XDG_CONFIG_HOME"), text(home() / "config"));
+    environment_.insert(text("XDG_DATA_HOME"), text(home() / "data"));
+    environment_.insert(text("XDG_RUNTIME_DIR"), text(home()));
     environment_.insert(text("UBSAN_OPTIONS"), text("print_stacktrace=1"));
     const std::string size = std::to_string(width) + "x" + std::to_string(height) + "x24";
     // The server picks a free display and tells which on its output.
     server_ =
         std::make_unique<Process>(std::vector<std::string>{"Xvfb", "-displayfd", "1", "-screen",
                                                            "0", size, "-nolisten", "tcp"},
-                                  environment_, root());
+                                  environment_, home());
     const std::string display = ":" + server_->readLine();
     environment_.insert(text("DISPLAY"), text(display));
     connection_ = xcb_connect(display.c_str(), nullptr);
@@ -126,7 +128,7 @@ Ground::Ground(int width, int height) {
         throw std::runtime_error("no connection to Xvfb");
     }
     screen_ = xcb_setup_roots_iterator(xcb_get_setup(connection_)).data;
-    manager_ = std::make_unique<Process>(std::vector<std::string>{"openbox"}, environment_, root());
+    manager_ = std::make_unique<Process>(std::vector<std::string>{"openbox"}, environment_, home());
     if (!waitFor([this] { return managerRuns(connection_, screen_->root); })) {
         throw std::runtime_error("openbox doesn't start");
     }
@@ -198,6 +200,21 @@ xcb_window_t Ground::childOf(xcb_window_t window) const {
     const auto tree =
         owned(xcb_query_tree_reply(connection_, xcb_query_tree(connection_, window), nullptr));
     return tree == nullptr || tree->children_len == 0 ? 0 : *xcb_query_tree_children(tree.get());
+}
+
+bool Ground::clickReaches(xcb_window_t window) const {
+    const std::uint32_t mask = XCB_EVENT_MASK_BUTTON_PRESS;
+    xcb_change_window_attributes(connection_, window, XCB_CW_EVENT_MASK, &mask);
+    const QSize size = grab(window).size();
+    command({"xdotool", "mousemove", "--window", std::to_string(window),
+             std::to_string(size.width() / 2), std::to_string(size.height() / 2), "click", "1"});
+    const auto told = [&] {
+        const auto event = owned(xcb_poll_for_event(connection_));
+        return event != nullptr && (event->response_type & 0x7F) == XCB_BUTTON_PRESS;
+    };
+    const auto pointer = owned(
+        xcb_query_pointer_reply(connection_, xcb_query_pointer(connection_, window), nullptr));
+    return waitFor(told, 5) && pointer != nullptr && pointer->child == 0;
 }
 
 void Ground::press(const std::string& key, xcb_window_t window) const {

@@ -65,8 +65,12 @@ class Ground {
 
     void resizeWindow(xcb_window_t window, int width, int height) const;
 
-    /// The window that lies in a window of ours; 0 if none does.
+    /// The window that lies in another one; 0 if none does.
     xcb_window_t childOf(xcb_window_t window) const;
+
+    /// Clicks in the middle of a window of ours; whether it is told of that, and the pointer is in
+    /// it and not in a window that lies there.
+    bool clickReaches(xcb_window_t window) const;
 
     /// Starts another program on the display.
     Process launch(const std::vector<std::string>& words) const;
@@ -97,18 +101,23 @@ class Ground {
     void loseDisplay();
 
     std::filesystem::path toons() const {
-        return root() / "toons";
+        return home() / "toons";
     }
 
     std::filesystem::path settings() const {
-        return root() / "config/dorbo/Dorbo95.ini";
+        return home() / "config/dorbo/Dorbo95.ini";
     }
 
-  private:
-    std::filesystem::path root() const {
+    std::filesystem::path home() const {
         return root_.path().toStdString();
     }
 
+    /// Where the programs keep the user's Toons.
+    std::filesystem::path toonHome() const {
+        return home() / "data/dorbo/toons";
+    }
+
+  private:
     QTemporaryDir root_;
     QProcessEnvironment environment_;
     std::unique_ptr<Process> server_;
