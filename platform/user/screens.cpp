@@ -27,6 +27,9 @@ namespace {
 /// Two programs that both want to be on top must not keep the machine busy.
 constexpr int raiseMilliseconds = 100;
 
+/// The time that a window manager may take to give a new window the keyboard.
+constexpr int settleMilliseconds = 500;
+
 /// Puts a window right below another one; both are out of the window manager's hands.
 void putBelow(QWindow& window, QWindow& upper) {
     xcb_connection_t* connection = xConnection();
@@ -116,12 +119,17 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
         connect(qGuiApp, &QGuiApplication::primaryScreenChanged, this, later);
         raiseLater_.setSingleShot(true);
         connect(&raiseLater_, &QTimer::timeout, this, [this] { raise(); });
+        sinceTaken_.start();
         watchRoot();
         arrange();
     }
 
     HWND owner() const {
         return owner_;
+    }
+
+    int settlesIn() const {
+        return std::max(settleMilliseconds - static_cast<int>(sinceTaken_.elapsed()), 0);
     }
 
     QWindow* cover() const {
@@ -218,6 +226,7 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
     xcb_window_t root_ = 0;
     QTimer raiseLater_;
     QElapsedTimer sinceRaise_;
+    QElapsedTimer sinceTaken_;
 };
 
 std::unique_ptr<Screens> screens;
@@ -251,6 +260,14 @@ void raiseInFront(QWindow& window) {
         window.raise();
         activate(window);
     }
+}
+
+bool screensAreTaken() {
+    return screens != nullptr;
+}
+
+int screensSettleIn() {
+    return screens ? screens->settlesIn() : 0;
 }
 
 void pictureShown(HWND window) {

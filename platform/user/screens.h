@@ -22,6 +22,12 @@ void leaveScreens(HWND window);
 /// above it and the foremost gets the keyboard.
 void raiseInFront(QWindow& window);
 
+bool screensAreTaken();
+
+/// How many milliseconds are left until the keyboard should be where it belongs after a window has
+/// taken the screens; 0 if it has long been, or none has.
+int screensSettleIn();
+
 /// To be told whenever a window has shown what has been drawn in it. When one that has the screens
 /// shows its picture, nothing of the session can be seen any more, and the machine may sleep.
 void pictureShown(HWND window);

@@ -1,8 +1,10 @@
 #include "platform/user/toolkit.h"
 
 #include "platform/user/ending.h"
+#include "platform/user/foreign.h"
 #include "platform/user/ordered_input.h"
 #include "platform/user/queue.h"
+#include "platform/user/screens.h"
 #include "platform/user/sleep_lock.h"
 #include "platform/user/window.h"
 
@@ -10,6 +12,7 @@
 #include <QProxyStyle>
 #include <QScreen>
 #include <QStyleOption>
+#include <QTimer>
 
 #include <cstdio>
 #include <memory>
@@ -88,9 +91,28 @@ QPalette classicPalette() {
     return palette;
 }
 
+void tellOfActivation(Qt::ApplicationState state);
+
+/// Whether nobody else has the keyboard that has just been lost. Where a Wayland compositor stands
+/// behind the X server it takes it back at once from a window that asks for it, and gives it when
+/// it has seen that window: what was lost so soon is looked at again a little later. A window of
+/// the compositor's own that has it is nobody to the X server.
+bool keyboardMayComeBack() {
+    const int wait = screensSettleIn();
+    if (wait > 0) {
+        QTimer::singleShot(wait, qGuiApp,
+                           [] { tellOfActivation(QGuiApplication::applicationState()); });
+        return true;
+    }
+    return screensAreTaken() && !foreignFocus();
+}
+
 /// Another program has got the keyboard, or this one has it again.
 void tellOfActivation(Qt::ApplicationState state) {
     const WPARAM active = state == Qt::ApplicationActive ? TRUE : FALSE;
+    if (active == FALSE && keyboardMayComeBack()) {
+        return;
+    }
     forEachWindow([&](const Window& window) {
         if (!window.parent && window.visible) {
             queueInput({window.handle, WM_ACTIVATEAPP, active, 0, 0});

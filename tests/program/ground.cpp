@@ -268,10 +268,20 @@ void Ground::giveInputBack() const {
     xcb_flush(connection_);
 }
 
+void Ground::focus(xcb_window_t window) const {
+    xcb_set_input_focus(connection_, XCB_INPUT_FOCUS_NONE, window, XCB_CURRENT_TIME);
+    grab(); // the server has done that by the time it answers
+}
+
 QPoint Ground::pointer() const {
     const auto asked = xcb_query_pointer(connection_, screen_->root);
     const auto told = owned(xcb_query_pointer_reply(connection_, asked, nullptr));
     return told == nullptr ? QPoint(-1, -1) : QPoint(told->root_x, told->root_y);
+}
+
+void Ground::loseManager() {
+    manager_->signal(SIGTERM);
+    manager_->exitCode();
 }
 
 void Ground::loseDisplay() {

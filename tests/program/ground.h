@@ -89,6 +89,9 @@ class Ground {
     bool takePointer() const;
     void giveInputBack() const;
 
+    /// Gives the keyboard to a window, or to none.
+    void focus(xcb_window_t window) const;
+
     bool inputIsFree() const {
         const bool taken = takeInput();
         giveInputBack();
@@ -96,6 +99,9 @@ class Ground {
     }
 
     QPoint pointer() const; ///< where on the screen it is
+
+    /// The window manager ends: nobody sees to windows and keyboard any more.
+    void loseManager();
 
     /// The X server dies.
     void loseDisplay();

@@ -90,6 +90,24 @@ TEST_F(Screen, NothingThatAppearsLaterLiesAboveIt) {
     EXPECT_TRUE(saver.running());
 }
 
+TEST_F(Screen, EndsWhenAnotherWindowKeepsTheKeyboardNotWhenNoneHasIt) {
+    ground.loseManager();
+    const xcb_window_t other = ground.makeWindow(50, 50);
+    auto saver = ground.start({"S"});
+    waitForSaver();
+    ground.focus(0); // as a compositor does that sees to the keyboard itself
+    EXPECT_FALSE(waitFor([&] { return !saver.running(); }, 1));
+    ground.press("a"); // of which it hears nothing
+    EXPECT_TRUE(saver.running());
+    moves(300, 300);
+    EXPECT_EQ(saver.exitCode(), 0);
+
+    auto second = ground.start({"S"});
+    waitForSaver();
+    ground.focus(other);
+    EXPECT_EQ(second.exitCode(), 0);
+}
+
 TEST_F(Screen, SignalsEndItWithTheSettingsSaved) {
     setPassword("sesame");
     for (const int number : {SIGTERM, SIGINT, SIGHUP}) {
