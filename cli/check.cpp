@@ -128,14 +128,6 @@ void AddShow(ToonReport& report, const std::string& path) {
 
 // ---- The file ---------------------------------------------------------------------------------
 
-/// The saver opens what it may write, root or not.
-bool MayBeWritten(const std::string& path) {
-    constexpr mode_t anybodyWrites = S_IWUSR | S_IWGRP | S_IWOTH;
-    struct stat status = {};
-    return stat(path.c_str(), &status) == 0 && (status.st_mode & anybodyWrites) != 0 &&
-           faccessat(AT_FDCWD, path.c_str(), W_OK, AT_EACCESS) == 0;
-}
-
 /// A file that ends within a frame.
 void CheckSize(ToonReport& report, std::size_t size) {
     const std::size_t rest = (size - sizeof(ToonHeader)) % sizeof(ToonFrame);
@@ -193,6 +185,13 @@ void AddFindings(ToonReport& report, std::vector<Finding> found) {
 }
 
 } // namespace
+
+bool MayBeWritten(const std::string& path) {
+    constexpr mode_t anybodyWrites = S_IWUSR | S_IWGRP | S_IWOTH;
+    struct stat status = {};
+    return stat(path.c_str(), &status) == 0 && (status.st_mode & anybodyWrites) != 0 &&
+           faccessat(AT_FDCWD, path.c_str(), W_OK, AT_EACCESS) == 0;
+}
 
 bool ToonReport::faulty() const {
     return std::any_of(findings.begin(), findings.end(),
@@ -320,16 +319,21 @@ bool PrintAll(const std::vector<std::string>& files, bool json) {
 
 } // namespace
 
+std::string ReadPlayable(const std::string& path, Toon& toon) {
+    std::size_t size = 0;
+    std::string error = ReadToon(path, toon, size);
+    if (error.empty() && toon.frames.empty()) {
+        error = "it has no frame";
+    }
+    return error.empty() ? "" : std::string(path).append(": ").append(error);
+}
+
 std::string WhyUnplayable(const std::vector<std::string>& paths) {
     for (const std::string& path : paths) {
         Toon toon{};
-        std::size_t size = 0;
-        std::string error = ReadToon(path, toon, size);
-        if (error.empty() && toon.frames.empty()) {
-            error = "it has no frame";
-        }
+        std::string error = ReadPlayable(path, toon);
         if (!error.empty()) {
-            return std::string(path).append(": ").append(error);
+            return error;
         }
     }
     return "";

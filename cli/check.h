@@ -22,6 +22,12 @@ struct ToonReport {
 /// Throws a std::exception if that can't be done.
 ToonReport CheckToon(const std::string& path);
 
+/// Whether the saver and the editor open the file: they open what they may write, root or not.
+bool MayBeWritten(const std::string& path);
+
+/// Reads a file that can be acted out; else gives why it can't, as "FILE: reason".
+std::string ReadPlayable(const std::string& path, Toon& toon);
+
 /// Which of the files is no Toon that can be acted out and why, as "FILE: reason"; empty if all
 /// are.
 std::string WhyUnplayable(const std::vector<std::string>& paths);

@@ -20,6 +20,7 @@ constexpr const char* overview =
     "  Begin with one that is there:     toon show intro.zkt > mine.json\n"
     "  Change mine.json, make it whole:  toon write mine.json\n"
     "  See what the saver makes of it:   toon check mine.zkt\n"
+    "  Watch it:                         toon play mine.zkt\n"
     "  Send it to a friend:              toon film mine.zkt mine.gif\n"
     "\n"
     "`toon COMMAND --help` tells more of each. Exit code: 0 done, 1 something is wrong with a "
@@ -27,6 +28,18 @@ constexpr const char* overview =
     "2 the command line is.\n";
 
 constexpr Help helps[] = {
+    {"play", "FILE.zkt", "shows a Toon on the whole screen, once",
+     "\n"
+     "A key or a click ends it. The file may have any name, and may be read-only.\n"
+     "\n"
+     "  toon play intro.zkt\n"},
+    {"edit", "[FILE.zkt]", "opens the Toon editor",
+     "\n"
+     "With a file that Toon is open in it from the start: Alt+P plays it, Ctrl+E edits its "
+     "frames.\n"
+     "\n"
+     "  toon edit\n"
+     "  toon edit mine.zkt\n"},
     {"show", "FILE.zkt", "prints a Toon as JSON",
      "\n"
      "Poses count from 1. In texts \\n is the line break of a bubble; \\r stands for a line feed, "

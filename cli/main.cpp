@@ -1,7 +1,8 @@
-// The program `toon`: what can be done with Toon files without a screen.
+// The program `toon`: what can be done with Toon files.
 #include "cli/check.h"
 #include "cli/film.h"
 #include "cli/help.h"
+#include "cli/play.h"
 #include "cli/show_write.h"
 #include "cli/trace.h"
 
@@ -25,11 +26,10 @@ struct Command {
 };
 
 constexpr Command commands[] = {
-    {"show", 1, 1, ShowCommand},
-    {"write", 1, 3, WriteCommand},
-    {"check", 1, anyNumber, CheckCommand},
-    {"film", 0, anyNumber, FilmCommand}, // this one and the next count for themselves
-    {"trace", 0, anyNumber, TraceCommand},
+    {"play", 0, anyNumber, PlayToonCommand}, // those without a number count for themselves
+    {"edit", 0, anyNumber, EditToonCommand}, {"show", 1, 1, ShowCommand},
+    {"write", 1, 3, WriteCommand},           {"check", 1, anyNumber, CheckCommand},
+    {"film", 0, anyNumber, FilmCommand},     {"trace", 0, anyNumber, TraceCommand},
 };
 
 bool asksForHelp(const Arguments& arguments) {

@@ -4,7 +4,7 @@ _toon() {
     local word=${COMP_WORDS[COMP_CWORD]} before=${COMP_WORDS[COMP_CWORD - 1]} words files
     COMPREPLY=()
     if [ "$COMP_CWORD" -eq 1 ]; then
-        COMPREPLY=($(compgen -W "show write check film trace --help" -- "$word"))
+        COMPREPLY=($(compgen -W "play edit show write check film trace --help" -- "$word"))
         return
     fi
     case $before in
@@ -26,7 +26,7 @@ _toon() {
     esac
     files='*.zkt'
     case ${COMP_WORDS[1]} in
-    show) words="--help" ;;
+    play | edit | show) words="--help" ;;
     write)
         words="-o --help"
         [ "$before" = -o ] || files='*.json'

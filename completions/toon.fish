@@ -1,16 +1,18 @@
 # Completion of `toon` for fish: put it into ~/.config/fish/completions.
 
-set -l commands show write check film trace
+set -l commands play edit show write check film trace
 set -l stage '__fish_seen_subcommand_from film trace'
 
 complete -c toon -f
+complete -c toon -n "not __fish_seen_subcommand_from $commands" -a play -d 'shows a Toon on the whole screen, once'
+complete -c toon -n "not __fish_seen_subcommand_from $commands" -a edit -d 'opens the Toon editor'
 complete -c toon -n "not __fish_seen_subcommand_from $commands" -a show -d 'prints a Toon as JSON'
 complete -c toon -n "not __fish_seen_subcommand_from $commands" -a write -d 'makes a Toon of JSON'
 complete -c toon -n "not __fish_seen_subcommand_from $commands" -a check -d 'tells what the saver would do with Toons'
 complete -c toon -n "not __fish_seen_subcommand_from $commands" -a film -d 'acts a Toon out and films it'
 complete -c toon -n "not __fish_seen_subcommand_from $commands" -a trace -d 'prints what happens in a show'
 complete -c toon -l help -d 'tells how it is used'
-complete -c toon -n '__fish_seen_subcommand_from show check film trace' -k -a '(__fish_complete_suffix .zkt)'
+complete -c toon -n '__fish_seen_subcommand_from play edit show check film trace' -k -a '(__fish_complete_suffix .zkt)'
 complete -c toon -n '__fish_seen_subcommand_from write' -k -a '(__fish_complete_suffix .json)'
 complete -c toon -n '__fish_seen_subcommand_from write' -s o -r -F -d 'where to'
 complete -c toon -n '__fish_seen_subcommand_from check' -l json -d 'for programs'

@@ -50,6 +50,10 @@ static int TranslateKey(const MSG* message) {
 }
 
 int RunEditor(HINSTANCE instance, HWND owner, int showCommand) {
+    return RunEditorWith(instance, owner, showCommand, "");
+}
+
+int RunEditorWith(HINSTANCE instance, HWND owner, int showCommand, const char* toon) {
     EditorOwner = owner;
     if (!EditorClassInstance && !EditorClassSetup(instance)) {
         return 0;
@@ -57,6 +61,9 @@ int RunEditor(HINSTANCE instance, HWND owner, int showCommand) {
     EditorClassInstance = instance; // also if what follows fails: a class is set up once
     if (!CreateEditorWindows(instance, showCommand)) {
         return 0;
+    }
+    if (toon[0] != '\0') {
+        ToonOpenPath(EditorMainWindow, toon);
     }
     return RunWindowLoop(EditorMainWindow, TranslateKey);
 }

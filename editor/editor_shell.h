@@ -14,6 +14,9 @@ extern HCURSOR TargetCursor;
 /// start, and then nothing shows. The window classes are set up once a process.
 int RunEditor(HINSTANCE instance, HWND owner, int showCommand);
 
+/// The same, with the Toon of that path open from the start; none for an empty path.
+int RunEditorWith(HINSTANCE instance, HWND owner, int showCommand, const char* toon);
+
 /// Nonzero if at least one of the two classes could be set up.
 int EditorClassSetup(HINSTANCE instance);
 

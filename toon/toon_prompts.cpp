@@ -51,6 +51,12 @@ int ToonNew(HWND owner) {
     return 1;
 }
 
+static int TellOpened(HWND mainWindow) {
+    SendMessageA(mainWindow, TM_ENABLEPLAY, 1, 0);
+    SendMessageA(mainWindow, TM_BACKGROUND, 0, 0);
+    return 1;
+}
+
 int ToonOpenFromMenu(HWND mainWindow) {
     ToonFileName[0] = '\0';
     ToonFileSetup(mainWindow);
@@ -62,7 +68,13 @@ int ToonOpenFromMenu(HWND mainWindow) {
     FrameCount = count;
     CurrentFrameIndex = 0;
     FrameGet(0, &EditFrame);
-    SendMessageA(mainWindow, TM_ENABLEPLAY, 1, 0);
-    SendMessageA(mainWindow, TM_BACKGROUND, 0, 0);
-    return 1;
+    return TellOpened(mainWindow);
+}
+
+int ToonOpenPath(HWND mainWindow, const char* path) {
+    if (ToonOpenNamed(mainWindow, path) == 0) {
+        ToonFileName[0] = '\0';
+        return 0;
+    }
+    return TellOpened(mainWindow);
 }

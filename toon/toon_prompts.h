@@ -32,3 +32,6 @@ int ToonNew(HWND owner);
 /// told to enable Play and to show tile and caption. Else 0, also for a load that failed, and the
 /// name is empty.
 int ToonOpenFromMenu(HWND mainWindow);
+
+/// The same with the Toon of that path, which nobody is asked for.
+int ToonOpenPath(HWND mainWindow, const char* path);

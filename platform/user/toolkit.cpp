@@ -14,6 +14,7 @@
 #include <QStyleOption>
 #include <QTimer>
 
+#include <cerrno>
 #include <cstdio>
 #include <memory>
 #include <xcb/xcb.h>
@@ -124,7 +125,8 @@ bool makeToolkit() {
     takeSleepLock();
     const Probe probe = probeDisplay();
     if (probe != nullptr && xcb_connection_has_error(probe.get()) != 0) {
-        std::fputs("dorbo: there is no display to show anything on\n", stderr);
+        std::fprintf(stderr, "%s: there is no display to show anything on\n",
+                     program_invocation_short_name);
         return false;
     }
     // A pixel of ours is a pixel of the screen: the pictures are drawn for it.

@@ -77,6 +77,33 @@ TEST_F(EditorTest, TheSetupsButtonClosesTheEditorAndOpensAnother) {
     DestroyWindow(setup);
 }
 
+TEST_F(EditorTest, AToonThatIsNamedIsOpenFromTheStart) {
+    const std::tuple<std::string, std::string, LONG> cases[] = {
+        {"two.zkt", "two.zkt", 2},
+        {"none.zkt", "", 0},
+    };
+    for (const auto& [named, name, frames] : cases) {
+        const std::function<void()> look = [&, &name = name, &frames = frames] {
+            EXPECT_EQ(ToonFileName, name);
+            EXPECT_EQ(FrameCount, frames);
+            EXPECT_EQ(IsWindowEnabled(PlayButton), name.empty() ? FALSE : TRUE);
+            EXPECT_EQ(BackgroundIndex, name.empty() ? 0 : 3);
+        };
+        once(editorStands, [&] {
+            look();
+            once([] { return OpeningDone != 0 && RandomWalkActive == 0; },
+                 [&] {
+                     look(); // also when he has said hello
+                     PostMessageA(EditorMainWindow, WM_CLOSE, 0, 0);
+                 });
+        });
+        RunEditorWith(GetModuleHandleA(nullptr), nullptr, SW_SHOWNORMAL, named.c_str());
+        expectNothingLeft(named.c_str());
+    }
+    EXPECT_EQ(boxes.size(), 1U) << "for the one that is none";
+    EXPECT_EQ(filesAsked, 0);
+}
+
 TEST_F(EditorTest, ClosedInAnyStateItsStageBeginsClean) {
     for (const EditorState& state : editorStates) {
         reach(state.name);
