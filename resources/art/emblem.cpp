@@ -238,11 +238,11 @@ std::vector<Layer> emblemLayers(bool plain) {
     return layers;
 }
 
-Image drawEmblem(int size) {
+Image drawLayers(const std::vector<Layer>& layers, int size) {
     const int side = size * Samples;
     const double scale = side / EmblemSize;
     Image fine(side, side);
-    for (const Layer& layer : emblemLayers(false)) {
+    for (const Layer& layer : layers) {
         Mask mask(side, side);
         for (const Outline& outline : layer.outlines) {
             fillOutline(mask, outline, scale);
@@ -261,10 +261,11 @@ Image drawEmblem(int size) {
     return image;
 }
 
-std::string emblemSvg() {
+std::string svgOf(const std::vector<Layer>& layers, const std::string& title) {
     std::string text = "<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"64\" height=\"64\" "
-                       "viewBox=\"0 0 64 64\">\n<title>Dorbo</title>\n";
-    for (const Layer& layer : emblemLayers(false)) {
+                       "viewBox=\"0 0 64 64\">\n<title>" +
+                       title + "</title>\n";
+    for (const Layer& layer : layers) {
         const std::string path = pathOf(layer.outlines);
         if (layer.line > 0) {
             text += "<path fill=\"" + colourName(Line) + "\" stroke=\"" + colourName(Line) +

@@ -24,10 +24,10 @@ struct Layer {
 // picture has no room, and eyes and mouth, which it has pixel by pixel.
 std::vector<Layer> emblemLayers(bool plain);
 
-// The emblem with smooth edges, a square of so many pixels.
-Image drawEmblem(int size);
+// Layers with smooth edges, a square of so many pixels.
+Image drawLayers(const std::vector<Layer>& layers, int size);
 
-// The emblem as the text of an SVG file.
-std::string emblemSvg();
+// Layers as the text of an SVG file.
+std::string svgOf(const std::vector<Layer>& layers, const std::string& title);
 
 } // namespace art

@@ -3,7 +3,6 @@
 #include "resources/art/bmp_file.h"
 #include "resources/art/bubbles.h"
 #include "resources/art/buttons.h"
-#include "resources/art/emblem.h"
 #include "resources/art/expressions.h"
 #include "resources/art/icons.h"
 #include "resources/art/png_file.h"
@@ -13,6 +12,7 @@
 #include "resources/art/walk.h"
 
 #include <array>
+#include <utility>
 
 namespace art {
 
@@ -63,15 +63,20 @@ void addTiles(std::vector<Exhibit>& gallery) {
 }
 
 void addIcons(std::vector<Exhibit>& gallery) {
-    const auto file = [](int size) { return "icons/" + std::to_string(size) + ".png"; };
+    const auto add = [&gallery](const std::string& name, int size, const Image& image) {
+        gallery.push_back({"icons/" + name + std::to_string(size) + ".png", pngBytes(image)});
+    };
     for (const int size : SmallIcons) {
-        gallery.push_back({file(size), pngBytes(trueColours(drawSmallIcon(size)))});
+        add("", size, trueColours(drawSmallIcon(size)));
+        add("toon-", size, trueColours(drawSmallToonIcon(size)));
     }
     for (const int size : LargeIcons) {
-        gallery.push_back({file(size), pngBytes(drawEmblem(size))});
+        add("", size, drawLargeIcon(size));
+        add("toon-", size, drawLargeToonIcon(size));
     }
-    const std::string svg = emblemSvg();
-    gallery.push_back({"icons/dorbo.svg", {svg.begin(), svg.end()}});
+    for (const auto& [name, svg] : {std::pair("dorbo", iconSvg()), {"toon", toonIconSvg()}}) {
+        gallery.push_back({std::string("icons/") + name + ".svg", {svg.begin(), svg.end()}});
+    }
 }
 
 } // namespace

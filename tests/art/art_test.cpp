@@ -25,8 +25,8 @@ std::vector<Bitmap> tiles() {
 }
 
 /// An icon, with black for the pixels that aren't solid.
-Bitmap loadIcon(int size) {
-    const Bytes bytes = readFile("icons/" + std::to_string(size) + ".png");
+Bitmap loadIcon(const std::string& name, int size) {
+    const Bytes bytes = readFile("icons/" + name + std::to_string(size) + ".png");
     png_image png{};
     png.version = PNG_IMAGE_VERSION;
     EXPECT_NE(png_image_begin_read_from_memory(&png, bytes.data(), bytes.size()), 0);
@@ -34,7 +34,7 @@ Bitmap loadIcon(int size) {
     Bytes pixels(PNG_IMAGE_SIZE(png));
     EXPECT_NE(png_image_finish_read(&png, nullptr, pixels.data(), 0, nullptr), 0) << png.message;
     EXPECT_EQ(png.warning_or_error, 0U) << png.message;
-    Bitmap icon{std::to_string(size),
+    Bitmap icon{name + std::to_string(size),
                 static_cast<int>(png.width),
                 static_cast<int>(png.height),
                 32,
@@ -106,7 +106,7 @@ TEST(Art, FilesHaveTheFormThatTheProgramReadsAndAreStillDrawnSo) {
     }
     EXPECT_EQ(count, 42U);
     const auto gallery = art::drawGallery();
-    EXPECT_EQ(gallery.size(), count + 10) << "and the icons and the pointer";
+    EXPECT_EQ(gallery.size(), count + 19) << "and the icons and the pointer";
     for (const art::Exhibit& exhibit : gallery) {
         EXPECT_TRUE(exhibit.bytes == readFile(exhibit.file)) << exhibit.file;
     }
@@ -145,9 +145,10 @@ TEST(Art, IconsFillTheirSquareAndTheSmallOnesKeepToTheSixteenColours) {
     std::vector<int> sizes(std::begin(art::SmallIcons), std::end(art::SmallIcons));
     sizes.insert(sizes.end(), std::begin(art::LargeIcons), std::end(art::LargeIcons));
     EXPECT_EQ(sizes, (std::vector<int>{16, 22, 24, 32, 48, 64, 128, 256}));
-    for (const int size : sizes) {
-        SCOPED_TRACE(size);
-        const Bitmap icon = loadIcon(size);
+    for (std::size_t i = 0; i < 2 * sizes.size(); ++i) {
+        const int size = sizes[i / 2];
+        const Bitmap icon = loadIcon(i % 2 == 0 ? "" : "toon-", size);
+        SCOPED_TRACE(icon.name);
         ASSERT_EQ(icon.width, size);
         ASSERT_EQ(icon.height, size);
         EXPECT_EQ(smallestHole(icon), icon.pixels.size());
