@@ -10,6 +10,7 @@ function(add_toons target sources toons)
         list(APPEND built ${toon})
     endforeach()
     add_custom_target(${target} ALL DEPENDS ${built})
+    set_target_properties(${target} PROPERTIES TOONS "${built}")
 endfunction()
 
 # The Toons that come with the program.
