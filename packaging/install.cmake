@@ -40,7 +40,7 @@ install(FILES completions/toon.bash DESTINATION ${CMAKE_INSTALL_DATADIR}/bash-co
     RENAME toon)
 install(FILES completions/toon.fish DESTINATION ${CMAKE_INSTALL_DATADIR}/fish/vendor_completions.d)
 
-install(FILES packaging/copyright docs/security.md docs/toon-format.md docs/trace.md
+install(FILES packaging/copyright docs/security.md docs/starting.md docs/toon-format.md docs/trace.md
     docs/writing-toons.md DESTINATION ${DORBO_DOCS})
 install(FILES docs/pictures/configuration.png docs/pictures/frame-editor.png
     docs/pictures/played.png docs/pictures/poses.png DESTINATION ${DORBO_DOCS}/pictures)

@@ -4,6 +4,7 @@
 #include "platform/kernel.h"
 #include "platform/user/window.h"
 #include "saver/setup_dialog.h"
+#include "stage/random_walk.h"
 
 namespace {
 

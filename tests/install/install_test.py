@@ -60,13 +60,14 @@ class Install(unittest.TestCase):
         return glob.glob(os.path.join(self.share, "applications/*.desktop"))
 
     def test_programs_toons_and_completions_lie_where_they_are_looked_for(self):
-        self.expect_files("bin/dorbo", "bin/toon", "share/bash-completion/completions/toon",
+        self.expect_files("bin/dorbo", "bin/toon", "libexec/xscreensaver/dorbo-hack",
+                          "share/xscreensaver/config/dorbo-hack.xml", "share/bash-completion/completions/toon",
                           "share/fish/vendor_completions.d/toon.fish", "share/zsh/site-functions/_toon")
         toons = [os.path.basename(name)[:-5] for name in glob.glob(os.path.join(ROOT, "toons/*.json"))]
         self.assertEqual(len(toons), 8)
         self.expect_files(*(f"share/dorbo/toons/{name}.zkt" for name in toons))
-        for name in ("dorbo", "toon"):
-            self.assertTrue(os.access(os.path.join(self.prefix, "bin", name), os.X_OK))
+        for name in ("bin/dorbo", "bin/toon", "libexec/dorbo/dorbo-start", "libexec/xsecurelock/saver_dorbo"):
+            self.assertTrue(os.access(os.path.join(self.prefix, name), os.X_OK), name)
 
     def test_everybody_may_read_everything_and_nothing_tells_of_the_building_place(self):
         for folder, _, names in os.walk(os.path.join(self.staged, "usr")):
