@@ -351,6 +351,7 @@ int CheckCommand(const std::vector<std::string>& arguments) {
         return TellWrongUsage("check", "it takes a FILE.zkt");
     }
     setenv("QT_QPA_PLATFORM", "offscreen", 1);
+    setenv("DORBO_SCALE", "1", 1);
     CatchInterruptions();
     const bool faulty = PrintAll(files, json);
     const bool printed = std::fflush(stdout) == 0 && std::ferror(stdout) == 0;

@@ -267,6 +267,7 @@ void act(const ReplayOptions& options, const ReplayHooks& hooks) {
 
 ReplayEnd Replay(const ReplayOptions& options, const ReplayHooks& hooks) {
     setenv("QT_QPA_PLATFORM", "offscreen", 1);              // whatever the user's desktop is
+    setenv("DORBO_SCALE", "1", 1);                          // and however dense its screen
     setenv("QT_LOGGING_RULES", "default.warning=false", 0); // of what that platform can't do
     const fs::path before = fs::current_path();
     const ReplayGround ground;

@@ -8,6 +8,16 @@ namespace {
 
 constexpr DWORD colourBits = 0x00FFFFFF;
 
+/// With the scale known to the compiler, which then needs no inner loop.
+template <std::size_t scale>
+void widen(DWORD* __restrict target, const DWORD* __restrict source, std::size_t count) {
+    for (std::size_t i = 0; i < count; ++i) {
+        for (std::size_t j = 0; j < scale; ++j) {
+            target[i * scale + j] = source[i];
+        }
+    }
+}
+
 } // namespace
 
 void fillRow(DWORD* target, std::size_t count, DWORD pixel) {
@@ -36,6 +46,19 @@ void matchRow(DWORD* __restrict target, const DWORD* __restrict source, std::siz
               DWORD pixel) {
     for (std::size_t i = 0; i < count; ++i) {
         target[i] = ((source[i] ^ pixel) & colourBits) == 0 ? whitePixel : blackPixel;
+    }
+}
+
+void widenRow(DWORD* target, const DWORD* source, std::size_t count, std::size_t scale) {
+    switch (scale) {
+    case 2:
+        return widen<2>(target, source, count);
+    case 3:
+        return widen<3>(target, source, count);
+    default:
+        for (std::size_t i = 0; i < count; ++i) {
+            fillRow(target + i * scale, scale, source[i]);
+        }
     }
 }
 

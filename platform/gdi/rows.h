@@ -20,6 +20,9 @@ void orRow(DWORD* target, const DWORD* source, std::size_t count);
 /// White where the source has the colour of `pixel`, black elsewhere.
 void matchRow(DWORD* target, const DWORD* source, std::size_t count, DWORD pixel);
 
+/// Each pixel of the source `scale` times, which is at least 1: `count * scale` pixels.
+void widenRow(DWORD* target, const DWORD* source, std::size_t count, std::size_t scale);
+
 /// From a monochrome row: `one` where it is white, `zero` where it is black.
 void tintRow(DWORD* target, const DWORD* source, std::size_t count, DWORD one, DWORD zero);
 

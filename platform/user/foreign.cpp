@@ -2,6 +2,7 @@
 
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
+#include "platform/user/scale.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
 
@@ -25,6 +26,12 @@ using ReplyPointer = std::unique_ptr<Reply, decltype(&std::free)>;
 template <class Reply>
 ReplyPointer<Reply> own(Reply* reply) {
     return {reply, &std::free};
+}
+
+/// A size that the X server tells as ours: of what isn't whole there must be no strip left.
+QSize ourSize(int width, int height) {
+    const int scale = primaryScale();
+    return {(width + scale - 1) / scale, (height + scale - 1) / scale};
 }
 
 struct Host {
@@ -51,7 +58,7 @@ class HostFilter : public QAbstractNativeEventFilter {
             break;
         case XCB_CONFIGURE_NOTIFY: {
             const auto* configured = reinterpret_cast<const xcb_configure_notify_event_t*>(event);
-            resized(configured->window, {configured->width, configured->height});
+            resized(configured->window, ourSize(configured->width, configured->height));
             break;
         }
         default:
@@ -160,7 +167,8 @@ bool foreignSize(HWND window, SIZE& size) {
     if (geometry == nullptr) {
         return false;
     }
-    size = {geometry->width, geometry->height};
+    const QSize ours = ourSize(geometry->width, geometry->height);
+    size = {ours.width(), ours.height()};
     return true;
 }
 

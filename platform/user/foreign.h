@@ -13,7 +13,7 @@ inline bool mayBeForeign(HWND window) {
 
 bool foreignExists(HWND window);
 
-/// Its size in pixels; false if it is none.
+/// Its size in pixels of ours, the last of which may lie half outside; false if it is none.
 bool foreignSize(HWND window, SIZE& size);
 
 /// From now on the end of `parent`, or of our window `child` in it, posts WM_CLOSE to `child`, and

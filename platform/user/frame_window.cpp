@@ -120,8 +120,8 @@ void FrameWindow::paintEvent(QPaintEvent* event) {
         const QRect inner = area & image_.rect().translated(clientCorner);
         painter.drawImage(inner, image_, inner.translated(-clientCorner));
     }
-    painter.setPen(Qt::black);
-    painter.drawRect(rect().adjusted(0, 0, -1, -1));
+    painter.setClipRegion(QRegion(rect()) - image_.rect().translated(clientCorner));
+    painter.fillRect(rect(), Qt::black);
 }
 
 void FrameWindow::moveEvent(QMoveEvent* /*event*/) {

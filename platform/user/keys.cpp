@@ -6,6 +6,7 @@
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QWheelEvent>
+#include <QtMath>
 
 #include <algorithm>
 #include <array>
@@ -109,7 +110,8 @@ void queueKey(HWND window, const QKeyEvent& event, bool down) {
 }
 
 void queueMouse(HWND window, UINT message, const QMouseEvent& event, QPoint corner) {
-    const QPoint at = event.position().toPoint() - corner;
+    const QPointF in = event.position(); // a pixel's right half belongs to it
+    const QPoint at = QPoint(qFloor(in.x()), qFloor(in.y())) - corner;
     queueInput({window, message, buttonsOf(event.buttons()),
                 static_cast<LPARAM>(MAKELONG(at.x(), at.y())), 0});
 }

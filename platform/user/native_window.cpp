@@ -1,10 +1,12 @@
 #include "platform/user/native_window.h"
 
+#include "platform/gdi/rows.h"
 #include "platform/harness.h"
 #include "platform/user/clock.h"
 #include "platform/user/input_contexts.h"
 #include "platform/user/keys.h"
 #include "platform/user/queue.h"
+#include "platform/user/scale.h"
 #include "platform/user/screens.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
@@ -53,7 +55,16 @@ NativeWindow::NativeWindow(HWND owner, const QRect& place, Qt::WindowFlags flags
     resizePicture(place.size());
 }
 
+/// The store of a window without alpha has either form, and clears neither.
+bool NativeWindow::hasOurForm(const QImage& image) const {
+    return image.format() == QImage::Format_RGB32 ||
+           (image.format() == QImage::Format_ARGB32_Premultiplied && !requestedFormat().hasAlpha());
+}
+
 QImage* NativeWindow::storeImage() {
+    if (store_.size().isEmpty()) {
+        return nullptr; // it has no paint device to ask for
+    }
     return static_cast<QImage*>(store_.paintDevice());
 }
 
@@ -67,25 +78,61 @@ PixelView NativeWindow::pixels() {
     return {bits, image->width(), image->height(), static_cast<int>(image->bytesPerLine() / 4)};
 }
 
-void NativeWindow::touch(const RECT& area) {
-    const QRect rectangle = toQt(area);
+/// Before the pixels of the backing store change.
+void NativeWindow::awaitFetch(const QRect& area) {
     if (!clockIsManual() && clockNow() - flushed_ < fetchTime) {
-        store_.beginPaint(rectangle);
+        store_.beginPaint(area);
         store_.endPaint();
     }
+}
+
+void NativeWindow::touch(const RECT& area) {
+    if (shadow_.isNull()) {
+        awaitFetch(toQt(area));
+    }
     WindowPicture::touch(area);
+}
+
+void NativeWindow::showShadow(const QRect& area) {
+    awaitFetch(area); // which may make another image of the same pixels
+    QImage* image = storeImage();
+    if (image != nullptr && hasOurForm(*image)) {
+        enlargeInto(*image, area & shadow_.rect());
+        return;
+    }
+    store_.beginPaint(area);
+    QPainter(storeImage()).drawImage(area, shadow_, area);
+    store_.endPaint();
+}
+
+/// Each pixel becomes a square of whole ones.
+void NativeWindow::enlargeInto(QImage& target, const QRect& area) const {
+    const int scale = scaleOf(*this);
+    const auto count = static_cast<std::size_t>(area.width());
+    const qsizetype stride = target.bytesPerLine() / 4;
+    // Not bits(): see pixels().
+    auto* bits = reinterpret_cast<DWORD*>(const_cast<uchar*>(target.constBits()));
+    if ((area.right() + 1) * scale > target.width() ||
+        (area.bottom() + 1) * scale > target.height()) {
+        return; // of another scale: its screen has just changed, and all will be drawn anew
+    }
+    for (int y = area.top(); y <= area.bottom(); ++y) {
+        DWORD* const row = bits + y * scale * stride + area.left() * scale;
+        const auto* source = reinterpret_cast<const DWORD*>(shadow_.constScanLine(y));
+        widenRow(row, source + area.left(), count, static_cast<std::size_t>(scale));
+        for (int again = 1; again < scale; ++again) {
+            copyRow(row + again * stride, row, count * static_cast<std::size_t>(scale));
+        }
+    }
 }
 
 void NativeWindow::flush() {
     if (dirty_.isEmpty() || !isExposed()) {
         return; // the expose event that makes it visible shows all of it
     }
-    const QRect area = dirty_;
-    dirty_ = QRect();
+    const QRect area = std::exchange(dirty_, QRect());
     if (!shadow_.isNull()) {
-        store_.beginPaint(area);
-        QPainter(storeImage()).drawImage(area.topLeft(), shadow_, area);
-        store_.endPaint();
+        showShadow(area);
     }
     store_.flush(area);
     flushed_ = clockNow();
@@ -96,10 +143,10 @@ void NativeWindow::resizePicture(QSize size) {
     const QImage kept = copyPicture();
     shadow_ = QImage();
     store_.resize(size);
+    store_.beginPaint(QRect(QPoint(), size)); // which has its image ready where it is a larger one
+    store_.endPaint();
     const QImage* image = storeImage();
-    // The store of a window without alpha has either form, and clears neither.
-    if (image != nullptr && image->format() != QImage::Format_RGB32 &&
-        (image->format() != QImage::Format_ARGB32_Premultiplied || requestedFormat().hasAlpha())) {
+    if (image != nullptr && (scaleOf(*this) != 1 || !hasOurForm(*image))) {
         shadow_ = QImage(size, QImage::Format_RGB32);
         shadow_.fill(Qt::black);
     }

@@ -37,10 +37,15 @@ class NativeWindow : public QWindow, public WindowPicture {
     void focusOutEvent(QFocusEvent* event) override;
 
   private:
+    bool hasOurForm(const QImage& image) const;
     QImage* storeImage();
+    void awaitFetch(const QRect& area);
+    void showShadow(const QRect& area);
+    void enlargeInto(QImage& target, const QRect& area) const;
 
     QBackingStore store_;
-    QImage shadow_;            // the picture where the display's pixels have another form than ours
+    QImage shadow_;            // the picture where the display's pixels aren't ours: larger, or of
+                               // another form
     bool lent_ = false;        // a menu has the keyboard and will give it back
     std::int64_t flushed_ = 0; // when the server was last told to fetch pixels
 };

@@ -4,6 +4,7 @@
 #include "platform/user/frame_window.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
+#include "platform/user/scale.h"
 #include "platform/user/screens.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
@@ -51,7 +52,9 @@ std::optional<QCursor> readCursor(const QString& path) {
     const auto number = [&](qsizetype at) {
         return qFromLittleEndian<quint16>(file.constData() + hotSpotAt + at);
     };
-    return QCursor(picture, number(0), number(2));
+    // The toolkit leaves the pixels of a pointer's picture as they are.
+    const int scale = primaryScale();
+    return QCursor(picture.scaled(picture.size() * scale), number(0) * scale, number(2) * scale);
 }
 
 HCURSOR loadOwn(const char* name) {

@@ -4,6 +4,7 @@
 #include "platform/user/foreign.h"
 #include "platform/user/ordered_input.h"
 #include "platform/user/queue.h"
+#include "platform/user/scale.h"
 #include "platform/user/screens.h"
 #include "platform/user/sleep_lock.h"
 #include "platform/user/window.h"
@@ -129,13 +130,7 @@ bool makeToolkit() {
                      program_invocation_short_name);
         return false;
     }
-    // A pixel of ours is a pixel of the screen: the pictures are drawn for it.
-    qputenv("QT_ENABLE_HIGHDPI_SCALING", "0");
-    for (const char* variable :
-         {"QT_SCALE_FACTOR", "QT_SCREEN_SCALE_FACTORS", "QT_USE_PHYSICAL_DPI"}) {
-        qunsetenv(variable);
-    }
-    qputenv("QT_FONT_DPI", "96"); // and so is the style's
+    chooseScale();
     QApplication::setStyle(new ClassicStyle);
     QApplication::setPalette(classicPalette());
     // It lives as long as the process: windows may be destroyed by handlers of static objects.
