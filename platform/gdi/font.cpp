@@ -2,6 +2,8 @@
 
 #include "platform/gdi/objects.h"
 
+#include <QGuiApplication>
+
 #include <array>
 #include <cstdlib>
 #include <strings.h>
@@ -38,7 +40,12 @@ QFont makeFontOfCell(bool serif, bool bold, int cell) {
 } // namespace
 
 QFont dialogFont(int pixels) {
-    return makeFont(false, false, pixels);
+    QFont font = makeFont(false, false, pixels);
+    if (qGuiApp != nullptr && qGuiApp->devicePixelRatio() > 1) {
+        // Letters as wide as those of the smaller size, whose pixels are larger, would leave gaps.
+        font.setHintingPreference(QFont::PreferVerticalHinting);
+    }
+    return font;
 }
 
 const FontFace& Font::face() const {

@@ -9,6 +9,7 @@
 #include "platform/user/menus.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
+#include "platform/user/scale.h"
 #include "platform/user/text.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
@@ -63,7 +64,7 @@ std::optional<DialogTemplate> loadTemplate(HINSTANCE instance, ResourceName name
     if (text == nullptr) {
         return std::nullopt;
     }
-    auto made = parseDialogTemplate({text, SizeofResource(instance, found)});
+    auto made = parseDialogTemplate({text, SizeofResource(instance, found)}, dialogPercent());
     FreeResource(block);
     return made;
 }

@@ -50,7 +50,7 @@ constexpr StyleWord styleWords[] = {
 /// One line, taken apart from its start; once something is wrong, it stays wrong.
 class Line {
   public:
-    explicit Line(std::string_view text) : rest_(text) {
+    Line(std::string_view text, int percent) : rest_(text), percent_(percent) {
         skipBlanks();
     }
 
@@ -127,12 +127,12 @@ class Line {
         return letter == 't' ? '\t' : letter;
     }
 
-    static int across(int units) {
-        return (units * baseWidth + 2) / 4;
+    int across(int units) const {
+        return (units * baseWidth * percent_ + 200) / 400;
     }
 
-    static int down(int units) {
-        return (units * baseHeight + 4) / 8;
+    int down(int units) const {
+        return (units * baseHeight * percent_ + 400) / 800;
     }
 
     void skipBlanks() {
@@ -140,6 +140,7 @@ class Line {
     }
 
     std::string_view rest_;
+    int percent_;
     bool good_ = true;
 };
 
@@ -160,8 +161,13 @@ void readControl(Line& line, DialogTemplate& dialog) {
     dialog.controls.push_back(std::move(control));
 }
 
-bool readLine(std::string_view text, DialogTemplate& dialog) {
-    Line line(text);
+int fontPixels(int points, int percent) {
+    constexpr int whole = pointsOfAnInch * 100;
+    return (points * pixelsOfAnInch * percent + whole / 2) / whole;
+}
+
+bool readLine(std::string_view text, int percent, DialogTemplate& dialog) {
+    Line line(text, percent);
     if (line.atEnd()) {
         return true;
     }
@@ -170,7 +176,7 @@ bool readLine(std::string_view text, DialogTemplate& dialog) {
     if (first == "dialog") {
         readHead(start, dialog);
     } else if (first == "font") {
-        dialog.fontHeight = (start.number() * pixelsOfAnInch + pointsOfAnInch / 2) / pointsOfAnInch;
+        dialog.fontHeight = fontPixels(start.number(), percent);
         start.text();
     } else if (first == "menu") {
         dialog.menus.push_back({start.text(), {}});
@@ -187,11 +193,11 @@ bool readLine(std::string_view text, DialogTemplate& dialog) {
 
 } // namespace
 
-std::optional<DialogTemplate> parseDialogTemplate(std::string_view text) {
+std::optional<DialogTemplate> parseDialogTemplate(std::string_view text, int percent) {
     DialogTemplate dialog;
     while (!text.empty()) {
         const std::string_view line = text.substr(0, text.find('\n'));
-        if (!readLine(line, dialog)) {
+        if (!readLine(line, percent, dialog)) {
             return std::nullopt;
         }
         text.remove_prefix(std::min(line.size() + 1, text.size()));

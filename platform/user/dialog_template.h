@@ -61,6 +61,8 @@ struct DialogTemplate {
 /// for the ampersand and a colon, is the spoken name of a control stands for that control. Styles
 /// are the platform's in lower case without what stands before the underscore. Nothing if a line
 /// can't be read.
-std::optional<DialogTemplate> parseDialogTemplate(std::string_view text);
+///
+/// Places and fonts are enlarged to `percent`.
+std::optional<DialogTemplate> parseDialogTemplate(std::string_view text, int percent = 100);
 
 } // namespace seam

@@ -8,6 +8,7 @@
 #include "platform/user/dialog.h"
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
+#include "platform/user/scale.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/waker.h"
 #include "platform/user/window.h"
@@ -28,7 +29,7 @@ HandleTable<Menu>& table() {
     return *menus;
 }
 
-constexpr int menuFontHeight = 11; // pixels, as in dialogs
+constexpr int menuFontHeight = 11; // pixels, as in dialogs, before these are enlarged
 
 /// The one that is open.
 struct OpenMenu {
@@ -75,7 +76,7 @@ Menu* findMenu(HMENU menu) {
 }
 
 void fillMenu(QMenu& shown, const Menu& menu) {
-    shown.setFont(dialogFont(menuFontHeight));
+    shown.setFont(dialogFont(dialogLength(menuFontHeight)));
     for (const MenuItem& item : menu.items) {
         if ((item.flags & MF_SEPARATOR) != 0) {
             shown.addSeparator();
@@ -116,7 +117,7 @@ void fillMenuBar(QMenuBar& shown, HMENU bar, HWND window) {
     if (found == nullptr) {
         return;
     }
-    shown.setFont(dialogFont(menuFontHeight));
+    shown.setFont(dialogFont(dialogLength(menuFontHeight)));
     for (const MenuItem& item : found->items) {
         QMenu* popup = shown.addMenu(fromWindows1252(item.text.data(), item.text.size()));
         // Filled each time that it opens: items may have been enabled or greyed meanwhile.

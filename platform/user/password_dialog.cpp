@@ -2,6 +2,7 @@
 
 #include "platform/harness.h"
 #include "platform/user/password_store.h"
+#include "platform/user/scale.h"
 #include "platform/user/text.h"
 
 #include <QApplication>
@@ -69,7 +70,7 @@ PasswordDialog::PasswordDialog(HWND owner, const QString& title)
     for (QLabel* label : {text_, message_}) {
         label->setTextFormat(Qt::PlainText);
         label->setWordWrap(true);
-        label->setMinimumWidth(leastWidth);
+        label->setMinimumWidth(dialogLength(leastWidth));
         label->setMinimumHeight(fontMetrics().lineSpacing()); // room before there is a message
     }
     ok_->setDefault(true);

@@ -2,6 +2,7 @@
 #include "platform/gdi/encoding.h"
 #include "platform/user/controls/control.h"
 #include "platform/user/controls/item_painter.h"
+#include "platform/user/scale.h"
 #include "platform/user/text.h"
 #include "platform/user/window.h"
 
@@ -140,7 +141,7 @@ class ComboBox : public Control {
     /// The template's height is that of the open list; closed, the control is as high as an item.
     int height(int /*template's*/) override {
         const int item = itemHeight(static_cast<UINT>(-1));
-        const int closed = item + (drawn_ ? itemRoom : textRoom);
+        const int closed = item + dialogLength(drawn_ ? itemRoom : textRoom);
         if (drawn_) {
             box_->setItemDelegate(new DrawnRows(handle_, item, box_));
         }
@@ -207,11 +208,12 @@ class ComboBox : public Control {
         if (!drawn_ || window == nullptr) {
             return line;
         }
+        const auto plainLine = static_cast<UINT>(line * 100 / dialogPercent());
         MEASUREITEMSTRUCT measured{
-            ODT_COMBOBOX, static_cast<UINT>(window->id), item, 0, static_cast<UINT>(line), 0};
+            ODT_COMBOBOX, static_cast<UINT>(window->id), item, 0, plainLine, 0};
         SendMessageA(window->parent, WM_MEASUREITEM, static_cast<WPARAM>(window->id),
                      reinterpret_cast<LPARAM>(&measured));
-        return std::max(static_cast<int>(measured.itemHeight), 1);
+        return std::max(dialogLength(static_cast<int>(measured.itemHeight)), 1);
     }
 
     HWND handle_;

@@ -3,6 +3,7 @@
 
 #include "platform/gdi/encoding.h"
 #include "platform/user/icons.h"
+#include "platform/user/scale.h"
 #include "platform/user/text.h"
 
 #include <QLabel>
@@ -12,6 +13,8 @@
 namespace seam {
 
 namespace {
+
+constexpr int iconSize = 32;
 
 /// A line of one pixel round what the other controls stand on.
 void makeFrame(QLabel& label, const QColor& colour) {
@@ -37,7 +40,8 @@ Qt::Alignment alignmentOf(DWORD kind) {
 class Static : public Control {
   public:
     Static(const ControlTemplate& made, QWidget& dialog)
-        : label_(new QLabel(&dialog)), kind_(made.style & SS_TYPEMASK) {
+        : label_(new QLabel(&dialog)), kind_(made.style & SS_TYPEMASK),
+          oneLine_(made.place.height < 2 * label_->fontMetrics().lineSpacing()) {
         label_->setTextFormat(Qt::PlainText);
         label_->setMargin(0);
         switch (kind_) {
@@ -61,6 +65,12 @@ class Static : public Control {
         return *label_;
     }
 
+    /// A line's last word may be a little wider on a dense screen, where it would be cut.
+    int leastWidth() const override {
+        const QSize text = label_->fontMetrics().size(Qt::TextShowMnemonic, label_->text());
+        return oneLine_ && kind_ == SS_LEFT ? text.width() : 0;
+    }
+
     std::string text() const override {
         return toWindows1252(label_->text());
     }
@@ -72,14 +82,15 @@ class Static : public Control {
   private:
     /// An icon has its own size, whatever the template says.
     void showIcon(int number) {
-        constexpr int iconSize = 32;
+        const int size = dialogLength(iconSize);
         const HICON icon{static_cast<DWORD>(number)};
-        label_->setPixmap(iconOf(icon).pixmap(iconSize));
-        label_->setMinimumSize(iconSize, iconSize);
+        label_->setPixmap(iconOf(icon).pixmap(size));
+        label_->setMinimumSize(size, size);
     }
 
     QLabel* label_;
     DWORD kind_;
+    bool oneLine_;
 };
 
 } // namespace
