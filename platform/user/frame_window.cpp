@@ -2,6 +2,7 @@
 
 #include "platform/user/keys.h"
 #include "platform/user/queue.h"
+#include "platform/user/scale.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
 
@@ -12,8 +13,12 @@
 #include <QKeyEvent>
 #include <QMouseEvent>
 #include <QPainter>
+#include <QScreen>
 #include <QWheelEvent>
 #include <QWindow>
+
+#include <algorithm>
+#include <utility>
 
 namespace seam {
 
@@ -38,6 +43,7 @@ FrameWindow::FrameWindow(HWND owner, const QRect& place) : WindowPicture(owner) 
     moveTo(place);
     winId(); // makes its window
     windowHandle()->installEventFilter(this);
+    scale_ = scaleOf(*windowHandle());
 }
 
 PixelView FrameWindow::pixels() {
@@ -137,8 +143,31 @@ void FrameWindow::moveEvent(QMoveEvent* /*event*/) {
     queuePosted({owner_, WM_MOVE, 0, static_cast<LPARAM>(MAKELONG(corner.x(), corner.y())), 0});
 }
 
-/// A window manager that has its own idea of windows has given it another size.
+/// The toolkit keeps the size that it has on the server when it comes to a screen of another scale.
+/// About its middle: else it might go back to the screen that it comes from.
+void FrameWindow::keepSize() {
+    const QRect screen = windowHandle()->screen()->geometry();
+    QRect place(QPoint(), image_.size() + QSize(2 * border, 2 * border));
+    place.moveCenter(geometry().center());
+    place.moveRight(std::min(place.right(), screen.right()));
+    place.moveBottom(std::min(place.bottom(), screen.bottom()));
+    place.moveLeft(std::max(place.left(), screen.left()));
+    place.moveTop(std::max(place.top(), screen.top())); // what it is dragged by stays in reach
+    setMinimumSize(0, 0); // what the window manager knows of its size counts the server's pixels
+    setMaximumSize(QWIDGETSIZE_MAX, QWIDGETSIZE_MAX);
+    setFixedSize(place.size());
+    move(place.topLeft());
+    update();
+}
+
+/// A window manager that has its own idea of windows has given it another size, or it lies on
+/// another screen now.
 void FrameWindow::resizeEvent(QResizeEvent* event) {
+    if (std::exchange(scale_, scaleOf(*windowHandle())) != scaleOf(*windowHandle())) {
+        QMetaObject::invokeMethod(
+            this, [this] { keepSize(); }, Qt::QueuedConnection);
+        return;
+    }
     Window* window = findWindow(owner_);
     const QSize client = event->size() - QSize(2 * border, 2 * border);
     if (window != nullptr && image_.size() != client && !client.isEmpty()) {

@@ -45,8 +45,10 @@ class FrameWindow : public QWidget, public WindowPicture {
 
   private:
     void queueActivation(bool active);
+    void keepSize();
 
     QImage image_;
+    int scale_ = 1;              // of the screen that it has its size on
     std::optional<QPoint> grip_; // while it is dragged without a window manager: where, in it
 };
 

@@ -47,12 +47,13 @@ QRect toQt(const RECT& area) {
 } // namespace
 
 NativeWindow::NativeWindow(HWND owner, const QRect& place, Qt::WindowFlags flags, QWindow* parent)
-    : QWindow(parent), WindowPicture(owner), store_(this) {
+    : QWindow(parent), WindowPicture(owner) {
     setSurfaceType(QSurface::RasterSurface);
     setFlags(flags);
     setGeometry(place);
     create();
     resizePicture(place.size());
+    connect(this, &QWindow::screenChanged, this, [this] { followScale(); });
 }
 
 /// The store of a window without alpha has either form, and clears neither.
@@ -62,10 +63,7 @@ bool NativeWindow::hasOurForm(const QImage& image) const {
 }
 
 QImage* NativeWindow::storeImage() {
-    if (store_.size().isEmpty()) {
-        return nullptr; // it has no paint device to ask for
-    }
-    return static_cast<QImage*>(store_.paintDevice());
+    return store_ ? static_cast<QImage*>(store_->paintDevice()) : nullptr;
 }
 
 PixelView NativeWindow::pixels() {
@@ -81,8 +79,8 @@ PixelView NativeWindow::pixels() {
 /// Before the pixels of the backing store change.
 void NativeWindow::awaitFetch(const QRect& area) {
     if (!clockIsManual() && clockNow() - flushed_ < fetchTime) {
-        store_.beginPaint(area);
-        store_.endPaint();
+        store_->beginPaint(area);
+        store_->endPaint();
     }
 }
 
@@ -100,22 +98,18 @@ void NativeWindow::showShadow(const QRect& area) {
         enlargeInto(*image, area & shadow_.rect());
         return;
     }
-    store_.beginPaint(area);
+    store_->beginPaint(area);
     QPainter(storeImage()).drawImage(area, shadow_, area);
-    store_.endPaint();
+    store_->endPaint();
 }
 
 /// Each pixel becomes a square of whole ones.
 void NativeWindow::enlargeInto(QImage& target, const QRect& area) const {
-    const int scale = scaleOf(*this);
+    const int scale = scale_;
     const auto count = static_cast<std::size_t>(area.width());
     const qsizetype stride = target.bytesPerLine() / 4;
     // Not bits(): see pixels().
     auto* bits = reinterpret_cast<DWORD*>(const_cast<uchar*>(target.constBits()));
-    if ((area.right() + 1) * scale > target.width() ||
-        (area.bottom() + 1) * scale > target.height()) {
-        return; // of another scale: its screen has just changed, and all will be drawn anew
-    }
     for (int y = area.top(); y <= area.bottom(); ++y) {
         DWORD* const row = bits + y * scale * stride + area.left() * scale;
         const auto* source = reinterpret_cast<const DWORD*>(shadow_.constScanLine(y));
@@ -134,19 +128,21 @@ void NativeWindow::flush() {
     if (!shadow_.isNull()) {
         showShadow(area);
     }
-    store_.flush(area);
+    store_->flush(area);
     flushed_ = clockNow();
     pictureShown(owner_);
 }
 
 void NativeWindow::resizePicture(QSize size) {
     const QImage kept = copyPicture();
+    scale_ = scaleOf(*this);
     shadow_ = QImage();
-    store_.resize(size);
-    store_.beginPaint(QRect(QPoint(), size)); // which has its image ready where it is a larger one
-    store_.endPaint();
+    store_.emplace(this); // a new one: of an old one the toolkit may keep an image of freed pixels
+    store_->resize(size);
+    store_->beginPaint(QRect(QPoint(), size)); // which has its image ready where it is a larger one
+    store_->endPaint();
     const QImage* image = storeImage();
-    if (image != nullptr && (scaleOf(*this) != 1 || !hasOurForm(*image))) {
+    if (image != nullptr && (scale_ != 1 || !hasOurForm(*image))) {
         shadow_ = QImage(size, QImage::Format_RGB32);
         shadow_.fill(Qt::black);
     }
@@ -187,6 +183,22 @@ void NativeWindow::resizeEvent(QResizeEvent* event) {
     }
     resizePicture(event->size());
     windowResized(*window, event->size().width(), event->size().height());
+}
+
+/// On a screen of another scale. Where it lies in a window of ours, that one keeps its size in our
+/// pixels, and so does this; the toolkit would keep its size on the server.
+void NativeWindow::followScale() {
+    const seam::Window* window = findWindow(owner_);
+    if (window == nullptr || scaleOf(*this) == scale_) {
+        return;
+    }
+    const QSize size(window->width(), window->height());
+    resizePicture(size);
+    if (parent() != nullptr) {
+        const QPoint corner = QPoint(window->place.left, window->place.top) + originOf(*window);
+        placeOnServer(*this, {corner * scale_, size * scale_});
+    }
+    dirty_ = QRect(QPoint(), size);
 }
 
 void NativeWindow::keyPressEvent(QKeyEvent* event) {

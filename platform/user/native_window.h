@@ -9,6 +9,7 @@
 #include <QWindow>
 
 #include <cstdint>
+#include <optional>
 
 namespace seam {
 
@@ -39,13 +40,15 @@ class NativeWindow : public QWindow, public WindowPicture {
   private:
     bool hasOurForm(const QImage& image) const;
     QImage* storeImage();
+    void followScale();
     void awaitFetch(const QRect& area);
     void showShadow(const QRect& area);
     void enlargeInto(QImage& target, const QRect& area) const;
 
-    QBackingStore store_;
+    std::optional<QBackingStore> store_;
     QImage shadow_;            // the picture where the display's pixels aren't ours: larger, or of
                                // another form
+    int scale_ = 1;            // of the screen that the picture has been made for
     bool lent_ = false;        // a menu has the keyboard and will give it back
     std::int64_t flushed_ = 0; // when the server was last told to fetch pixels
 };

@@ -1,5 +1,7 @@
 #include "platform/user/scale.h"
 
+#include "platform/user/toolkit.h"
+
 #include <QGuiApplication>
 #include <QScreen>
 #include <QWindow>
@@ -8,7 +10,10 @@
 #include <charconv>
 #include <cmath>
 #include <cstdio>
+#include <cstdlib>
+#include <memory>
 #include <optional>
+#include <xcb/xcb.h>
 
 namespace seam {
 
@@ -75,6 +80,19 @@ void fixScale(int scale) {
     qputenv(allVariable, QByteArray::number(scale));
 }
 
+/// Of the X server's whole display, in its pixels; none without a server.
+QSize displaySize() {
+    xcb_connection_t* connection = xConnection();
+    if (connection == nullptr) {
+        return {};
+    }
+    const xcb_window_t root = xcb_setup_roots_iterator(xcb_get_setup(connection)).data->root;
+    const std::unique_ptr<xcb_get_geometry_reply_t, decltype(&std::free)> geometry(
+        xcb_get_geometry_reply(connection, xcb_get_geometry(connection, root), nullptr),
+        &std::free);
+    return geometry == nullptr ? QSize() : QSize(geometry->width, geometry->height);
+}
+
 int whole(double ratio) {
     return std::max(static_cast<int>(std::lround(ratio)), 1);
 }
@@ -99,6 +117,35 @@ int scaleOf(const QScreen& screen) {
 
 int primaryScale() {
     return scaleOf(*QGuiApplication::primaryScreen());
+}
+
+QRect serverPlace(const QScreen& screen) {
+    const QRect ours = screen.geometry();
+    const int scale = scaleOf(screen);
+    QRect place(ours.topLeft(), ours.size() * scale);
+    const QSize display = displaySize();
+    if (std::abs(display.width() - 1 - place.right()) < scale) {
+        place.setRight(display.width() - 1);
+    }
+    if (std::abs(display.height() - 1 - place.bottom()) < scale) {
+        place.setBottom(display.height() - 1);
+    }
+    return place;
+}
+
+void placeOnServer(QWindow& window, const QRect& place) {
+    xcb_connection_t* connection = xConnection();
+    if (connection == nullptr) {
+        window.setGeometry(place);
+        return;
+    }
+    const std::uint32_t values[] = {
+        static_cast<std::uint32_t>(place.x()), static_cast<std::uint32_t>(place.y()),
+        static_cast<std::uint32_t>(place.width()), static_cast<std::uint32_t>(place.height())};
+    xcb_configure_window(connection, static_cast<xcb_window_t>(window.winId()),
+                         XCB_CONFIG_WINDOW_X | XCB_CONFIG_WINDOW_Y | XCB_CONFIG_WINDOW_WIDTH |
+                             XCB_CONFIG_WINDOW_HEIGHT,
+                         static_cast<const std::uint32_t*>(values));
 }
 
 int dialogPercent() {

@@ -3,6 +3,7 @@
 // dialogs, boxes and menus larger, and nothing else.
 #pragma once
 
+class QRect;
 class QScreen;
 class QWindow;
 
@@ -19,6 +20,14 @@ int scaleOf(const QScreen& screen);
 
 /// That of the primary screen.
 int primaryScale();
+
+/// What a screen covers, in the X server's pixels. The toolkit keeps its corner as it is there, but
+/// rounds its size: where it ends with the display this is exact.
+QRect serverPlace(const QScreen& screen);
+
+/// Gives a window its place in the X server's pixels: ours may differ from one monitor to the
+/// other. Without a server its place in ours.
+void placeOnServer(QWindow& window, const QRect& place);
 
 /// How large dialogs are, for 100 at 96 dots to the inch; never less.
 int dialogPercent();

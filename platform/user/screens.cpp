@@ -31,10 +31,6 @@ constexpr int raiseMilliseconds = 100;
 /// The time that a window manager may take to give a new window the keyboard.
 constexpr int settleMilliseconds = 500;
 
-xcb_window_t rootWindow() {
-    return xcb_setup_roots_iterator(xcb_get_setup(xConnection())).data->root;
-}
-
 /// Puts a window right below another one; both are out of the window manager's hands.
 void putBelow(QWindow& window, QWindow& upper) {
     xcb_connection_t* connection = xConnection();
@@ -60,30 +56,6 @@ void raiseAll() {
     }
 }
 
-using Geometry = std::unique_ptr<xcb_get_geometry_reply_t, decltype(&std::free)>;
-
-/// What a screen covers in the X server's pixels. The toolkit keeps its corner as it is there, but
-/// rounds its size: at the display's edges the server knows better.
-QRect placeOnServer(const QScreen& screen) {
-    const QRect ours = screen.geometry();
-    const int scale = scaleOf(screen);
-    QRect place(ours.topLeft(), ours.size() * scale);
-    xcb_connection_t* connection = xConnection();
-    const Geometry display(connection == nullptr
-                               ? nullptr
-                               : xcb_get_geometry_reply(connection,
-                                                        xcb_get_geometry(connection, rootWindow()),
-                                                        nullptr),
-                           &std::free);
-    if (display != nullptr && std::abs(display->width - 1 - place.right()) < scale) {
-        place.setRight(display->width - 1);
-    }
-    if (display != nullptr && std::abs(display->height - 1 - place.bottom()) < scale) {
-        place.setBottom(display->height - 1);
-    }
-    return place;
-}
-
 /// One black window behind the saver's, as large as all monitors together. The X server paints it:
 /// it has no picture of its own.
 class Cover : public QWindow {
@@ -92,7 +64,7 @@ class Cover : public QWindow {
         setFlags(Qt::Window | Qt::FramelessWindowHint | Qt::WindowStaysOnTopHint |
                  Qt::X11BypassWindowManagerHint | Qt::WindowDoesNotAcceptFocus);
         create();
-        lieOn(place);
+        placeOnServer(*this, place);
         if (xcb_connection_t* connection = xConnection()) {
             const auto id = static_cast<xcb_window_t>(winId());
             const std::uint32_t black = 0;
@@ -101,22 +73,6 @@ class Cover : public QWindow {
         putBelow(*this, front);
         applyCursor(*this);
         show();
-    }
-
-    /// In the X server's pixels: ours differ from one monitor to the other.
-    void lieOn(const QRect& place) {
-        xcb_connection_t* connection = xConnection();
-        if (connection == nullptr) {
-            setGeometry(place);
-            return;
-        }
-        const std::uint32_t values[] = {
-            static_cast<std::uint32_t>(place.x()), static_cast<std::uint32_t>(place.y()),
-            static_cast<std::uint32_t>(place.width()), static_cast<std::uint32_t>(place.height())};
-        xcb_configure_window(connection, static_cast<xcb_window_t>(winId()),
-                             XCB_CONFIG_WINDOW_X | XCB_CONFIG_WINDOW_Y | XCB_CONFIG_WINDOW_WIDTH |
-                                 XCB_CONFIG_WINDOW_HEIGHT,
-                             static_cast<const std::uint32_t*>(values));
     }
 
   protected:
@@ -220,7 +176,7 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
         if (connection == nullptr) {
             return;
         }
-        root_ = rootWindow();
+        root_ = xcb_setup_roots_iterator(xcb_get_setup(connection)).data->root;
         const std::unique_ptr<xcb_get_window_attributes_reply_t, decltype(&std::free)> now(
             xcb_get_window_attributes_reply(connection,
                                             xcb_get_window_attributes(connection, root_), nullptr),
@@ -241,7 +197,7 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
         }
         QRect all;
         for (const QScreen* screen : QGuiApplication::screens()) {
-            all |= placeOnServer(*screen);
+            all |= serverPlace(*screen);
         }
         if (QRect(primary->geometry().topLeft(), native_.size() * scaleOf(*primary))
                 .contains(all)) {
@@ -249,7 +205,7 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
         } else if (cover_ == nullptr) {
             cover_ = std::make_unique<Cover>(native_, all);
         } else {
-            cover_->lieOn(all);
+            placeOnServer(*cover_, all);
         }
     }
 
