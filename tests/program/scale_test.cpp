@@ -40,6 +40,14 @@ class Scaled : public ground::Run {
   protected:
     Scaled() : Run(screen) {}
 
+    void setMonitors() {
+        for (const char* monitor :
+             {"L 640/200x960/200+0+0 screen", "R 640/200x960/200+640+0 none"}) {
+            const std::string command = std::string("xrandr --setmonitor ") + monitor;
+            ASSERT_EQ(ground.command({"sh", "-c", command}), 0);
+        }
+    }
+
     void setDensity(int dots) {
         const std::string resource = "echo Xft.dpi: " + std::to_string(dots) + " | xrdb -merge";
         ASSERT_EQ(ground.command({"sh", "-c", resource}), 0);
@@ -121,12 +129,31 @@ TEST_F(Scaled, AHostOfAnOddSizeIsFilledAlsoWhenItGrows) {
     EXPECT_TRUE(preview.running());
 }
 
-TEST_F(Scaled, TheEditorKeepsItsLooksOnAMonitorOfAnotherScale) {
-    const auto setMonitor = [this](const char* name, const char* place, const char* output) {
-        ASSERT_EQ(ground.command({"xrandr", "--setmonitor", name, place, output}), 0);
+TEST_F(Scaled, NothingOfTheDisplayIsLeftUncovered) {
+    ASSERT_EQ(ground.command({"xsetroot", "-solid", "#336699"}), 0);
+    bare = ground.grab();
+    const auto isCovered = [this] {
+        const QImage shown = ground.grab();
+        bool covered = true;
+        for (int x = 0; x < screen.width(); ++x) {
+            covered = covered && shown.pixel(x, screen.height() - 1) != bare.pixel(0, 0);
+        }
+        return covered;
     };
-    setMonitor("L", "640/200x960/200+0+0", "screen");
-    setMonitor("R", "640/200x960/200+640+0", "none");
+    {
+        auto saver = ground.launch(saverWith("DORBO_SCALE=7")); // which leaves a row
+        EXPECT_TRUE(waitFor(isCovered, 5));
+    }
+    setMonitors();
+    for (const char* factors : {"2;1", "1;2"}) {
+        EXPECT_TRUE(waitFor([&] { return ground.grab() == bare; }, 5));
+        auto saver = ground.launch(saverWith(std::string("QT_SCREEN_SCALE_FACTORS=") + factors));
+        EXPECT_TRUE(waitFor(isCovered, 5)) << factors;
+    }
+}
+
+TEST_F(Scaled, TheEditorKeepsItsLooksOnAMonitorOfAnotherScale) {
+    setMonitors();
     auto words = saverWith("QT_SCREEN_SCALE_FACTORS=2;1");
     words.back() = "C";
     auto setup = ground.launch(words);
