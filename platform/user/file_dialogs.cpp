@@ -5,6 +5,7 @@
 #include "platform/kernel/paths.h"
 #include "platform/kernel/text.h"
 #include "platform/user/overlay.h"
+#include "platform/user/scale.h"
 #include "platform/user/text.h"
 #include "platform/user/toolkit.h"
 
@@ -75,6 +76,8 @@ class FileDialog : public Overlay<QFileDialog> {
   public:
     FileDialog(const OPENFILENAME& asked, AcceptMode mode)
         : Overlay(asked.hwndOwner), owner_(asked.hwndOwner), size_(asked.nMaxFile) {
+        constexpr int leastWidth = 426; // the toolkit's own where its texts are of plain size
+        setMinimumWidth(dialogLength(leastWidth));
         setOptions(DontUseNativeDialog | DontConfirmOverwrite | HideNameFilterDetails |
                    DontUseCustomDirectoryIcons);
         setAcceptMode(mode);

@@ -44,8 +44,9 @@ Probe probeDisplay() {
     return {xcb_connect(nullptr, nullptr), &xcb_disconnect};
 }
 
-/// The toolkit's classic look, but for two things: the room between a check box and its text, as
-/// texts are cut to the dialog units that they have; and what pictures of arrows are kept by. That
+/// The toolkit's classic look, but for three things: the room between a check box and its text, as
+/// texts are cut to the dialog units that they have; the icon of a box, which grows with its text;
+/// and what pictures of arrows are kept by. That
 /// would be the palette's number, which is another for each widget, and each opening of a dialog
 /// would leave its pictures and their names behind.
 class ClassicStyle : public QProxyStyle {
@@ -55,9 +56,16 @@ class ClassicStyle : public QProxyStyle {
     int pixelMetric(PixelMetric metric, const QStyleOption* option,
                     const QWidget* widget) const override {
         constexpr int spacing = 3;
-        return metric == PM_CheckBoxLabelSpacing || metric == PM_RadioButtonLabelSpacing
-                   ? spacing
-                   : QProxyStyle::pixelMetric(metric, option, widget);
+        const int plain = QProxyStyle::pixelMetric(metric, option, widget);
+        switch (metric) {
+        case PM_CheckBoxLabelSpacing:
+        case PM_RadioButtonLabelSpacing:
+            return dialogLength(spacing);
+        case PM_MessageBoxIconSize:
+            return dialogLength(plain);
+        default:
+            return plain;
+        }
     }
 
     void drawPrimitive(PrimitiveElement element, const QStyleOption* option, QPainter* painter,
