@@ -1,10 +1,12 @@
 // The pointer confined to a part of the screen. The X server knows how to confine it to a window
 // only, so there is one that nobody sees: it has no picture, and lies below all others.
 #include "platform/user.h"
+#include "platform/user/scale.h"
 #include "platform/user/toolkit.h"
 
 #include <QCoreApplication>
 #include <QEvent>
+#include <QSize>
 
 #include <cstdlib>
 #include <memory>
@@ -32,14 +34,18 @@ static void showArrow(xcb_connection_t* connection) {
 
 static void makeClipWindow(xcb_connection_t* connection, const RECT& area) {
     const xcb_screen_t& screen = *xcb_setup_roots_iterator(xcb_get_setup(connection)).data;
-    const QPoint corner = QPoint(area.left, area.top) + screenOrigin();
+    // Places on the server count its pixels, but for the primary screen's corner, which is the
+    // same.
+    const int scale = primaryScale();
+    const QPoint corner = QPoint(area.left, area.top) * scale + screenOrigin();
+    const QSize size = QSize(area.right - area.left, area.bottom - area.top) * scale;
     const std::uint32_t overrides = 1; // out of the window manager's hands
     clipWindow = xcb_generate_id(connection);
-    xcb_create_window(
-        connection, 0, clipWindow, screen.root, static_cast<std::int16_t>(corner.x()),
-        static_cast<std::int16_t>(corner.y()), static_cast<std::uint16_t>(area.right - area.left),
-        static_cast<std::uint16_t>(area.bottom - area.top), 0, XCB_WINDOW_CLASS_INPUT_ONLY,
-        XCB_COPY_FROM_PARENT, XCB_CW_OVERRIDE_REDIRECT, &overrides);
+    xcb_create_window(connection, 0, clipWindow, screen.root, static_cast<std::int16_t>(corner.x()),
+                      static_cast<std::int16_t>(corner.y()),
+                      static_cast<std::uint16_t>(size.width()),
+                      static_cast<std::uint16_t>(size.height()), 0, XCB_WINDOW_CLASS_INPUT_ONLY,
+                      XCB_COPY_FROM_PARENT, XCB_CW_OVERRIDE_REDIRECT, &overrides);
     showArrow(connection);
     const std::uint32_t below = XCB_STACK_MODE_BELOW;
     xcb_configure_window(connection, clipWindow, XCB_CONFIG_WINDOW_STACK_MODE, &below);
