@@ -6,6 +6,11 @@ install(TARGETS dorbo toon_tool RUNTIME DESTINATION ${CMAKE_INSTALL_BINDIR})
 get_target_property(DORBO_TOON_FILES toons TOONS)
 install(FILES ${DORBO_TOON_FILES} DESTINATION ${CMAKE_INSTALL_DATADIR}/dorbo/toons)
 
+# Launchers, and where hosts of savers look for theirs.
+install(TARGETS dorbo_start RUNTIME DESTINATION ${CMAKE_INSTALL_LIBEXECDIR}/dorbo)
+install(TARGETS dorbo_hack RUNTIME DESTINATION ${CMAKE_INSTALL_LIBEXECDIR}/xscreensaver)
+install(FILES launch/dorbo-hack.xml DESTINATION ${CMAKE_INSTALL_DATADIR}/xscreensaver/config)
+
 # add_packed(FILE DIRECTORY NAME): installs a file packed, without name and time, so that the same
 # file gives the same bytes.
 find_program(GZIP gzip REQUIRED)
