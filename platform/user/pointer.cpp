@@ -86,6 +86,9 @@ QCursor cursorInForce() {
 }
 
 void applyToAll() {
+    if (qGuiApp == nullptr) {
+        return; // there is no window yet
+    }
     const QCursor cursor = cursorInForce();
     forEachWindow([&](Window& window) {
         if (window.frame) {
