@@ -43,13 +43,15 @@ class Editing : public Run {
 
     Editing() : Run(screen.size()) {}
 
+    std::string activeTitle() const {
+        const std::string ask = "xdotool getactivewindow getwindowname 2>&1";
+        return ground.launch({"sh", "-c", ask}).readLine();
+    }
+
     /// Waits until the window has the keyboard; opens it by a key, which may come too early.
     void waitForWindow(const std::string& title, const std::string& key = "") {
         std::string active;
-        const std::string ask = "xdotool getactivewindow getwindowname 2>&1";
-        const auto comesUp = [&] {
-            return (active = ground.launch({"sh", "-c", ask}).readLine()) == title;
-        };
+        const auto comesUp = [&] { return (active = activeTitle()) == title; };
         const auto opened = [&] {
             return (key.empty() || ground.command({"xdotool", "key", key}) == 0) &&
                    waitFor(comesUp, 1);
@@ -84,7 +86,11 @@ class Editing : public Run {
 
     /// From the setup, which has been started.
     void openFrameEditor() {
-        ground.command({"xdotool", "search", "--sync", "--name", "Rematch", "windowactivate"});
+        ASSERT_TRUE(waitFor([&] {
+            return ground.command({"xdotool", "search", "--name", "Rematch", "windowactivate"}) ==
+                       0 &&
+                   activeTitle() == "Fenky Dorbo's Rematch";
+        }));
         waitForWindow(editor, "alt+e");
         const QRect leftEdge(25, 142, 40, 180);
         ASSERT_TRUE(waitFor([&] { return isEmpty("bg01", leftEdge); }));
