@@ -5,6 +5,7 @@
 #include "cli/options.h"
 
 #include "editor/editor_shell.h"
+#include "launch/toon_home.h"
 #include "platform/kernel.h"
 #include "platform/kernel/paths.h"
 #include "platform/user/toolkit.h"
@@ -28,10 +29,12 @@ namespace fs = std::filesystem;
 constexpr int refused = 1;
 
 /// Says why nothing is shown: on stderr, and in a box where nobody reads that, as after a
-/// double-click on a desktop.
+/// double-click on a desktop, where no terminal is near.
 int Refuse(const char* command, const std::string& why) {
     std::fprintf(stderr, "toon %s: %s\n", command, why.c_str());
-    if (isatty(STDERR_FILENO) == 0 && std::getenv("DISPLAY") != nullptr) {
+    const bool read =
+        isatty(STDIN_FILENO) != 0 || isatty(STDOUT_FILENO) != 0 || isatty(STDERR_FILENO) != 0;
+    if (!read && std::getenv("DISPLAY") != nullptr) {
         MessageBoxA(nullptr, why.c_str(), "Dorbo", MB_ICONEXCLAMATION);
     }
     return refused;
@@ -90,6 +93,19 @@ std::string EditorPath(const std::string& file, std::string& path) {
     return path.size() < TOON_PATH_SIZE ? "" : file + ": its path is longer than 255 bytes";
 }
 
+/// The first run of all notes where the user's Toons lie, which isn't where he happens to be.
+void NoteToonDirectory() {
+    if (SettingsNameDirectory()) {
+        return;
+    }
+    std::error_code ignored;
+    const fs::path here = fs::current_path(ignored);
+    EnterToonHome();
+    SettingsLoad();
+    SettingsSave();
+    fs::current_path(here, ignored);
+}
+
 } // namespace
 
 int PlayToonCommand(const std::vector<std::string>& arguments) {
@@ -106,9 +122,8 @@ int PlayToonCommand(const std::vector<std::string>& arguments) {
     if (!seam::toolkit()) {
         return refused;
     }
-    // A first run notes where the user's Toons lie, and that is where it was started.
+    NoteToonDirectory();
     SettingsLoad();
-    SettingsSave();
     return PlayCopy(CopyInMemory(toon));
 }
 
@@ -126,5 +141,6 @@ int EditToonCommand(const std::vector<std::string>& arguments) {
     if (!seam::toolkit()) {
         return refused;
     }
+    NoteToonDirectory();
     return RunEditorWith(GetModuleHandleA(nullptr), nullptr, SW_SHOWNORMAL, path.c_str());
 }

@@ -32,11 +32,11 @@ static int Fail(int code, const std::string& why) {
 }
 
 static int ShowIn(const HackRequest& request) {
-    const HWND host =
-        request.target == HackTarget::DESKTOP ? GetDesktopWindow() : HWND{request.window};
-    if (!host) {
+    const HWND desktop = GetDesktopWindow();
+    if (!desktop) {
         return EXIT_NO_WINDOW; // there is no display, which has been said
     }
+    const HWND host = request.target == HackTarget::DESKTOP ? desktop : HWND{request.window};
     if (!IsWindow(host)) {
         char id[16];
         std::snprintf(id, sizeof id, "0x%x", host.number);

@@ -50,6 +50,12 @@ static void ReadFallback(char* fallback) {
     CopyDirectory(fallback, current);
 }
 
+bool SettingsNameDirectory() {
+    char value[2] = "";
+    return GetPrivateProfileStringA(SETTINGS_SECTION, DIRECTORY_KEY, "", value, sizeof value,
+                                    SETTINGS_FILE) != 0;
+}
+
 static void ReadDirectory(const char* fallback) {
     // Two bytes more than Directory has, so that a value that doesn't fit shows as one.
     char value[DIRECTORY_SIZE + 2] = "";

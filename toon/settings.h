@@ -19,6 +19,9 @@ extern char Directory[DIRECTORY_SIZE]; // of the Toons, ends in a backslash; loa
 /// backslash.
 void SettingsLoad();
 
+/// Whether the file names a directory; the first save of all makes it.
+bool SettingsNameDirectory();
+
 /// Writes all values. A write that fails leaves the file as it was.
 void SettingsSave();
 

@@ -13,6 +13,7 @@
 #include <QKeyEvent>
 #include <QMessageBox>
 
+#include <cerrno>
 #include <cstdio>
 #include <exception>
 #include <memory>
@@ -106,7 +107,7 @@ int MessageBoxA(HWND owner, const char* text, const char* caption, UINT type) {
     }
     const bool asks = (type & 0xFU) == MB_YESNOCANCEL;
     if (liesInHost(owner)) {
-        std::fprintf(stderr, "dorbo: %s\n", text);
+        std::fprintf(stderr, "%s: %s\n", program_invocation_short_name, text);
         return asks ? IDCANCEL : IDOK;
     }
     // On the heap and without a parent: the owner may be destroyed while the box is up.
