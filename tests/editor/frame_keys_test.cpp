@@ -2,7 +2,6 @@
 // openings of the dialogs leave behind.
 #include "tests/editor/frame_fixture.h"
 
-#include "platform/user/activation.h"
 #include "platform/user/queue.h"
 #include "platform/user/window.h"
 
@@ -37,7 +36,7 @@ class FrameKeys : public FrameEditorTest {
 
     static void inTurn(std::vector<Step> steps) {
         if (!steps.empty()) {
-            if (!seam::keyboardIsOnItsWay() && steps.front()()) {
+            if (steps.front()()) {
                 steps.erase(steps.begin());
             }
             QTimer::singleShot(10, [steps] { inTurn(steps); });
