@@ -33,7 +33,6 @@ static void showArrow(xcb_connection_t* connection) {
 }
 
 static void makeClipWindow(xcb_connection_t* connection, const RECT& area) {
-    const xcb_screen_t& screen = *xcb_setup_roots_iterator(xcb_get_setup(connection)).data;
     // Places on the server count its pixels, but for the primary screen's corner, which is the
     // same.
     const int scale = primaryScale();
@@ -41,8 +40,8 @@ static void makeClipWindow(xcb_connection_t* connection, const RECT& area) {
     const QSize size = QSize(area.right - area.left, area.bottom - area.top) * scale;
     const std::uint32_t overrides = 1; // out of the window manager's hands
     clipWindow = xcb_generate_id(connection);
-    xcb_create_window(connection, 0, clipWindow, screen.root, static_cast<std::int16_t>(corner.x()),
-                      static_cast<std::int16_t>(corner.y()),
+    xcb_create_window(connection, 0, clipWindow, rootWindow(connection),
+                      static_cast<std::int16_t>(corner.x()), static_cast<std::int16_t>(corner.y()),
                       static_cast<std::uint16_t>(size.width()),
                       static_cast<std::uint16_t>(size.height()), 0, XCB_WINDOW_CLASS_INPUT_ONLY,
                       XCB_COPY_FROM_PARENT, XCB_CW_OVERRIDE_REDIRECT, &overrides);

@@ -103,10 +103,6 @@ HostFilter& hostFilter() {
     return *filter;
 }
 
-xcb_window_t rootOf(xcb_connection_t* connection) {
-    return xcb_setup_roots_iterator(xcb_get_setup(connection)).data->root;
-}
-
 /// The number of a name; XCB_ATOM_NONE if nobody has used it yet.
 xcb_atom_t atomOf(xcb_connection_t* connection, std::string_view name) {
     const auto request =
@@ -180,7 +176,7 @@ bool windowsAreManaged() {
     // A window manager tells of itself by a property of the root window, which outlives it: the id
     // of a window that doesn't.
     const xcb_atom_t check = atomOf(connection, "_NET_SUPPORTING_WM_CHECK");
-    return foreignExists(HWND{windowProperty(connection, rootOf(connection), check)});
+    return foreignExists(HWND{windowProperty(connection, rootWindow(connection), check)});
 }
 
 HWND foreignDesktop() {
@@ -188,7 +184,7 @@ HWND foreignDesktop() {
     if (connection == nullptr) {
         return {};
     }
-    const xcb_window_t root = rootOf(connection);
+    const xcb_window_t root = rootWindow(connection);
     const xcb_atom_t virtualRoot = atomOf(connection, "__SWM_VROOT");
     if (virtualRoot != XCB_ATOM_NONE) {
         // It stands on the window itself, a child of the root window.

@@ -86,9 +86,9 @@ QSize displaySize() {
     if (connection == nullptr) {
         return {};
     }
-    const xcb_window_t root = xcb_setup_roots_iterator(xcb_get_setup(connection)).data->root;
     const std::unique_ptr<xcb_get_geometry_reply_t, decltype(&std::free)> geometry(
-        xcb_get_geometry_reply(connection, xcb_get_geometry(connection, root), nullptr),
+        xcb_get_geometry_reply(connection, xcb_get_geometry(connection, rootWindow(connection)),
+                               nullptr),
         &std::free);
     return geometry == nullptr ? QSize() : QSize(geometry->width, geometry->height);
 }

@@ -176,7 +176,7 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
         if (connection == nullptr) {
             return;
         }
-        root_ = xcb_setup_roots_iterator(xcb_get_setup(connection)).data->root;
+        root_ = rootWindow(connection);
         const std::unique_ptr<xcb_get_window_attributes_reply_t, decltype(&std::free)> now(
             xcb_get_window_attributes_reply(connection,
                                             xcb_get_window_attributes(connection, root_), nullptr),

@@ -46,9 +46,8 @@ Probe probeDisplay() {
 
 /// The toolkit's classic look, but for three things: the room between a check box and its text, as
 /// texts are cut to the dialog units that they have; the icon of a box, which grows with its text;
-/// and what pictures of arrows are kept by. That
-/// would be the palette's number, which is another for each widget, and each opening of a dialog
-/// would leave its pictures and their names behind.
+/// and what pictures of arrows are kept by. That would be the palette's number, which is another
+/// for each widget, and each opening of a dialog would leave its pictures and their names behind.
 class ClassicStyle : public QProxyStyle {
   public:
     ClassicStyle() : QProxyStyle(QStringLiteral("windows")) {}
@@ -167,6 +166,10 @@ xcb_connection_t* xConnection() {
     }
     auto* x11 = qGuiApp->nativeInterface<QNativeInterface::QX11Application>();
     return x11 == nullptr ? nullptr : x11->connection();
+}
+
+std::uint32_t rootWindow(xcb_connection_t* connection) {
+    return xcb_setup_roots_iterator(xcb_get_setup(connection)).data->root;
 }
 
 } // namespace seam
