@@ -1,5 +1,6 @@
 // Copies of rectangles by the three raster operations, plain and stretched.
 #include "platform/gdi/canvas.h"
+#include "platform/gdi/objects.h"
 #include "platform/gdi/rows.h"
 
 #include <algorithm>
@@ -123,6 +124,52 @@ void copySpans(const End& target, const End& source, const Span& across, const S
     }
 }
 
+/// The bitmap that a context has, as long as it is a mosaic; else null.
+Bitmap* mosaicOf(const DeviceContext& context) {
+    auto* const bitmap = context.ofWindow ? nullptr : findObjectAs<Bitmap>(context.state.bitmap);
+    return bitmap != nullptr && bitmap->mosaic != nullptr ? bitmap : nullptr;
+}
+
+/// Lays a whole tile on a mosaic; false if that isn't what is to be copied.
+bool layTile(const DeviceContext& target, int x, int y, int width, int height,
+             const DeviceContext& source, int sourceX, int sourceY) {
+    Bitmap* const bitmap = mosaicOf(target);
+    if (bitmap == nullptr || mosaicOf(source) != nullptr) {
+        return false;
+    }
+    const Canvas tile = canvasOf(source);
+    return !tile.monochrome && sourceX == 0 && sourceY == 0 && width == tile.view.width &&
+           height == tile.view.height && bitmap->mosaic->lay(tile.view, x, y);
+}
+
+/// Copies from a mosaic; false if it isn't whole, or if the target isn't of its form.
+bool copyMosaic(const DeviceContext& target, int x, int y, int width, int height,
+                const DeviceContext& source, int sourceX, int sourceY) {
+    const Bitmap* const bitmap = mosaicOf(source);
+    if (bitmap == nullptr || bitmap == mosaicOf(target) || !bitmap->mosaic->isWhole()) {
+        return false;
+    }
+    const Canvas canvas = canvasOf(target);
+    if (canvas.monochrome) {
+        return false;
+    }
+    Span across{x, sourceX, width};
+    Span down{y, sourceY, height};
+    across.clip(canvas.clip.left, canvas.clip.right, bitmap->width);
+    down.clip(canvas.clip.top, canvas.clip.bottom, bitmap->height);
+    if (across.length < 1 || down.length < 1) {
+        return true;
+    }
+    const RECT area = areaOf(across, down);
+    touch(canvas, area);
+    for (int row = 0; row < area.bottom - area.top; ++row) {
+        bitmap->mosaic->copyRow(canvas.at(area.left, area.top + row),
+                                static_cast<int>(across.source),
+                                static_cast<int>(down.source) + row, area.right - area.left);
+    }
+    return true;
+}
+
 /// Which pixels of the source a stretched run of target pixels shows, -1 for none.
 std::vector<int> stretchedPlaces(const Span& target, std::int64_t low, std::int64_t high,
                                  std::int64_t sourceExtent, std::int64_t sourceLength) {
@@ -198,6 +245,10 @@ BOOL BitBlt(HDC target, int x, int y, int width, int height, HDC source, int sou
     const RowOperation operate = rowOperation(operation);
     if (to == nullptr || from == nullptr || operate == nullptr) {
         return FALSE;
+    }
+    if (operation == SRCCOPY && (layTile(*to, x, y, width, height, *from, sourceX, sourceY) ||
+                                 copyMosaic(*to, x, y, width, height, *from, sourceX, sourceY))) {
+        return TRUE;
     }
     const End targetEnd{*to, canvasOf(*to)};
     const End sourceEnd{*from, canvasOf(*from)};

@@ -15,7 +15,7 @@ Canvas canvasOf(const DeviceContext& context) {
             canvas.view = context.surface->pixels();
         }
         canvas.clip = intersection(context.clip, RECT{0, 0, canvas.view.width, canvas.view.height});
-    } else if (const auto* bitmap = findObjectAs<Bitmap>(context.state.bitmap)) {
+    } else if (auto* bitmap = findObjectAs<Bitmap>(context.state.bitmap)) {
         canvas.view = bitmap->view();
         canvas.monochrome = bitmap->monochrome;
         if (context.state.bitmap != defaultBitmap()) {

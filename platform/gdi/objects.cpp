@@ -21,6 +21,9 @@ constexpr int stockObjectCount = 14;
 constexpr int largestSide = 32767;
 constexpr std::int64_t largestArea = std::int64_t{1} << 26;
 
+/// From so many pixels on a picture may be a mosaic.
+constexpr std::size_t mosaicFrom = std::size_t{1} << 18U;
+
 struct Objects {
     HandleTable<GdiObject> table{HandleKind::gdiObject};
     std::array<HGDIOBJ, stockObjectCount> stock{};
@@ -86,7 +89,16 @@ Bitmap makeBitmap(int width, int height, bool monochrome) {
         return {};
     }
     const auto count = static_cast<std::size_t>(width) * static_cast<std::size_t>(height);
-    return {width, height, monochrome, makePixels(count)};
+    return {width, height, monochrome, makePixels(count), nullptr};
+}
+
+PixelView Bitmap::view() {
+    const PixelView all{pixels.get(), width, height, width};
+    if (mosaic != nullptr) {
+        mosaic->writeTo(all);
+        mosaic.reset();
+    }
+    return all;
 }
 
 void countGdiHandles(HandleCounts& counts) {
@@ -97,13 +109,14 @@ void countGdiHandles(HandleCounts& counts) {
 
 Picture bitmapPicture(HBITMAP bitmap) {
     Picture picture;
-    if (const auto* found = findObjectAs<Bitmap>(bitmap)) {
+    if (auto* found = findObjectAs<Bitmap>(bitmap)) {
         const DWORD meaning = found->monochrome ? 1 : 0x00FFFFFF;
         picture.width = found->width;
         picture.height = found->height;
         const auto count =
             static_cast<std::size_t>(found->width) * static_cast<std::size_t>(found->height);
-        picture.pixels.assign(found->pixels.get(), found->pixels.get() + count);
+        const DWORD* const pixels = found->view().bits;
+        picture.pixels.assign(pixels, pixels + count);
         for (DWORD& pixel : picture.pixels) {
             pixel &= meaning;
         }
@@ -139,8 +152,12 @@ HBITMAP CreateCompatibleBitmap(HDC dc, int width, int height) {
     if (!bitmap.pixels) {
         return {};
     }
-    fillRow(bitmap.pixels.get(), static_cast<std::size_t>(width) * static_cast<std::size_t>(height),
-            blackPixel);
+    const auto count = static_cast<std::size_t>(width) * static_cast<std::size_t>(height);
+    if (count < mosaicFrom || bitmap.monochrome) {
+        fillRow(bitmap.pixels.get(), count, blackPixel);
+    } else {
+        bitmap.mosaic = std::make_unique<Mosaic>(width, height);
+    }
     return HBITMAP{addObject(std::move(bitmap))};
 }
 

@@ -3,10 +3,12 @@
 
 #include "platform/gdi.h"
 #include "platform/gdi/font.h"
+#include "platform/gdi/mosaic.h"
 #include "platform/gdi/pixel_block.h"
 #include "platform/gdi/surface.h"
 #include "platform/handle_table.h"
 
+#include <memory>
 #include <variant>
 
 namespace seam {
@@ -15,11 +17,11 @@ struct Bitmap {
     int width = 0;
     int height = 0;
     bool monochrome = false;
-    PixelBlock pixels;
+    PixelBlock pixels;              // of any contents while there is a mosaic
+    std::unique_ptr<Mosaic> mosaic; // what the picture is instead, until somebody needs its pixels
 
-    PixelView view() const {
-        return {pixels.get(), width, height, width};
-    }
+    /// The pixels, to be read and changed.
+    PixelView view();
 };
 
 /// A line one pixel wide; the null pen isn't visible.

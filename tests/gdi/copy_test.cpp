@@ -2,6 +2,7 @@
 #include "tests/gdi/pictures.h"
 
 #include <climits>
+#include <functional>
 #include <gtest/gtest.h>
 
 using namespace test;
@@ -113,4 +114,66 @@ TEST(Copy, WithinOneBitmapGivesWhatStoodBefore) {
     EXPECT_EQ(memory.text(), Rows{"RYG."});
     StretchBlt(memory.dc, 0, 0, 4, 1, memory.dc, 0, 0, 2, 1, SRCCOPY);
     EXPECT_EQ(memory.text(), Rows{"RRYY"});
+}
+
+/// A large bitmap, which is kept as its tile while it can be, or one that has its pixels at once.
+static HBITMAP makeLarge(const Memory& context, bool withPixels) {
+    constexpr int width = 700;
+    constexpr int height = 400;
+    const HBITMAP bitmap = CreateCompatibleBitmap(context.dc, width, height);
+    if (withPixels) {
+        seam::bitmapPicture(bitmap);
+    }
+    SelectObject(context.dc, bitmap);
+    return bitmap;
+}
+
+TEST(Copy, ATiledBitmapIsWhatItsPixelsWouldBe) {
+    const Memory tile({"RGB", "YWM"});
+    const Memory other({"RGB", "YWx"});
+
+    const struct {
+        const char* name;
+        int tilesUntil; // the row
+        std::function<void(HDC)> then;
+    } cases[] = {
+        {"tiled", 400, [](HDC) {}},
+        {"half of it", 201, [](HDC) {}},
+        {"a row that isn't done", 200,
+         [&](HDC dc) { BitBlt(dc, 0, 200, 3, 2, tile.dc, 0, 0, SRCCOPY); }},
+        {"out of turn", 200, [&](HDC dc) { BitBlt(dc, 3, 200, 3, 2, tile.dc, 0, 0, SRCCOPY); }},
+        {"another tile", 200, [&](HDC dc) { BitBlt(dc, 0, 200, 3, 2, other.dc, 0, 0, SRCCOPY); }},
+        {"a part of one", 200, [&](HDC dc) { BitBlt(dc, 0, 200, 2, 2, tile.dc, 0, 0, SRCCOPY); }},
+        {"from within one", 200, [&](HDC dc) { BitBlt(dc, 0, 200, 3, 2, tile.dc, 1, 0, SRCCOPY); }},
+        {"combined", 200, [&](HDC dc) { BitBlt(dc, 0, 200, 3, 2, tile.dc, 0, 0, SRCAND); }},
+        {"drawn on", 400, [](HDC dc) { Rectangle(dc, 1, 1, 5, 3); }},
+        {"over itself", 400, [](HDC dc) { BitBlt(dc, 1, 1, 6, 6, dc, 0, 0, SRCCOPY); }},
+    };
+
+    for (const auto& c : cases) {
+        seam::Picture pictures[2];
+        Rows seen[2];
+        for (const bool withPixels : {false, true}) {
+            const Memory context({"."});
+            const HBITMAP bitmap = makeLarge(context, withPixels);
+            for (int y = 0; y < c.tilesUntil; y += 2) {
+                for (int x = 0; x < 700; x += 3) {
+                    BitBlt(context.dc, x, y, 3, 2, tile.dc, 0, 0, SRCCOPY);
+                }
+            }
+            c.then(context.dc);
+            TestSurface window(plain(9, 6, 'c'), {1, 0, 8, 6});
+            BitBlt(window.dc, 0, 1, 8, 8, context.dc, 2, 197, SRCCOPY);
+            BitBlt(window.dc, 6, 0, 8, 2, context.dc, 697, 399, SRCCOPY);
+            const Memory mask({"0000"});
+            BitBlt(mask.dc, 0, 0, 4, 1, context.dc, 0, 0, SRCCOPY);
+            seen[withPixels] = window.text();
+            seen[withPixels].push_back(mask.text().front());
+            pictures[withPixels] = seam::bitmapPicture(bitmap);
+            SelectObject(context.dc, context.bitmap);
+            DeleteObject(bitmap);
+        }
+        EXPECT_EQ(seen[0], seen[1]) << c.name;
+        EXPECT_EQ(pictures[0].pixels, pictures[1].pixels) << c.name;
+    }
 }
