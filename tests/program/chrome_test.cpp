@@ -19,7 +19,8 @@ struct Looks {
     bool active = true;
     bool walking = false; // which disables all buttons but the last
     Button pressed = none;
-    int quarters = 0; // of the show
+    int quarters = 0;  // of the show
+    bool over = false; // and it has come to its end
 };
 
 class Chrome : public Run, public testing::WithParamInterface<QSize> {
@@ -29,6 +30,32 @@ class Chrome : public Run, public testing::WithParamInterface<QSize> {
     /// Finds a window that shows, by its title, and does something with it.
     bool window(const std::string& name, const std::string& what = "getwindowname") {
         return ground.command({"xdotool", "search", "--onlyvisible", "--name", name, what}) == 0;
+    }
+
+    void mouse(QPoint at, const std::vector<std::string>& then = {}) const {
+        std::vector<std::string> words{"xdotool", "mousemove", std::to_string(at.x()),
+                                       std::to_string(at.y())};
+        words.insert(words.end(), then.begin(), then.end());
+        ground.command(words);
+    }
+
+    void click(Button button) const {
+        mouse(client.topLeft() + sysButton(button).center(), {"click", "1"});
+    }
+
+    /// By its caption, as slowly as the window manager follows.
+    void drag(QPoint by, const Looks& looks) {
+        const QPoint grip = client.topLeft() + QPoint(60, 10);
+        mouse(grip, {"mousedown", "1"});
+        client.translate(by);
+        const auto follows = [&] {
+            mouse(grip + by / 2);
+            mouse(grip + by);
+            const QImage shown = ground.grab();
+            return difference(sketchOf(looks, barEnds(shown)), shown).empty();
+        };
+        EXPECT_TRUE(waitFor(follows)) << "dragged";
+        ground.command({"xdotool", "mouseup", "1"});
     }
 
     void activate(const std::string& name) {
@@ -67,8 +94,7 @@ class Chrome : public Run, public testing::WithParamInterface<QSize> {
     /// Presses a button and lets go of it elsewhere.
     void press(Button button, Looks looks) {
         const QPoint at = client.topLeft() + sysButton(button).center();
-        ground.command({"xdotool", "mousemove", std::to_string(at.x()), std::to_string(at.y()),
-                        "mousedown", "1"});
+        mouse(at, {"mousedown", "1"});
         looks.pressed = button;
         expect(looks, "pressed");
         ground.command({"xdotool", "mousemove_relative", "0", "60", "mouseup", "1"});
@@ -136,6 +162,9 @@ class Chrome : public Run, public testing::WithParamInterface<QSize> {
             box(sketch, edges(done, bottom - 31, right - 92, bottom - 12), 2, face);
             box(sketch, edges(92, bottom - 31, done, bottom - 12), -1, blue);
         }
+        if (looks.over) {
+            box(sketch, edges(92, bottom - 31, right - 92, bottom - 12), 2, face);
+        }
         drawCaption(sketch, looks, ends);
         return picture;
     }
@@ -151,8 +180,8 @@ class Chrome : public Run, public testing::WithParamInterface<QSize> {
     }
 
     const QImage sysButtons = loadPicture("sysbuts");
-    const QRect client{corner + QPoint(1, 1),
-                       GetParam() - QSize(50, 100) + QSize(20, 65)}; // stage and what is round it
+    QRect client{corner + QPoint(1, 1),
+                 GetParam() - QSize(50, 100) + QSize(20, 65)}; // stage and what is round it
 };
 
 TEST_P(Chrome, LooksAsDrawn) {
@@ -187,6 +216,15 @@ TEST_P(Chrome, LooksAsDrawn) {
         for (const int quarters : {1, 2, 3, 4}) {
             expect({.walking = true, .quarters = quarters}, "at a frame");
         }
+        const Looks rest{.quarters = 4, .over = true};
+        expect(rest, "he has gone again");
+        click(minimise);
+        EXPECT_TRUE(waitFor([&] { return !window(title); })) << "minimised";
+        ground.command({"xdotool", "search", "--name", title, "windowactivate"});
+        expect(rest, "back again");
+        drag({-9, 12}, rest);
+        click(close);
+        EXPECT_TRUE(waitFor([&] { return !window(title); })) << "closed";
     }
 }
 

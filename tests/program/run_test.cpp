@@ -14,8 +14,8 @@ TEST_F(Run, CommandLineChoosesModeAndExitCode) {
         std::vector<std::string> arguments;
         int code;
     } cases[] = {
-        {{"X"}, refused},       {{"-\tS"}, refused}, {{"P"}, refused},       {{"P", "0"}, refused},
-        {{"P", "77"}, refused}, {{"/P:1"}, refused}, {{"l", "-5"}, refused},
+        {{"X"}, refused},      {{"7"}, refused},       {{"-\tS"}, refused}, {{"P"}, refused},
+        {{"P", "0"}, refused}, {{"P", "77"}, refused}, {{"/P:1"}, refused}, {{"l", "-5"}, refused},
     };
 
     for (const auto& one : cases) {
@@ -42,10 +42,55 @@ TEST_F(Run, SetupIsShownAndSavesTheSettings) {
     EXPECT_TRUE(ground::waitFor([&] { return ground.grab() == bare; }));
 }
 
+TEST_F(Run, DialogsStandBeforeTheWindowThatIsMeantAndTakeTheirLetters) {
+    const xcb_window_t other = ground.makeWindow(50, 50);
+    const std::string number = std::to_string(other);
+    const auto line = [&](const std::string& words) {
+        return ground.launch({"sh", "-c", words}).readLine();
+    };
+    const char* const setup = "Fenky Dorbo's Rematch";
+
+    const struct {
+        std::vector<std::string> arguments;
+        const char* title;
+        bool before; // the other window, which has the keyboard
+        const char* keys;
+        std::string settings;
+    } cases[] = {{{}, setup, false, "alt+w alt+a Escape", "111"},
+                 {{"C"}, setup, true, "alt+w alt+a Return", "001"},
+                 {{"C"}, setup, true, "alt+u alt+p alt+o", "100"},
+                 {{"C"}, setup, true, "alt+w alt+c", "100"},
+                 {{"A", number}, "Change Password", true, "Escape", "100"},
+                 {{"A", "77"}, "Change Password", true, "Escape", "100"},
+                 {{"/a"}, "Change Password", true, "Escape", "100"}};
+
+    for (const auto& [arguments, title, before, keys, settings] : cases) {
+        ASSERT_EQ(ground.command({"xdotool", "windowfocus", "--sync", number}), 0);
+        auto program = ground.start(arguments);
+        const std::string found =
+            "$(xdotool search --sync --onlyvisible --name \"" + std::string(title) + "\")";
+        const std::string owner = line("xprop -id " + found + " WM_TRANSIENT_FOR");
+        char id[16];
+        std::snprintf(id, sizeof id, "0x%x", other);
+        EXPECT_EQ(owner.ends_with(id), before) << keys << ": " << owner;
+        line("xdotool windowfocus --sync " + found + " key " + keys);
+        EXPECT_EQ(program.exitCode(), title == setup ? 1 : 0) << keys;
+        EXPECT_EQ(setting("Walking Style") + setting("Statements") + setting("Backgrounds"),
+                  settings)
+            << keys;
+    }
+}
+
 TEST_F(Run, KeyEndsTheSaverAndTheOdometerIsKept) {
     addToon("intro.zkt");
+    const auto powerSaving = [&] {
+        const std::string hash = "xset q | sed -n '/Screen Saver/,/Colors/p; /DPMS/,$p' | md5sum";
+        return ground.launch({"sh", "-c", hash}).readLine();
+    };
+    const std::string before = powerSaving();
     auto saver = ground.start({"-/ Sanything"});
     waitForSaver();
+    EXPECT_EQ(powerSaving(), before) << "the machine's own timers stay as they are";
     const QImage title = ground.grab();
     const auto settled = [&, last = title]() mutable {
         const QImage now = ground.grab();
@@ -76,7 +121,7 @@ TEST_F(Run, SecondSaverBringsTheFirstToTheFront) {
 TEST_F(Run, PreviewLivesInAnotherProgramsWindow) {
     const xcb_window_t host = ground.makeWindow(200, 150);
     const QImage empty = ground.grab(host);
-    auto preview = ground.start({"/p", std::to_string(host)});
+    auto preview = ground.start({"/l", std::to_string(host)});
     ASSERT_TRUE(ground::waitFor([&] { return ground.grab(host) != empty; }));
     const auto covered = [&] {
         const QImage shown = ground.grab(host);

@@ -99,8 +99,9 @@ TEST_F(Scaled, TheShowStaysWholeAndTheMouseCountsItsPixels) {
         last = now;
         return pictures > 8; // the title and steps of his
     }));
-    ground.command({"xdotool", "mousemove", "106", "100"});
-    EXPECT_FALSE(waitFor([&] { return !saver.running(); }, 0.5)) << "three of his pixels";
+    ground.command({"xdotool", "mousemove", "106", "100", "click", "4"});
+    EXPECT_FALSE(waitFor([&] { return !saver.running(); }, 0.5))
+        << "three of his pixels, and a notch of the wheel";
     ground.command({"xdotool", "mousemove", "112", "100"});
     EXPECT_EQ(saver.exitCode(), 0);
 }

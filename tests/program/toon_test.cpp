@@ -43,18 +43,27 @@ TEST_F(ToonRun, PlayShowsAReadOnlyFileOfAnyNameAndLeavesTheToonsAtHome) {
 TEST_F(ToonRun, EditOpensTheToonOfAFileThatStandsElsewhere) {
     addToon("secret.zkt");
     std::filesystem::rename(ground.toons() / "secret.zkt", ground.toons() / "Grüße.zkt");
+    {
+        auto empty = ground.launch({DORBO_TOON, "edit"});
+        waitForTile("bg01", {25, 42});
+    }
     auto editor = toon("edit", "./Grüße.zkt");
     waitForTile("bg10", {25, 42});
 }
 
 TEST_F(ToonRun, WhatCannotBeShownIsTold) {
     std::ofstream(ground.toons() / "bad.zkt") << "too short";
+    addToon("waiter.zkt");
+    chmod((ground.toons() / "waiter.zkt").c_str(), S_IRUSR);
 
     const struct {
         const char* command;
         const char* file;
         int code;
-    } cases[] = {{"play", "bad.zkt", 1}, {"edit", "bad.zkt", 1}, {"play", "--", 2}};
+    } cases[] = {{"play", "bad.zkt", 1},
+                 {"edit", "bad.zkt", 1},
+                 {"edit", "waiter.zkt", 1},
+                 {"play", "--", 2}};
 
     for (const auto& one : cases) {
         const std::string words = std::string(DORBO_TOON) + " " + one.command + " " + one.file;
@@ -62,6 +71,9 @@ TEST_F(ToonRun, WhatCannotBeShownIsTold) {
         EXPECT_EQ(told.readLine().find(std::string("toon ") + one.command + ": "), 0U) << words;
         EXPECT_EQ(told.exitCode(), one.code) << words;
     }
+    auto shown = toon("play", "bad.zkt"); // with a display and no terminal
+    ground.typeInto("Dorbo", "");
+    EXPECT_EQ(shown.exitCode(), 1);
 }
 
 } // namespace
