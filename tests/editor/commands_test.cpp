@@ -10,9 +10,13 @@ namespace {
 TEST_F(EditorTest, ButtonsLabelAndTimersAreThoseOfEachState) {
     openAtRest();
     EXPECT_EQ(stateNow(), "idle") << "no Toon is open";
+    const std::string stop = "&Stop";
     for (const EditorState& state : editorStates) {
         reach(state.name);
         EXPECT_EQ(stateNow(), state.name);
+        const DWORD pointer = SetClassLongA(EditorStage, GCL_HCURSOR, 0);
+        EXPECT_EQ(pointer == DWORD{IDC_WAIT.number}, state.about != 0 || state.label == stop)
+            << state.name;
         press(PlayButton);
         EXPECT_EQ(stateNow(), state.afterPlay) << state.name;
         // Only a walk to a frame stops when another window is active.

@@ -5,7 +5,9 @@
 #include "platform/user/queue.h"
 #include "platform/user/window.h"
 
+#include <QAbstractItemView>
 #include <QApplication>
+#include <QWheelEvent>
 
 #include <malloc.h>
 
@@ -128,6 +130,34 @@ TEST_F(FrameKeys, EnterAndEscapeDoNothingInItsFields) {
             EXPECT_EQ(ToonDirty, 0U) << id;
         }
     }
+}
+
+TEST_F(FrameKeys, AndTheWheelWalkThroughTheListOfFrames) {
+    const std::pair<Qt::Key, LONG> cases[] = {
+        {Qt::Key_Down, 7}, {Qt::Key_PageDown, 7}, {Qt::Key_Up, 5}, {Qt::Key_PageUp, 5},
+        {Qt::Key_Home, 0}, {Qt::Key_End, 29},     {Qt::Key_2, 19}, // the next one that begins so
+    };
+    editFrames(30);
+    for (const auto& [code, then] : cases) {
+        select(6);
+        stepInList(code);
+        EXPECT_EQ(CurrentFrameIndex, then) << code;
+        EXPECT_EQ(shown(X_FIELD), std::to_string(then + 1)) << code;
+    }
+    select(6);
+    QWheelEvent notch({}, {}, {}, {0, -120}, Qt::NoButton, Qt::NoModifier, Qt::NoScrollPhase,
+                      false);
+    QCoreApplication::sendEvent(&field(FRAME_LIST), &notch);
+    pass(0);
+    EXPECT_EQ(CurrentFrameIndex, 7);
+    auto& list = static_cast<QComboBox&>(field(FRAME_LIST));
+    stepInList(Qt::Key_F4);
+    ASSERT_TRUE(list.view()->isVisible());
+    QTest::keyClick(list.view(), Qt::Key_Down);
+    QTest::keyClick(list.view(), Qt::Key_Escape);
+    pass(0);
+    EXPECT_FALSE(list.view()->isVisible());
+    EXPECT_EQ(CurrentFrameIndex, 7) << "it closes without a choice";
 }
 
 TEST_F(FrameKeys, F10OpensTheFirstMenuWithItsFirstItemMarked) {

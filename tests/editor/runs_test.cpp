@@ -4,7 +4,10 @@
 #include "platform/kernel.h"
 #include "platform/user/window.h"
 #include "saver/setup_dialog.h"
+#include "saver/toon_player.h"
+#include "stage/backdrop.h"
 #include "stage/random_walk.h"
+#include "toon/settings.h"
 
 namespace {
 
@@ -60,8 +63,10 @@ TEST_F(EditorTest, TheSetupsButtonClosesTheEditorAndOpensAnother) {
     editors.clear();
     const HWND setup =
         CreateDialogParamA(GetModuleHandleA(nullptr), 2003, nullptr, SetupDialogProc, 0);
+    CheckDlgButton(setup, 1040, 0);
     postCommand(setup, editButton);
     once(editorStands, [setup] {
+        EXPECT_EQ(Statements, 0) << "saved, for the editor reads the file anew";
         editors.push_back(EditorMainWindow);
         postCommand(setup, editButton); // reaches the dialog in the first editor's loop
         once([] { return editorStands() && EditorMainWindow != editors[0]; },
@@ -76,6 +81,29 @@ TEST_F(EditorTest, TheSetupsButtonClosesTheEditorAndOpensAnother) {
     EXPECT_TRUE(editors[1]);
     expectNothingLeft("both");
     DestroyWindow(setup);
+}
+
+TEST_F(EditorTest, AToonThatTheSetupPlaysClosesTheEditor) {
+    constexpr int list = 1043;
+    GetCurrentDirectoryA(sizeof Directory, Directory);
+    SettingsSave();
+    const HWND setup =
+        CreateDialogParamA(GetModuleHandleA(nullptr), 2003, nullptr, SetupDialogProc, 0);
+    const auto last = SendDlgItemMessageA(setup, list, LB_GETCOUNT, 0, 0) - 1; // two.zkt
+    SendDlgItemMessageA(setup, list, LB_SETCURSEL, static_cast<WPARAM>(last), 0);
+    once(editorStands, [setup] { postCommand(setup, MAKELONG(list, LBN_DBLCLK)); });
+    once([] { return IsWindow(PlayerWindow) != FALSE; },
+         [] {
+             EXPECT_FALSE(EditorMainWindow);
+             DestroyWindow(EditorMainWindow);
+             PostMessageA(PlayerWindow, WM_KEYDOWN, ' ', 0);
+         });
+    RunEditor(GetModuleHandleA(nullptr), setup, SW_SHOWNORMAL);
+    EXPECT_FALSE(IsWindow(PlayerWindow));
+    expectNothingLeft("the player");
+    DestroyWindow(setup);
+    DeleteObject(BackdropBitmap); // the next stage's start would free it
+    BackdropBitmap = nullptr;
 }
 
 TEST_F(EditorTest, AToonThatIsNamedIsOpenFromTheStart) {
@@ -111,7 +139,7 @@ TEST_F(EditorTest, ClosedInAnyStateItsStageBeginsClean) {
         if (state.timers.contains("WALK")) {
             pass(700); // into the walk
         }
-        close();
+        press(CloseButton);
         expectNothingLeft(state.name);
         open();
         EXPECT_EQ(stateNow(), "idle") << state.name;

@@ -233,18 +233,20 @@ TEST_F(Setup, ADoubleClickThatComesLateOpensNoSecondPlayer) {
 
 TEST_F(Setup, PlayerIgnoresThePointerAndFollowsItsSize) {
     open();
-    std::string alive;
-    DWORD stageSize = 0;
-    QTimer::singleShot(0, [&] {
-        MoveWindow(PlayerWindow, 5, 5, 300, 200, FALSE);
-        stageSize = StageSize;
-        for (const UINT message :
-             {WM_MOUSEMOVE, WM_RBUTTONDOWN, WM_MBUTTONDOWN, WM_KEYUP, WM_SYSKEYDOWN}) {
-            SendMessageA(PlayerWindow, message, 0x12, 0);
-            alive += IsWindow(PlayerWindow) != FALSE ? 'y' : 'n';
-        }
-    });
-    EXPECT_EQ(RunPlayer(GetModuleHandleA(nullptr), nullptr, ""), 0);
-    EXPECT_EQ(alive, "yyyyn");
-    EXPECT_EQ(stageSize, MAKELONG(300, 200));
+    for (const UINT last : {WM_SYSKEYDOWN, WM_KEYDOWN, WM_LBUTTONDOWN}) {
+        std::string alive;
+        DWORD stageSize = 0;
+        QTimer::singleShot(0, [&] {
+            MoveWindow(PlayerWindow, 5, 5, 300, 200, FALSE);
+            stageSize = StageSize;
+            for (const UINT message :
+                 {WM_MOUSEMOVE, WM_RBUTTONDOWN, WM_MBUTTONDOWN, WM_KEYUP, last}) {
+                SendMessageA(PlayerWindow, message, 0x12, 0);
+                alive += IsWindow(PlayerWindow) != FALSE ? 'y' : 'n';
+            }
+        });
+        EXPECT_EQ(RunPlayer(GetModuleHandleA(nullptr), nullptr, ""), 0);
+        EXPECT_EQ(alive, "yyyyn") << last;
+        EXPECT_EQ(stageSize, MAKELONG(300, 200));
+    }
 }

@@ -266,6 +266,8 @@ TEST_F(ToonProgram, ShowsAndWritesTheSameFileOrFailsWithAReason) {
     make("locked.zkt", "x");
     setMode("locked.zkt", 0444);
     const std::tuple<const char*, int, const char*> cases[] = {
+        {"", 2, "toon: which command?\nTry: toon --help\n"},
+        {"fly", 2, "toon: there is no command fly\nTry: toon --help\n"},
         {"show", 2, "usage: toon show FILE.zkt\n"},
         {"show good.json", 1,
          "toon show: good.json: it is no Toon: of the header's 104 bytes it has 41\n"},

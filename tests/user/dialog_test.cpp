@@ -13,6 +13,7 @@
 #include <QPlainTextEdit>
 #include <QScrollBar>
 #include <QShortcutEvent>
+#include <QTest>
 #include <QTimer>
 
 namespace {
@@ -160,6 +161,13 @@ TEST_F(Dialogs, TellOfWhatTheUserDoesAndNotOfWhatTheProgramDoes) {
                   {16, BN_CLICKED}, {17, BN_CLICKED}, {12, CBN_SELCHANGE}, {18, LBN_DBLCLK}}));
 
     commands.clear();
+    QWidget* const rows = child<QListView>().viewport();
+    QTest::mouseClick(rows, Qt::LeftButton, {}, {9, 9});
+    QTest::mouseDClick(rows, Qt::LeftButton, {}, {9, 9});
+    test::handleWaiting();
+    EXPECT_EQ(commands, (std::vector<Command>{{18, LBN_SELCHANGE}, {18, LBN_DBLCLK}}));
+
+    commands.clear();
     QShortcutEvent letter(QKeySequence(QStringLiteral("Alt+T")), 0);
     QCoreApplication::sendEvent(&button("&Tick"), &letter);
     test::handleWaiting();
@@ -266,6 +274,8 @@ TEST_F(Dialogs, KeepTheirKeysAndTheOrderOfTheirTabs) {
     const std::vector<QString> expected{QStringLiteral("&Tick"), QString(), QStringLiteral("&OK"),
                                         QStringLiteral("&Cancel")};
     EXPECT_EQ(reached, expected);
+    test::press(widget->focusWidget(), Qt::Key_Backtab, Qt::ShiftModifier);
+    EXPECT_EQ(widget->focusWidget(), &child<QLineEdit>()) << "once round, and one back";
 
     child<QLineEdit>().setFocus();
     test::handleWaiting();

@@ -82,6 +82,8 @@ TEST_F(FileDialogs, GiveTheTypedPathInThePlatformsForm) {
         {GetSaveFileNameA, "", "inner", QStringLiteral("../caf\u00E9"), "", "caf\xC3\xA9"},
         {GetOpenFileNameA, "", "none", QStringLiteral("inner/a \"b\""), "", "inner\\a \"b\""},
         {GetSaveFileNameA, "INNER\\three.zkt", "", QStringLiteral("x"), "three.zkt", "inner\\x"},
+        // Nobody asks whether to write over a file:
+        {GetSaveFileNameA, "", "", QStringLiteral("one.zkt"), "", "one.zkt"},
         // Above a directory that the toolkit can't name:
         {GetOpenFileNameA, "", "caf\xE9", QStringLiteral("one.zkt"), "", "one.zkt"},
     };
