@@ -3,7 +3,9 @@
 
 #include "platform/user/window.h"
 
+#include <QAccessible>
 #include <QTimer>
+#include <QWidget>
 
 namespace {
 
@@ -87,6 +89,16 @@ TEST_F(EditorTest, OnlyOkClosesTheAboutBox) {
     timer.start(0);
     key(5003);
     EXPECT_GE(asked, 2);
+}
+
+TEST_F(EditorTest, ButtonsThatShowAPictureTellTheirNames) {
+    openAtRest();
+    std::string names;
+    for (const HWND button : {FileButton, PlayButton, WalkButton, MinimizeButton, CloseButton}) {
+        auto* heard = QAccessible::queryAccessibleInterface(&widgetOf(button));
+        names += heard->text(QAccessible::Name).toStdString() + '|';
+    }
+    EXPECT_EQ(names, "File|Play|Walk about|Minimize|Close|");
 }
 
 TEST_F(EditorTest, OpeningWhatIsNoToonChangesNothing) {

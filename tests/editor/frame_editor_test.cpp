@@ -48,7 +48,7 @@ TEST_F(FrameEditorTest, ATextHolds69CharactersAndABreakIsOneCarriageReturn) {
     for (const auto& [typed, text] : cases) {
         type(TEXT_FIELD, typed);
         EXPECT_EQ(ToonDirty, 0U) << "typing changes nothing";
-        command(COMMIT);
+        command(114); // Frame, Save
         EXPECT_EQ(frame(0).text, text);
         select(0);
         EXPECT_EQ(shown(TEXT_FIELD), text);

@@ -159,6 +159,18 @@ TEST_F(Program, TracesTheRecordInUtf8WithOneLineAnEvent) {
     EXPECT_THAT(record, HasSubstr("tea"));
     EXPECT_EQ(run("trace --mode saver --size 320x240 short.zkt"), 0);
     EXPECT_EQ(textOf("out"), record);
+    make("a.scene", "100 open short.zkt\n200 play\n");
+    const std::tuple<const char*, const char*, bool> cases[] = {
+        {"--shows 2 --paces 900", "shows=2", true},
+        {"--paces 900", "odometer=9", true},
+        {"--mode saver", "choice file=short.zkt", true},
+        {"--mode player", "choice", false},
+        {"--mode editor --script a.scene", "label=&Stop", true},
+    };
+    for (const auto& [given, told, isThere] : cases) {
+        EXPECT_EQ(run("trace short.zkt " + std::string(given)), 0);
+        EXPECT_EQ(textOf("out").find(told) != std::string::npos, isThere) << given;
+    }
     setMode("short.zkt", 0400); // the saver would refuse it, and there would be nothing to tell
     EXPECT_EQ(run("trace short.zkt --size 320x240"), 0);
     EXPECT_EQ(textOf("out"), record);

@@ -122,5 +122,32 @@ class Words(unittest.TestCase):
         self.assertEqual(Tree("check-words").faults({"docs/a.md": self.GOOD, "DEVELOPERS.md": free}), [])
 
 
+class Behaviour(unittest.TestCase):
+    TESTS = {
+        "tests/a/walk_test.cpp": "TEST(Walk, Goes) {}\n  TEST_P(Walk,\n  Stays) {}\n// TEST(Walk, Flies)\n",
+        "tests/a/help_test.py": "class A:\n    def test_it(self):\n",
+    }
+    HEAD = "Text of `Walk.Flies`.\n\n| What the user does | What happens | Test |\n|---|---|---|\n"
+    BAD = [
+        ("| a | b | `Walk.Flies` |", "there is no test Walk.Flies"),
+        ("| a | b | `Walk.Goes`, `help_test.py: test_all` |", "there is no test help_test.py: test_all"),
+        ("| `Walk.Goes` | b | |", "no test"),
+        ("| a | `Walk.Goes` |", "no test"),
+    ]
+
+    def faults(self, rows):
+        return Tree("check-behaviour").faults({**self.TESTS, "docs/behaviour.md": self.HEAD + rows + "\n"})
+
+    def test_faults(self):
+        for row, expected in self.BAD:
+            with self.subTest(row):
+                found = self.faults(row)
+                self.assertEqual(len(found), 1, found)
+                self.assertIn(expected, found[0])
+
+    def test_rightful_table(self):
+        self.assertEqual(self.faults("| a | `b` | `Walk.Goes`, `Walk.Stays`, `help_test.py: test_it` |"), [])
+
+
 if __name__ == "__main__":
     unittest.main()
