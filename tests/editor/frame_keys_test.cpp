@@ -95,6 +95,9 @@ TEST_F(FrameKeys, AreTheFrameEditorsWhereverTheFocusIs) {
         for (const bool inside : {true, false}) {
             std::string found;
             const auto focus = [inside] {
+                if (!EditorDialog) {
+                    return false; // the Toon is still being opened
+                }
                 ToonFileName[0] = '\0'; // for Save to ask for one
                 CopyText(ToonDocHeader.magic, ToonMagic, sizeof ToonMagic);
                 fileGiven = "";
