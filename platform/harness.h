@@ -2,6 +2,7 @@
 #pragma once
 
 #include "platform/gdi/surface.h"
+#include "platform/kernel/faults.h"
 #include "platform/types.h"
 
 #include <cstdint>
@@ -91,5 +92,16 @@ void watchPictures(PictureWatcher watcher);
 
 /// The same of a bitmap; monochrome pixels come as 0 and 1.
 Picture bitmapPicture(HBITMAP bitmap);
+
+// ---- Faults
+// -----------------------------------------------------------------------------------------
+
+/// From now on operations are counted, and the `at`th one of this kind fails; none for 0.
+void makeFault(Operation operation, std::size_t at, Fault fault = Fault::error);
+
+/// How many of a kind have been asked for since makeFault, refused ones too.
+std::size_t operationsSeen(Operation operation);
+
+void endFaults();
 
 } // namespace seam

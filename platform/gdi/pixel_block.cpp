@@ -1,5 +1,7 @@
 #include "platform/gdi/pixel_block.h"
 
+#include "platform/kernel/faults.h"
+
 #include <cstdlib>
 #include <sys/mman.h>
 
@@ -27,6 +29,9 @@ void PixelRelease::operator()(DWORD* pixels) const {
 PixelBlock makePixels(std::size_t count) {
     const std::size_t bytes = count * sizeof(DWORD);
     void* memory = nullptr;
+    if (faultDue(Operation::picture)) {
+        return {};
+    }
     if (bytes < mappedFrom) {
         memory = std::malloc(bytes);
     } else {

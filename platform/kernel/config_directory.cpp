@@ -1,5 +1,6 @@
 #include "platform/kernel/config_directory.h"
 
+#include "platform/kernel/faults.h"
 #include "platform/kernel/paths.h"
 
 #include <sys/stat.h>
@@ -21,7 +22,9 @@ bool makeConfigDirectory() {
          slash = path.find('/', slash + 1)) {
         mkdir(path.substr(0, slash).c_str(), userAlone);
     }
-    mkdir(path.c_str(), userAlone);
+    if (!faultDue(Operation::change)) {
+        mkdir(path.c_str(), userAlone);
+    }
     struct stat status = {};
     return stat(path.c_str(), &status) == 0 && S_ISDIR(status.st_mode);
 }

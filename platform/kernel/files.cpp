@@ -4,6 +4,7 @@
 #include "platform/kernel.h"
 #include "platform/kernel/counts.h"
 #include "platform/kernel/descriptor.h"
+#include "platform/kernel/faults.h"
 #include "platform/kernel/paths.h"
 #include "platform/kernel/text.h"
 #include "platform/kernel/transfer.h"
@@ -48,15 +49,17 @@ int openRegular(const std::string& path, UINT style, seam::Descriptor& opened) {
     constexpr mode_t newFileMode = 0666;
     const int access = asksForWriting(style) ? O_RDWR : O_RDONLY;
     const int make = there ? 0 : O_CREAT;
-    opened = seam::Descriptor(
-        open(path.c_str(), access | make | O_NONBLOCK | O_CLOEXEC | O_NOCTTY, newFileMode));
+    opened = seam::openDescriptor(path, access | make | O_NONBLOCK | O_NOCTTY, newFileMode);
     if (!opened || fstat(opened.number(), &status) != 0) {
         return errno;
     }
     if (!S_ISREG(status.st_mode)) {
         return EINVAL;
     }
-    return (style & OF_CREATE) != 0 && ftruncate(opened.number(), 0) != 0 ? errno : 0;
+    const bool cuts = (style & OF_CREATE) != 0;
+    return cuts && (seam::faultDue(seam::Operation::change) || ftruncate(opened.number(), 0) != 0)
+               ? errno
+               : 0;
 }
 
 int openPath(const seam::PathLookup& place, UINT style, seam::Descriptor& opened) {

@@ -3,6 +3,7 @@
 #include "platform/handle_table.h"
 #include "platform/kernel.h"
 #include "platform/kernel/counts.h"
+#include "platform/kernel/faults.h"
 
 #include <cstdlib>
 #include <cstring>
@@ -39,7 +40,8 @@ bool resize(Block& block, std::size_t bytes, bool clear) {
         block.size = 0;
         return true;
     }
-    void* moved = std::realloc(block.bytes, bytes);
+    void* moved =
+        seam::faultDue(seam::Operation::block) ? nullptr : std::realloc(block.bytes, bytes);
     if (moved == nullptr) {
         return false;
     }

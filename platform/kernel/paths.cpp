@@ -1,5 +1,6 @@
 #include "platform/kernel/paths.h"
 
+#include "platform/kernel/faults.h"
 #include "platform/kernel/text.h"
 
 #include <dirent.h>
@@ -173,7 +174,8 @@ PathLookup lookUpPath(std::string_view path) {
 
 std::vector<std::string> namesIn(const std::string& directory) {
     const auto close = [](DIR* listing) { closedir(listing); };
-    const std::unique_ptr<DIR, decltype(close)> listing(opendir(directory.c_str()), close);
+    const std::unique_ptr<DIR, decltype(close)> listing(
+        faultDue(Operation::open) ? nullptr : opendir(directory.c_str()), close);
     std::vector<std::string> names;
     while (const dirent* entry = listing ? readdir(listing.get()) : nullptr) {
         const std::string_view name = entry->d_name;

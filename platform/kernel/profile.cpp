@@ -2,7 +2,6 @@
 
 #include "platform/kernel.h"
 #include "platform/kernel/config_directory.h"
-#include "platform/kernel/descriptor.h"
 #include "platform/kernel/paths.h"
 #include "platform/kernel/profile_text.h"
 #include "platform/kernel/text.h"
@@ -54,7 +53,7 @@ seam::Descriptor lockBeside(const std::string& path) {
     constexpr int tries = 60;
     constexpr timespec pause{0, 5'000'000}; // 5 ms
     const std::string directory = path.substr(0, path.rfind('/') + 1);
-    seam::Descriptor lock(open(directory.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    seam::Descriptor lock = seam::openDescriptor(directory, O_RDONLY | O_DIRECTORY);
     for (int i = 0; lock && i < tries && flock(lock.number(), LOCK_EX | LOCK_NB) != 0; ++i) {
         nanosleep(&pause, nullptr);
     }

@@ -1,6 +1,6 @@
 #include "platform/kernel/transfer.h"
 
-#include "platform/kernel/descriptor.h"
+#include "platform/kernel/faults.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -99,20 +99,26 @@ mode_t modeForReplacing(const std::string& path, mode_t newMode) {
 
 } // namespace
 
+Descriptor openDescriptor(const std::string& path, int flags, mode_t mode) {
+    return Descriptor(faultDue(Operation::open) ? -1 : open(path.c_str(), flags | O_CLOEXEC, mode));
+}
+
 ssize_t readFully(int descriptor, void* buffer, std::size_t bytes) {
     return transferFully(
-        static_cast<char*>(buffer), bytes,
-        [descriptor](char* at, std::size_t left) { return read(descriptor, at, left); });
+        static_cast<char*>(buffer), bytes, [descriptor](char* at, std::size_t left) {
+            return faultDue(Operation::read, &left) ? -1 : read(descriptor, at, left);
+        });
 }
 
 ssize_t writeFully(int descriptor, const void* buffer, std::size_t bytes) {
     return transferFully(
-        static_cast<const char*>(buffer), bytes,
-        [descriptor](const char* at, std::size_t left) { return write(descriptor, at, left); });
+        static_cast<const char*>(buffer), bytes, [descriptor](const char* at, std::size_t left) {
+            return faultDue(Operation::write, &left) ? -1 : write(descriptor, at, left);
+        });
 }
 
 WholeFile readWholeFile(const std::string& path, std::size_t limit) {
-    const Descriptor file(open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC | O_NOCTTY));
+    const Descriptor file = openDescriptor(path, O_RDONLY | O_NONBLOCK | O_NOCTTY);
     struct stat status = {};
     if (!file || fstat(file.number(), &status) != 0) {
         return {errno, {}};
@@ -130,13 +136,14 @@ bool replaceFile(const std::string& path, std::string_view text, mode_t newMode)
         return false;
     }
     std::string beside = target + ".XXXXXX";
-    const Descriptor file(mkostemp(beside.data(), O_CLOEXEC));
+    const Descriptor file(faultDue(Operation::open) ? -1 : mkostemp(beside.data(), O_CLOEXEC));
     if (!file) {
         return false;
     }
     const bool written =
         writeFully(file.number(), text.data(), text.size()) == static_cast<ssize_t>(text.size()) &&
-        fchmod(file.number(), mode) == 0 && fsync(file.number()) == 0 &&
+        !faultDue(Operation::change) && fchmod(file.number(), mode) == 0 &&
+        !faultDue(Operation::change) && fsync(file.number()) == 0 && !faultDue(Operation::rename) &&
         rename(beside.c_str(), target.c_str()) == 0;
     if (!written) {
         const int reason = errno;

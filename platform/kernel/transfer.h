@@ -1,6 +1,8 @@
-// Reading and writing through a descriptor until all is done, and whole files. Paths are those of
-// the file system.
+// Opening, reading and writing through a descriptor until all is done, and whole files. Paths are
+// those of the file system.
 #pragma once
+
+#include "platform/kernel/descriptor.h"
 
 #include <sys/types.h>
 
@@ -9,6 +11,9 @@
 #include <string_view>
 
 namespace seam {
+
+/// As open() does, and closed where another program is started; none with a reason in errno.
+Descriptor openDescriptor(const std::string& path, int flags, mode_t mode = 0);
 
 /// Reads or writes until `bytes` bytes have gone, the file ends or an error comes. Gives the number
 /// transferred, or -1 on an error before the first byte.

@@ -1,7 +1,7 @@
 #include "platform/user/password_store.h"
 
 #include "platform/kernel/config_directory.h"
-#include "platform/kernel/descriptor.h"
+#include "platform/kernel/faults.h"
 #include "platform/kernel/registry.h"
 #include "platform/kernel/text.h"
 #include "platform/kernel/transfer.h"
@@ -43,8 +43,8 @@ bool isHash(const std::string& text) {
 
 /// A change of a directory's names lasts only once the directory has been written.
 void syncDirectory() {
-    const Descriptor directory(open(configDirectory().c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    if (directory) {
+    const Descriptor directory = openDescriptor(configDirectory(), O_RDONLY | O_DIRECTORY);
+    if (directory && !faultDue(Operation::change)) {
         fsync(directory.number());
     }
 }
@@ -55,7 +55,8 @@ bool keepHash(const std::string& hash) {
     const std::string path = passwordFile();
     struct stat status = {};
     const bool there = stat(path.c_str(), &status) == 0;
-    if ((there && (!S_ISREG(status.st_mode) || chmod(path.c_str(), userAlone) != 0)) ||
+    if ((there && (!S_ISREG(status.st_mode) || faultDue(Operation::change) ||
+                   chmod(path.c_str(), userAlone) != 0)) ||
         !makeConfigDirectory() || !replaceFile(path, hash + "\n")) {
         return false;
     }
@@ -64,7 +65,8 @@ bool keepHash(const std::string& hash) {
 }
 
 bool dropHash() {
-    if (unlink(passwordFile().c_str()) != 0 && errno != ENOENT) {
+    const bool refused = faultDue(Operation::change);
+    if ((refused || unlink(passwordFile().c_str()) != 0) && errno != ENOENT) {
         return false;
     }
     syncDirectory();
