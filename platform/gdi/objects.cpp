@@ -56,9 +56,8 @@ Objects::Objects() {
     stock[BLACK_PEN] = addStock(Pen{black});
     stock[NULL_PEN] = addStock(Pen{black, false});
     stock[SYSTEM_FONT] = addStock(Font(systemFontHeight, bold, false));
-    Bitmap pixel = makeBitmap(1, 1, true);
-    pixel.pixels[0] = blackPixel;
-    bitmap = addStock(std::move(pixel));
+    static DWORD pixel = blackPixel; // never refused, and never given back
+    bitmap = addStock(Bitmap{1, 1, true, PixelBlock(&pixel), nullptr});
 }
 
 /// Never destroyed: fonts must not outlive the toolkit, nor be freed after it.
