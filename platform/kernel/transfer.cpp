@@ -18,12 +18,16 @@ namespace seam {
 namespace {
 
 template <class Byte, class Transfer>
-ssize_t transferFully(Byte* buffer, std::size_t bytes, Transfer transfer) {
+ssize_t transferFully(Byte* buffer, std::size_t bytes, int* error, Transfer transfer) {
     std::size_t done = 0;
+    *error = 0;
     while (done < bytes) {
         const ssize_t count = transfer(buffer + done, bytes - done);
         if (count < 0 && errno == EINTR) {
             continue;
+        }
+        if (count < 0) {
+            *error = errno;
         }
         if (count < 0 && done == 0) {
             return -1;
@@ -44,9 +48,10 @@ WholeFile readToEnd(int file, std::size_t sizeTold, std::size_t limit) {
     while (sizeTold <= limit && text.size() <= limit) {
         const std::size_t before = text.size();
         text.resize(std::min(before + room, limit + 1));
-        const ssize_t count = readFully(file, text.data() + before, text.size() - before);
-        if (count < 0) {
-            return {errno, {}};
+        int error = 0;
+        const ssize_t count = readFully(file, text.data() + before, text.size() - before, &error);
+        if (error != 0) {
+            return {error, {}}; // part of a file must not pass for the whole
         }
         const std::size_t filled = before + static_cast<std::size_t>(count);
         if (filled < text.size()) {
@@ -103,18 +108,22 @@ Descriptor openDescriptor(const std::string& path, int flags, mode_t mode) {
     return Descriptor(faultDue(Operation::open) ? -1 : open(path.c_str(), flags | O_CLOEXEC, mode));
 }
 
-ssize_t readFully(int descriptor, void* buffer, std::size_t bytes) {
-    return transferFully(
-        static_cast<char*>(buffer), bytes, [descriptor](char* at, std::size_t left) {
-            return faultDue(Operation::read, &left) ? -1 : read(descriptor, at, left);
-        });
+ssize_t readFully(int descriptor, void* buffer, std::size_t bytes, int* error) {
+    int unasked = 0;
+    return transferFully(static_cast<char*>(buffer), bytes, error != nullptr ? error : &unasked,
+                         [descriptor](char* at, std::size_t left) {
+                             return faultDue(Operation::read, &left) ? -1
+                                                                     : read(descriptor, at, left);
+                         });
 }
 
 ssize_t writeFully(int descriptor, const void* buffer, std::size_t bytes) {
-    return transferFully(
-        static_cast<const char*>(buffer), bytes, [descriptor](const char* at, std::size_t left) {
-            return faultDue(Operation::write, &left) ? -1 : write(descriptor, at, left);
-        });
+    int unasked = 0;
+    return transferFully(static_cast<const char*>(buffer), bytes, &unasked,
+                         [descriptor](const char* at, std::size_t left) {
+                             return faultDue(Operation::write, &left) ? -1
+                                                                      : write(descriptor, at, left);
+                         });
 }
 
 WholeFile readWholeFile(const std::string& path, std::size_t limit) {

@@ -16,8 +16,9 @@ namespace seam {
 Descriptor openDescriptor(const std::string& path, int flags, mode_t mode = 0);
 
 /// Reads or writes until `bytes` bytes have gone, the file ends or an error comes. Gives the number
-/// transferred, or -1 on an error before the first byte.
-ssize_t readFully(int descriptor, void* buffer, std::size_t bytes);
+/// transferred, or -1 on an error before the first byte. `error`, if not null, gets 0, or the errno
+/// that has ended it.
+ssize_t readFully(int descriptor, void* buffer, std::size_t bytes, int* error = nullptr);
 ssize_t writeFully(int descriptor, const void* buffer, std::size_t bytes);
 
 struct WholeFile {
