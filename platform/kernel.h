@@ -188,8 +188,9 @@ UINT GetPrivateProfileIntA(const char* section, const char* key, int otherwise, 
 DWORD GetPrivateProfileStringA(const char* section, const char* key, const char* otherwise,
                                char* buffer, DWORD size, const char* file);
 
-/// Sets the key's value. FALSE, and the file as it was, if it can't be written whole, or if the
-/// value holds a line end. A value that stands already is not written again. Of several processes
-/// that write at once none loses what another has written.
+/// Sets the key's value. FALSE, and the file as it was, if it can't be written whole, if the value
+/// holds a line end, or if it was asked for when the file couldn't be read: what the caller took
+/// for it then is no value to keep, until it has been read. A value that stands already is not
+/// written again. Of several processes that write at once none loses what another has written.
 BOOL WritePrivateProfileStringA(const char* section, const char* key, const char* value,
                                 const char* file);

@@ -11,6 +11,8 @@
 #include <ctime>
 #include <fcntl.h>
 #include <optional>
+#include <set>
+#include <string>
 #include <sys/file.h>
 
 namespace {
@@ -43,8 +45,27 @@ seam::WholeFile readProfile(const char* file) {
     return path.empty() ? seam::WholeFile{EINVAL, {}} : seam::readWholeFile(path, largestProfile);
 }
 
+/// The values that were asked for last when their file couldn't be read. Whoever asked has gone on
+/// with something else, which must not be written over what stands there. Never destroyed: settings
+/// are saved on the way out too.
+std::set<std::string>& unknownValues() {
+    static auto& values = *new std::set<std::string>;
+    return values;
+}
+
+std::string valueName(const char* file, const char* section, const char* key) {
+    return profilePath(file) + '\n' + section + '\n' + key;
+}
+
 std::optional<std::string> valueIn(const char* file, const char* section, const char* key) {
-    return seam::profileValue(readProfile(file).text, orEmpty(section), orEmpty(key));
+    const seam::WholeFile profile = readProfile(file);
+    const std::string name = valueName(file, orEmpty(section), orEmpty(key));
+    if (profile.error != 0 && profile.error != ENOENT) {
+        unknownValues().insert(name);
+    } else {
+        unknownValues().erase(name);
+    }
+    return seam::profileValue(profile.text, orEmpty(section), orEmpty(key));
 }
 
 /// Makes this process the only one to change profiles in a directory: two that write at once what
@@ -90,6 +111,9 @@ BOOL WritePrivateProfileStringA(const char* section, const char* key, const char
         return FALSE;
     }
     if (!hasDirectory(orEmpty(file)) && !seam::makeConfigDirectory()) {
+        return FALSE;
+    }
+    if (unknownValues().contains(valueName(file, section, key))) {
         return FALSE;
     }
     const seam::Descriptor lock = lockBeside(profilePath(file));
