@@ -135,6 +135,20 @@ TEST_F(Screen, TheSettingsAreSavedWhenTheDisplayGoes) {
     EXPECT_EQ(setting("Walking Style"), "0");
 }
 
+TEST_F(Screen, ADisplayThatGoesInMidShowEndsItWithinASecondAndItsPacesCount) {
+    addToon("intro.zkt");
+    auto saver = ground.launch({"bash", "-c", "exec " DORBO_PROGRAM " S 2> >(:)"});
+    waitForSaver();
+    for (int change = 0; change < 5; ++change) { // the title goes, he comes in, and walks
+        ASSERT_TRUE(waitFor([&, last = ground.grab()] { return ground.grab() != last; }));
+    }
+    std::filesystem::remove(ground.settings());
+    ground.loseDisplay();
+    EXPECT_TRUE(waitFor([&] { return !saver.running(); }, 1));
+    EXPECT_EQ(setting("Walking Style"), "1");
+    EXPECT_GT(std::atoi(setting("Paces Walked").c_str()), 0);
+}
+
 TEST_F(Screen, ThePasswordKeepsItUp) {
     const std::string title = "Screen Saver Password";
     const auto asks = [&] {
