@@ -18,6 +18,7 @@
 #include "tests/days/holdings.h"
 #include "tests/days/record_check.h"
 #include "toon/settings.h"
+#include "toon/toon_document.h"
 
 #include <algorithm>
 #include <chrono>
@@ -38,6 +39,7 @@ namespace {
 constexpr std::int64_t hour = 60LL * 60 * 1000;
 constexpr std::int64_t hoursOfDay = 24;
 constexpr std::uint32_t pacesAtStart = 0xFFFFFFFFU - 8000; // hours of walking below the wrap
+constexpr LONG tileOfSamples = 2;
 constexpr const char* runClass = "DaysClass";
 
 struct Options {
@@ -57,6 +59,7 @@ struct Course {
     RecordCheck check;
     std::mt19937 coin;
     bool tossed;         // whether the coin decides between the shows
+    std::size_t wanted;  // samples
     std::int64_t period; // ms from sample to sample
     std::vector<Sample> samples;
 };
@@ -67,10 +70,13 @@ std::int64_t nextSample() {
     return static_cast<std::int64_t>(course->samples.size() + 1) * course->period;
 }
 
+long long hourOf(const Sample& sample) {
+    return sample.moment / hour;
+}
+
 void tell(const Sample& sample) {
     const RecordCheck::Seen& seen = course->check.seen();
-    std::printf("%6lld %8llu %8llu %12u %10zu %8zu %7zu %6zu %9zu\n",
-                static_cast<long long>(sample.moment / hour),
+    std::printf("%6lld %8llu %8llu %12u %10zu %8zu %7zu %6zu %9zu\n", hourOf(sample),
                 static_cast<unsigned long long>(seen.toons),
                 static_cast<unsigned long long>(seen.walksAbout), course->check.odometer(),
                 sample.holdings.heap, HandlesOf(sample.holdings), sample.holdings.handles.timers,
@@ -92,7 +98,8 @@ void toss() {
     }
 }
 
-/// Samples are taken where a walk about ends, so that like is compared with like.
+/// Samples are taken where a walk about ends on one and the same tile, or a run does, so that like
+/// is compared with like: tiles differ in size.
 void takeLine(const char* line) {
     course->check.take(line);
     if (!std::string_view(line).ends_with(" show_done") || RandomWalkActive != 0) {
@@ -101,7 +108,8 @@ void takeLine(const char* line) {
     if (!course->tossed) {
         return;
     }
-    if (NextToonFile[0] == '\0' && seam::clockNow() >= nextSample()) {
+    if (NextToonFile[0] == '\0' && BackgroundIndex == tileOfSamples &&
+        seam::clockNow() >= nextSample()) {
         sample();
     }
     toss();
@@ -136,6 +144,12 @@ std::string savedPaces(const std::filesystem::path& file) {
     return "";
 }
 
+/// Whether the key has to wait for what the next sample needs.
+bool sampleMissing() {
+    return course->tossed ? course->samples.size() < course->wanted
+                          : BackgroundIndex != tileOfSamples;
+}
+
 /// From the saver's start to the key that ends it.
 void runSaver(const Options& options, std::int64_t end, const std::filesystem::path& settings) {
     const std::uint32_t before = course->check.odometer();
@@ -144,12 +158,13 @@ void runSaver(const Options& options, std::int64_t end, const std::filesystem::p
     course->check.expect(PacesWalked == before, "the settings' odometer wasn't read");
     auto due = seam::nextDeadline();
     bool stands = true;
-    while (stands && due && *due <= end) {
+    constexpr std::int64_t patience = 10 * hour;
+    while (stands && due && *due <= end + (sampleMissing() ? patience : 0)) {
         stands = seam::runUntil(*due);
         due = seam::nextDeadline();
     }
     course->check.expect(stands && due, "the saver stands still, or went by itself");
-    stands = stands && seam::runUntil(end);
+    stands = stands && seam::runUntil(std::max(end, seam::clockNow()));
     PostMessageA(window, WM_KEYDOWN, ' ', 0);
     seam::runUntil(seam::clockNow());
     course->check.expect(IsWindow(window) == FALSE, "a key doesn't end the saver");
@@ -190,7 +205,7 @@ void compareSamples() {
     check.expect(course->samples.size() >= 2, "nothing to compare");
     for (const Sample& later : course->samples) {
         const Holdings& first = course->samples.front().holdings;
-        const std::string when = " at hour " + std::to_string(later.moment / hour);
+        const std::string when = " at hour " + std::to_string(hourOf(later));
         check.expect(later.holdings.handles == first.handles, "other handles" + when);
         check.expect(later.holdings.files == first.files, "other open files" + when);
         check.expect(later.holdings.heap <= first.heap + slack, "more heap" + when);
@@ -264,6 +279,7 @@ int showDays(const Options& options) {
     Course all{{options.size, pacesAtStart},
                std::mt19937(options.seed),
                options.run == 0,
+               static_cast<std::size_t>(options.hours / period),
                period * hour,
                {}};
     course = &all;
