@@ -1,26 +1,15 @@
-// Any bytes for the loader of Toons and for the reader of JSON: they may refuse them, and must keep
-// their promises.
-//
-//   cmake --preset debug -B build/fuzz -DDORBO_FUZZ=ON
-//   cmake --build build/fuzz --target toon_fuzz
-//   mkdir -p build/fuzz/corpus; export QT_QPA_PLATFORM=offscreen
-//   build/fuzz/tests/fuzz/toon_fuzz -max_total_time=60 -dict=tests/fuzz/toon.dict build/fuzz/corpus
-//   tests/toon/bad toons
-#include "cli/toon_json.h"
-#include "platform/harness.h"
-#include "tests/fuzz/scratch_directory.h"
+// Any bytes for a Toon's file: a load may refuse them and keeps its promises, and what loads is
+// saved, loaded again and shown to its end, or for the first minute of it. How it is run:
+// docs/fuzzing.md.
+#include "cli/replay.h"
+#include "tests/fuzz/fuzz.h"
 #include "toon/toon_document.h"
 
-#include <cstdlib>
 #include <cstring>
 
 namespace {
 
-void demand(bool kept) {
-    if (!kept) {
-        std::abort();
-    }
-}
+constexpr std::int64_t longestShow = 60'000; // ms
 
 /// Every frame in force can be read and has its NUL, and there is none behind them.
 void checkFrames() {
@@ -34,34 +23,18 @@ void checkFrames() {
     demand(strnlen(CaptionText, sizeof CaptionText) < sizeof CaptionText);
 }
 
-/// What is shown of a Toon makes a Toon that shows the same.
-void checkShown(const Toon& toon) {
-    const std::string json = ToonToJson(toon);
-    const ToonFromJson made = JsonToToon(json);
-    demand(made.error.empty());
-    demand(ToonToJson(made.toon) == json);
-}
-
-void checkJson(std::string_view bytes) {
-    Toon toon{};
-    if (ToonFromBytes(bytes, toon).empty()) {
-        checkShown(toon);
-    }
-    const ToonFromJson made = JsonToToon(bytes);
-    if (made.error.empty()) {
-        checkShown(made.toon);
-    }
-}
-
-} // namespace
-
-extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
-    static const std::filesystem::path file = scratchDirectory() / "x.zkt";
-    seam::answerBoxes([](const std::string&, const std::string&, UINT) { return IDOK; });
-    writeBytes(file, bytes, size);
-    const int opened = ToonOpenNamed(nullptr, file.c_str());
+/// Loads it; if that can be done, saves it and loads it again. Gives whether a box complained of
+/// it.
+bool load(const std::filesystem::path& file) {
+    bool complained = false;
+    seam::answerBoxes([&](const std::string&, const std::string&, UINT) {
+        complained = true;
+        return IDOK;
+    });
+    const bool opened = ToonOpenNamed(nullptr, file.c_str()) == 1;
     checkFrames();
-    if (opened == 1) {
+    const bool faulty = complained;
+    if (opened) {
         const LONG before = FrameCount;
         demand(before > 0);
         demand(ToonSave(nullptr) == 1);
@@ -70,6 +43,45 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t siz
         FrameStoreDelete(0);
         checkFrames();
     }
-    checkJson({reinterpret_cast<const char*>(bytes), size});
+    FrameStoreFree();
+    return faulty;
+}
+
+void show(const std::filesystem::path& file, ReplayMode mode, bool faulty) {
+    ReplayOptions options;
+    options.mode = mode;
+    options.toons = {file};
+    options.width = 320;
+    options.height = 240;
+    options.paces = 100;
+    options.longest = longestShow;
+    const seam::HandleCounts before = seam::liveHandles();
+    const ReplayEnd end = Replay(options, {});
+    demand(seam::liveHandles() == before);
+    demand(end.message.empty() != faulty);
+    demand(end.moment <= longestShow);
+}
+
+} // namespace
+
+extern "C" int LLVMFuzzerInitialize(int* /*count*/, char*** /*words*/) {
+    standAlone();
+    for (const ReplayMode mode : {ReplayMode::player, ReplayMode::saver}) {
+        ReplayOptions options;
+        options.mode = mode;
+        options.longest = 1;
+        Replay(options, {}); // what is made once for the process
+    }
+    return 0;
+}
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
+    static const std::filesystem::path file = scratchDirectory() / "x.zkt";
+    const std::string_view text = textOf(bytes, size);
+    writeBytes(file, text);
+    const bool faulty = load(file);
+    writeBytes(file, text);
+    const bool odd = size > 0 && bytes[size - 1] % 2 == 1; // a byte that a frame doesn't use
+    show(file, odd ? ReplayMode::saver : ReplayMode::player, faulty);
     return 0;
 }
