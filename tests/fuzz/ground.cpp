@@ -16,7 +16,9 @@
 #include <QApplication>
 #include <QClipboard>
 
+#include <cstring>
 #include <iterator>
+#include <limits>
 
 namespace fuzz {
 
@@ -31,6 +33,17 @@ void writeToon(const fs::path& path, const std::vector<ToonFrame>& frames) {
     writeBytes(path, ToonBytes(toon));
 }
 
+/// A Toon that loads, with numbers and texts that the editor would not have made.
+void writeOddToon(const fs::path& path, LONG number) {
+    ToonFrame frame{number, number, number, number, number, "", 0};
+    std::memset(frame.text, 'W', sizeof frame.text);
+    Toon toon{NewHeader(), {frame, {300, 200, 1, 1, 0, "Well", 0}, frame}};
+    std::memset(toon.header.magic, 'M', sizeof toon.header.magic);
+    std::memset(toon.header.caption, 'C', sizeof toon.header.caption);
+    toon.header.speed = toon.header.background = number;
+    writeBytes(path, ToonBytes(toon));
+}
+
 void putToons(const fs::path& toons) {
     fs::create_directories(toons / "Sub");
     writeToon(toons / "two.zkt", {{200, 300, 1, 2, 0, "One", 0}, {300, 300, 2, 2, 1, "Two", 0}});
@@ -39,6 +52,8 @@ void putToons(const fs::path& toons) {
     writeToon(toons / "locked.zkt", {{400, 400, 3, 1, 0, "", 0}});
     writeToon(toons / "Sub" / "deep.zkt", {{400, 400, 3, 1, 0, "", 0}});
     fs::permissions(toons / "locked.zkt", fs::perms::owner_read);
+    writeOddToon(toons / "high.zkt", std::numeric_limits<LONG>::max());
+    writeOddToon(toons / "low.zkt", std::numeric_limits<LONG>::min());
     writeBytes(toons / "none.zkt", "no Toon");
 }
 
@@ -95,7 +110,8 @@ void checkFrameEditor() {
     demand((grey == MF_GRAYED) == (ToonDirty == 0));
     char label[40];
     GetDlgItemTextA(EditorDialog, POSE_BUTTON, label, sizeof label);
-    demand(label == "Frame P&ose = " + std::to_string(EditPose + 1));
+    demand(label == "Frame P&ose = " + std::to_string(static_cast<std::int32_t>(
+                                           static_cast<std::uint32_t>(EditPose) + 1)));
 }
 
 void runWithUser(std::string_view bytes, const Place& place) {

@@ -19,7 +19,8 @@ void checkFrames() {
         demand(FrameGet(i, &frame) == 1);
         demand(strnlen(frame.text, sizeof frame.text) < sizeof frame.text);
     }
-    demand(FrameGet(FrameCount, &frame) == 0);
+    demand(FrameGet(FrameCount, &frame) == 0 && FrameGet(-1, &frame) == 0);
+    demand(FrameStoreDelete(FrameCount) == 0 && FrameStoreInsert(FrameCount + 1) == 0);
     demand(strnlen(CaptionText, sizeof CaptionText) < sizeof CaptionText);
 }
 

@@ -337,7 +337,9 @@ std::optional<std::string> User::chooseFile() {
                                                 "no/such/place.zkt",
                                                 "Sub",
                                                 "Sub/deep.zkt",
-                                                std::string(251, 'x')};
+                                                std::string(251, 'x'),
+                                                "high.zkt",
+                                                "low.zkt"};
     const std::size_t which = next();
     const std::size_t place = which >= '0' ? which - '0' : which;
     if (place % (names.size() + 1) == names.size()) {
