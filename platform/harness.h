@@ -74,6 +74,10 @@ void answerFileDialogs(FileAnswer answer);
 /// Minimises a top-level window or brings it back, as its window manager would.
 void minimise(HWND window, bool minimised);
 
+/// Drops a window class that the program has registered, for it to do so again as a fresh process
+/// does. No window of the class may live.
+void forgetClass(const std::string& name);
+
 /// A copy of a window's picture, row by row, 0x00rrggbb.
 struct Picture {
     int width = 0;

@@ -303,6 +303,10 @@ WORD RegisterClassA(const WNDCLASSA* windowClass) {
     return static_cast<WORD>(classes().size());
 }
 
+void seam::forgetClass(const std::string& name) {
+    classes().erase(name);
+}
+
 static bool namesButton(const char* className) {
     return className != nullptr && strcasecmp(className, "button") == 0;
 }

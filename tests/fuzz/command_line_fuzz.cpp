@@ -4,6 +4,7 @@
 #include "cli/options.h"
 #include "cli/scene.h"
 #include "launch/hack_options.h"
+#include "platform/harness.h"
 #include "platform/kernel.h"
 #include "saver/saver_guard.h"
 #include "saver/saver_main.h"
@@ -28,7 +29,8 @@ Words wordsOf(std::string_view text) {
 
 // ---- The saver ----------------------------------------------------------------------------------
 
-HWND host; // in which a preview is shown
+constexpr std::string_view looksOn = ".5"; // for some steps of a show, then leaves
+HWND host;                                 // in which a preview is shown
 
 /// Whatever the line has opened, from the front to the back.
 void closeOne() {
@@ -60,6 +62,7 @@ void runSaver(const Words& words) {
     }
     SetCommandLineArguments(static_cast<int>(arguments.size()), arguments.data());
     const int code = ProcessStart();
+    seam::forgetClass(SAVER_CLASS); // a process runs one saver
     demand(code == 0 || code == 1 || code == -1);
     DestroyWindow(host);
 }
@@ -113,7 +116,7 @@ extern "C" int LLVMFuzzerInitialize(int* /*count*/, char*** /*words*/) {
     windowClass.lpszClassName = "FuzzedHost";
     RegisterClassA(&windowClass);
     for (const char* line : {"S", "C", "P @", "A"}) {
-        fuzz::runWithUser("", {[&] { runSaver({line}); }, closeOne, nullptr});
+        fuzz::runWithUser(looksOn, {[&] { runSaver({line}); }, closeOne, nullptr});
     }
     fuzz::warm = true;
     return 0;
@@ -125,6 +128,6 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t siz
     readToonOptions(words);
     readHackOptions(words);
     readScene(text);
-    fuzz::runWithUser("", {[&] { runSaver(words); }, closeOne, nullptr});
+    fuzz::runWithUser(looksOn, {[&] { runSaver(words); }, closeOne, nullptr});
     return 0;
 }
