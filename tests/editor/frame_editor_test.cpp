@@ -361,6 +361,10 @@ TEST_F(Leaving, AnOpenThatFailsLeavesAnUntitledToonBehindTheFields) {
     std::ifstream in(toons() / "none.zkt");
     std::string text;
     EXPECT_TRUE(std::getline(in, text) && text == "no Toon");
+    change("two.zkt", false);
+    fileGiven = "";
+    command(105);
+    EXPECT_EQ(shown(X_FIELD), "111") << "none was chosen";
 }
 
 TEST_F(Leaving, AFileThatCannotBeReadAgainLosesItsName) {

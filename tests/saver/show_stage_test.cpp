@@ -73,6 +73,8 @@ TEST_F(ShowStage, ThePreviewWalksOnceAndNeverLoadsWhatItChose) {
         EXPECT_THAT(events({"random_walk", "show_done", "random_walk_refused", "load"}),
                     ElementsAre("random_walk target=[10,0] pose=6 wink=1 statement=0", "show_done",
                                 "random_walk_refused", "show_done", "random_walk_refused"));
+        EXPECT_THAT(events({"timer_set timer=PAUSE"}),
+                    ElementsAre("timer_set timer=PAUSE id=2 ms=3000"));
         EXPECT_EQ(seam::liveHandles().timers, 0U);
         closeStage();
         EXPECT_EQ(cursorCount(), cursorBefore);

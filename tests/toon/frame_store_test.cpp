@@ -11,6 +11,13 @@ using Positions = std::vector<LONG>;
 
 class FrameStoreTest : public test::ToonTest {};
 
+// Taken before anything else runs.
+const std::tuple atStart{FrameCount, CurrentFrameIndex, ToonSpeed, BackgroundIndex, ToonDirty};
+
+TEST_F(FrameStoreTest, AProcessBeginsWithOneFrameAtMiddleSpeed) {
+    EXPECT_EQ(atStart, std::tuple(1, 0, 3, 0, 0U));
+}
+
 TEST_F(FrameStoreTest, IndicesAreHeldToTheStore) {
     const std::tuple<LONG, LONG, int, int> cases[] = {
         {3, -1, 0, 0}, {3, 0, 1, 1},         {3, 1, 1, 1},         {3, 2, 0, 1},

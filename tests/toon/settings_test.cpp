@@ -4,11 +4,16 @@
 #include "platform/kernel.h"
 #include "tests/kernel/scratch_directory.h"
 
+#include <gmock/gmock.h>
+
 #include <cstring>
 
 namespace {
 
 constexpr const char* file = "dorbo/Dorbo95.ini";
+
+// Taken before anything else runs.
+const LONG switchesAtStart[] = {WalkingStyle, Statements, Backgrounds};
 
 class Settings : public ConfigDirectory {
   protected:
@@ -25,11 +30,14 @@ class Settings : public ConfigDirectory {
 };
 
 TEST_F(Settings, AFirstRunHasItsDefaultsAndPinsTheDirectory) {
+    EXPECT_THAT(switchesAtStart, testing::Each(1));
     SettingsLoad();
+    EXPECT_FALSE(SettingsNameDirectory());
     EXPECT_EQ(WalkingStyle + WalkingStyleChoice + Statements + Backgrounds, 4);
     EXPECT_EQ(PacesWalked, 0U);
     EXPECT_EQ(Directory, whole() + "\\");
     SettingsSave();
+    EXPECT_TRUE(SettingsNameDirectory());
     std::filesystem::current_path("/");
     SettingsLoad();
     EXPECT_EQ(Directory, whole() + "\\");

@@ -156,10 +156,10 @@ TEST_F(ToonFile, AReloadDiscardsChangesAndCountsWhatTheStoreHas) {
     EXPECT_EQ(ToonReload(nullptr), 300);
     EXPECT_EQ(positions().size(), 300U);
     make("good.zkt", wholeToon(4).replace(32, 1, "9")); // another version
-    for (const LONG before : {1, 1000}) {
+    for (const LONG before : {-1, 1, 1000}) {
         ToonDocHeader.frameCount = before;
         EXPECT_EQ(ToonLoad(nullptr), 0);
-        EXPECT_EQ(FrameCount, std::min(before, 4));
+        EXPECT_EQ(FrameCount, std::clamp(before, 0, 4));
     }
 }
 
