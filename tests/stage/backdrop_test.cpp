@@ -56,12 +56,15 @@ TEST_F(Backdrop, BlanksTheStageOnlyInASaverOnceTheTitleIsPainted) {
 TEST_F(Backdrop, ShowsTheBigTitleOnceAndThenTheCaptionInTheSaverOnly) {
     const std::vector<DWORD> bare = pixels();
     const std::vector<DWORD> captionLine = rows(0, 24);
-    const std::vector<DWORD> titleLine = rows(214, 260); // 170 above the middle
+    const std::vector<DWORD> titleLine = rows(214, 260);  // 170 above the middle
+    const std::vector<DWORD> bylineLine = rows(304, 330); // 80 above it
+    const std::vector<DWORD> topLine = rows(0, 20);
     TitleShown = 0;
     CopyText(StageTitle, "Fenky Dorbo Screen Saver", sizeof StageTitle);
     repaint();
     EXPECT_EQ(TitleShown, 1U);
     EXPECT_NE(rows(214, 260), titleLine);
+    EXPECT_NE(rows(304, 330), bylineLine);
     repaint();
     EXPECT_EQ(pixels(), bare) << "an empty caption draws nothing";
     CopyText(CaptionText, "A caption", sizeof CaptionText);
@@ -74,6 +77,7 @@ TEST_F(Backdrop, ShowsTheBigTitleOnceAndThenTheCaptionInTheSaverOnly) {
     TitleShown = 0;
     repaint();
     EXPECT_NE(pixels(), bare);
+    EXPECT_EQ(rows(0, 20), topLine);
     EXPECT_EQ(TitleShown, 0U);
     PreviewMode = 0;
 }

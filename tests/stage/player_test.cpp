@@ -44,6 +44,16 @@ TEST_F(Player, ResetBringsEveryStateToRest) {
     EXPECT_EQ(NextFrameIndex, 1) << "without art nothing happens";
 }
 
+TEST_F(Player, ThePointerTellsThatHeIsBusyButNotInTheSaver) {
+    for (const DWORD saver : {1U, 0U}) {
+        SaverActive = saver;
+        SetBusyCursor(stage, TRUE);
+        const LONG cursor = SetClassLongA(stage, GCL_HCURSOR, 0);
+        EXPECT_EQ(cursor, saver == 1 ? 0 : static_cast<LONG>(IDC_WAIT.number)) << saver;
+    }
+    SaverActive = 1;
+}
+
 TEST_F(Player, TellsHowFarTheShowHasCome) {
     NextFrameIndex = 2;
     FrameCount = 3;
