@@ -98,9 +98,13 @@ TEST_F(Backdrop, SavesWhatLiesUnderHimOnlyWhenAsked) {
     EXPECT_EQ(pixels(), bare);
 }
 
-TEST_F(Backdrop, TheEditorsStageKeepsItsSize) {
+TEST_F(Backdrop, TheEditorsStageKeepsItsPlaceAndSize) {
     MoveWindow(stage, 3, 4, 50, 60, FALSE);
     EXPECT_EQ(ResizeStage(stage), 0);
+    RECT place = {};
+    GetWindowRect(stage, &place);
+    EXPECT_EQ(place.left, 10);
+    EXPECT_EQ(place.top, 25);
     EXPECT_EQ(pixels().size(), 1024U * 768U);
 }
 

@@ -48,8 +48,8 @@ TEST_F(Player, ThePointerTellsThatHeIsBusyButNotInTheSaver) {
     for (const DWORD saver : {1U, 0U}) {
         SaverActive = saver;
         SetBusyCursor(stage, TRUE);
-        const LONG cursor = SetClassLongA(stage, GCL_HCURSOR, 0);
-        EXPECT_EQ(cursor, saver == 1 ? 0 : static_cast<LONG>(IDC_WAIT.number)) << saver;
+        const DWORD cursor = SetClassLongA(stage, GCL_HCURSOR, 0);
+        EXPECT_EQ(cursor, saver == 1 ? 0U : IDC_WAIT.number) << saver;
     }
     SaverActive = 1;
 }
