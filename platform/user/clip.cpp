@@ -1,6 +1,7 @@
 // The pointer confined to a part of the screen. The X server knows how to confine it to a window
 // only, so there is one that nobody sees: it has no picture, and lies below all others.
 #include "platform/user.h"
+#include "platform/user/reply.h"
 #include "platform/user/scale.h"
 #include "platform/user/toolkit.h"
 
@@ -8,8 +9,6 @@
 #include <QEvent>
 #include <QSize>
 
-#include <cstdlib>
-#include <memory>
 #include <string_view>
 #include <xcb/xcb.h>
 
@@ -56,8 +55,7 @@ static bool confine(xcb_connection_t* connection) {
     const auto request = xcb_grab_pointer(
         connection, 1, clipWindow, XCB_EVENT_MASK_BUTTON_PRESS | XCB_EVENT_MASK_BUTTON_RELEASE,
         XCB_GRAB_MODE_ASYNC, XCB_GRAB_MODE_ASYNC, clipWindow, XCB_NONE, XCB_CURRENT_TIME);
-    const std::unique_ptr<xcb_grab_pointer_reply_t, decltype(&std::free)> reply(
-        xcb_grab_pointer_reply(connection, request, nullptr), &std::free);
+    const auto reply = own(xcb_grab_pointer_reply(connection, request, nullptr));
     return reply != nullptr && reply->status == XCB_GRAB_STATUS_SUCCESS;
 }
 

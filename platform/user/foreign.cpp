@@ -2,6 +2,7 @@
 
 #include "platform/user/native_window.h"
 #include "platform/user/queue.h"
+#include "platform/user/reply.h"
 #include "platform/user/scale.h"
 #include "platform/user/toolkit.h"
 #include "platform/user/window.h"
@@ -9,9 +10,7 @@
 #include <QAbstractNativeEventFilter>
 #include <QGuiApplication>
 
-#include <cstdlib>
 #include <cstring>
-#include <memory>
 #include <string_view>
 #include <vector>
 #include <xcb/xcb.h>
@@ -19,14 +18,6 @@
 namespace seam {
 
 namespace {
-
-template <class Reply>
-using ReplyPointer = std::unique_ptr<Reply, decltype(&std::free)>;
-
-template <class Reply>
-ReplyPointer<Reply> own(Reply* reply) {
-    return {reply, &std::free};
-}
 
 /// A size that the X server tells as ours: of what isn't whole there must be no strip left.
 QSize ourSize(int width, int height) {

@@ -1,5 +1,6 @@
 #include "platform/user/scale.h"
 
+#include "platform/user/reply.h"
 #include "platform/user/toolkit.h"
 
 #include <QGuiApplication>
@@ -11,7 +12,6 @@
 #include <cmath>
 #include <cstdio>
 #include <cstdlib>
-#include <memory>
 #include <optional>
 #include <xcb/xcb.h>
 
@@ -86,10 +86,8 @@ QSize displaySize() {
     if (connection == nullptr) {
         return {};
     }
-    const std::unique_ptr<xcb_get_geometry_reply_t, decltype(&std::free)> geometry(
-        xcb_get_geometry_reply(connection, xcb_get_geometry(connection, rootWindow(connection)),
-                               nullptr),
-        &std::free);
+    const auto geometry = own(xcb_get_geometry_reply(
+        connection, xcb_get_geometry(connection, rootWindow(connection)), nullptr));
     return geometry == nullptr ? QSize() : QSize(geometry->width, geometry->height);
 }
 

@@ -4,6 +4,7 @@
 #include "platform/user/cursors.h"
 #include "platform/user/grabs.h"
 #include "platform/user/native_window.h"
+#include "platform/user/reply.h"
 #include "platform/user/scale.h"
 #include "platform/user/sleep_lock.h"
 #include "platform/user/toolkit.h"
@@ -17,7 +18,6 @@
 #include <QTimer>
 
 #include <algorithm>
-#include <cstdlib>
 #include <memory>
 #include <xcb/xcb.h>
 
@@ -177,10 +177,8 @@ class Screens : public QObject, public QAbstractNativeEventFilter {
             return;
         }
         root_ = rootWindow(connection);
-        const std::unique_ptr<xcb_get_window_attributes_reply_t, decltype(&std::free)> now(
-            xcb_get_window_attributes_reply(connection,
-                                            xcb_get_window_attributes(connection, root_), nullptr),
-            &std::free);
+        const auto now = own(xcb_get_window_attributes_reply(
+            connection, xcb_get_window_attributes(connection, root_), nullptr));
         if (now != nullptr) {
             const std::uint32_t mask = now->your_event_mask | XCB_EVENT_MASK_SUBSTRUCTURE_NOTIFY;
             xcb_change_window_attributes(connection, root_, XCB_CW_EVENT_MASK, &mask);
@@ -282,7 +280,7 @@ void pictureShown(HWND window) {
     }
     if (xcb_connection_t* connection = xConnection()) {
         // Once the X server answers it has done all that it was told before.
-        std::free(xcb_get_input_focus_reply(connection, xcb_get_input_focus(connection), nullptr));
+        own(xcb_get_input_focus_reply(connection, xcb_get_input_focus(connection), nullptr));
     }
     releaseSleepLock();
 }
