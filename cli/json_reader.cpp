@@ -1,14 +1,11 @@
 #include "cli/json_text.h"
+#include "cli/json_value.h"
 #include "cli/toon_json.h"
-
-#include "platform/codepage.h"
 
 #include <rapidjson/memorystream.h>
 #include <rapidjson/reader.h>
 
 #include <algorithm>
-#include <charconv>
-#include <cstdio>
 #include <optional>
 #include <span>
 
@@ -21,83 +18,6 @@ constexpr std::string_view toonForm = R"({"frames": [...]})";
 constexpr std::string_view framesForm = "a list of frames";
 constexpr std::string_view frameForm = R"({"x": 420, "y": 780, "pose": 1})";
 
-struct Value {
-    enum class Type { null, boolean, number, text, object, list } type;
-    std::string_view text; // as it stands in the file, of a text what it says
-};
-
-std::string Cut(std::string_view text) {
-    constexpr std::size_t longest = 40;
-    if (text.size() <= longest) {
-        return std::string(text);
-    }
-    std::size_t end = longest;
-    while (end > 0 && (static_cast<unsigned char>(text[end]) & 0xC0U) == 0x80U) {
-        --end; // not within a character
-    }
-    return std::string(text.substr(0, end)) + "...";
-}
-
-std::string Described(const Value& value) {
-    return value.type == Value::Type::text ? JsonText(Cut(value.text)) : Cut(value.text);
-}
-
-std::string Refusal(const Value& value, std::string_view noun, std::string_view right) {
-    return Advice(Described(value).append(" is no ").append(noun), right);
-}
-
-/// The end of the UTF-8 character that begins at `begin`.
-std::size_t CharacterEnd(std::string_view text, std::size_t begin) {
-    std::size_t end = begin + 1;
-    while (end < text.size() && (static_cast<unsigned char>(text[end]) & 0xC0U) == 0x80U) {
-        ++end;
-    }
-    return end;
-}
-
-/// "U+263A" of a character in UTF-8, also of half a pair, which isn't valid alone.
-std::string CodePoint(std::string_view character) {
-    unsigned code = static_cast<unsigned char>(character.front());
-    constexpr unsigned leading[] = {0x7F, 0x7F, 0x1F, 0x0F, 0x07};
-    code &= leading[std::min<std::size_t>(character.size(), 4)];
-    for (const char byte : character.substr(1)) {
-        code = code << 6U | (static_cast<unsigned char>(byte) & 0x3FU);
-    }
-    char digits[16];
-    std::snprintf(digits, sizeof digits, "U+%04X", code);
-    return digits;
-}
-
-/// The bytes of a text that has room in its field; what is wrong, in `error`, if it hasn't.
-std::string BytesForText(const Field& field, std::string_view text, std::string& error) {
-    const auto characters = std::count_if(text.begin(), text.end(), [](char byte) {
-        return (static_cast<unsigned char>(byte) & 0xC0U) != 0x80U;
-    });
-    if (characters > field.most) {
-        error = Advice(std::to_string(characters) + " characters are too many", field.right);
-        return "";
-    }
-    std::string bytes;
-    for (std::size_t begin = 0, end = 0; begin < text.size(); begin = end) {
-        end = CharacterEnd(text, begin);
-        const std::string_view character = text.substr(begin, end - begin);
-        const std::optional<std::string> byte = seam::windows1252FromUtf8(character);
-        if (character.front() == '\0') {
-            error = Advice("a \\u0000 would end the text", "any other character");
-            return "";
-        }
-        if (!byte || byte->size() != 1) {
-            const std::string seen = IsUtf8(character) ? JsonText(character) + ", " : "";
-            error = Advice(seen + CodePoint(character) + (seen.empty() ? "" : ",") +
-                               " is not in Windows-1252",
-                           "a character of that set");
-            return "";
-        }
-        bytes += *byte;
-    }
-    return WithBreaksSwapped(bytes);
-}
-
 /// What the parser tells step by step, in the order of the file.
 class Reader {
   public:
@@ -108,27 +28,27 @@ class Reader {
     // The parser's names. False ends the reading.
 
     bool Null() {
-        return take({Value::Type::null, "null"});
+        return take({JsonType::null, "null"});
     }
 
     bool Bool(bool value) {
-        return take({Value::Type::boolean, value ? "true" : "false"});
+        return take({JsonType::boolean, value ? "true" : "false"});
     }
 
     bool RawNumber(const char* text, json::SizeType length, bool) {
-        return take({Value::Type::number, {text, length}});
+        return take({JsonType::number, {text, length}});
     }
 
     bool String(const char* text, json::SizeType length, bool) {
-        return take({Value::Type::text, {text, length}});
+        return take({JsonType::text, {text, length}});
     }
 
     bool StartObject() {
-        return take({Value::Type::object, "{...}"});
+        return take({JsonType::object, "{...}"});
     }
 
     bool StartArray() {
-        return take({Value::Type::list, "[...]"});
+        return take({JsonType::list, "[...]"});
     }
 
     bool Key(const char* name, json::SizeType length, bool);
@@ -170,11 +90,11 @@ class Reader {
   private:
     enum class Place { root, toon, stage, frames, frame };
 
-    bool take(const Value& value);
-    bool takeInToon(const Value& value);
-    bool takeSide(const Value& value);
-    bool takeField(const Value& value, char* record);
-    bool takeFrame(const Value& value);
+    bool take(const JsonValue& value);
+    bool takeInToon(const JsonValue& value);
+    bool takeSide(const JsonValue& value);
+    bool takeField(const JsonValue& value, char* record);
+    bool takeFrame(const JsonValue& value);
     bool closeFrame();
 
     std::span<const Field> fields() const;
@@ -244,7 +164,7 @@ bool Reader::Key(const char* name, json::SizeType length, bool) {
                                     [&](const Field& field) { return field.name == key; });
     const bool ofFrames = place_ == Place::toon && key == framesName;
     if (found == known.end() && !ofFrames) {
-        const std::string what = "no field is called " + JsonText(Cut(key));
+        const std::string what = "no field is called " + JsonText(Shortened(key));
         return fail(Advice(what, place_ == Place::frame
                                      ? "x, y, pose, pause, wink or text"
                                      : "caption, stage, speed, background, magic or frames"));
@@ -259,10 +179,10 @@ bool Reader::Key(const char* name, json::SizeType length, bool) {
     return true;
 }
 
-bool Reader::take(const Value& value) {
+bool Reader::take(const JsonValue& value) {
     switch (place_) {
     case Place::root:
-        if (value.type != Value::Type::object) {
+        if (value.type != JsonType::object) {
             return fail(Refusal(value, "Toon", toonForm));
         }
         recordLine_ = lineAt(stream.Tell());
@@ -279,11 +199,11 @@ bool Reader::take(const Value& value) {
     }
 }
 
-bool Reader::takeInToon(const Value& value) {
+bool Reader::takeInToon(const JsonValue& value) {
     if (field_ != nullptr && field_->kind != FieldKind::stage) {
         return takeField(value, BytesOf(result.toon.header));
     }
-    if (value.type != Value::Type::list) {
+    if (value.type != JsonType::list) {
         return fail(field_ != nullptr ? Refusal(value, field_->noun, field_->right)
                                       : Refusal(value, "list of frames", framesForm));
     }
@@ -291,15 +211,7 @@ bool Reader::takeInToon(const Value& value) {
     return true;
 }
 
-std::optional<std::int64_t> WholeNumber(const Value& value) {
-    std::int64_t number = 0;
-    const char* end = value.text.data() + value.text.size();
-    const auto [stopped, error] = std::from_chars(value.text.data(), end, number);
-    const bool whole = value.type == Value::Type::number && error == std::errc() && stopped == end;
-    return whole ? std::optional(number) : std::nullopt;
-}
-
-bool Reader::takeSide(const Value& value) {
+bool Reader::takeSide(const JsonValue& value) {
     const std::optional<std::int64_t> number = WholeNumber(value);
     if (!number || *number < field_->low || *number > field_->high) {
         return fail(Refusal(value, "side of a stage", field_->right));
@@ -311,8 +223,8 @@ bool Reader::takeSide(const Value& value) {
     return sides_ <= 2 || fail(Advice("there are more than two numbers", field_->right));
 }
 
-bool Reader::takeFrame(const Value& value) {
-    if (value.type != Value::Type::object) {
+bool Reader::takeFrame(const JsonValue& value) {
+    if (value.type != JsonType::object) {
         name_ = "frame " + std::to_string(result.toon.frames.size() + 1);
         return fail(Refusal(value, "frame", frameForm));
     }
@@ -324,9 +236,9 @@ bool Reader::takeFrame(const Value& value) {
     return true;
 }
 
-bool Reader::takeField(const Value& value, char* record) {
+bool Reader::takeField(const JsonValue& value, char* record) {
     if (field_->kind == FieldKind::text) {
-        if (value.type != Value::Type::text) {
+        if (value.type != JsonType::text) {
             return fail(Refusal(value, field_->noun, field_->right));
         }
         std::string error;
@@ -339,7 +251,7 @@ bool Reader::takeField(const Value& value, char* record) {
         return true;
     }
     std::optional<std::int64_t> number = WholeNumber(value);
-    if (field_->kind == FieldKind::wink && value.type == Value::Type::boolean) {
+    if (field_->kind == FieldKind::wink && value.type == JsonType::boolean) {
         number = value.text == "true" ? 1 : 0;
     }
     return (number && SetNumber(*field_, record, *number)) ||

@@ -13,4 +13,9 @@ std::string utf8FromWindows1252(std::string_view text);
 /// The way back; nothing if the bytes are no UTF-8, or hold a character that Windows-1252 lacks.
 std::optional<std::string> windows1252FromUtf8(std::string_view text);
 
+/// Whether a byte of UTF-8 goes on with a character that an earlier one began.
+inline bool continuesUtf8(char byte) {
+    return (static_cast<unsigned char>(byte) & 0xC0U) == 0x80U;
+}
+
 } // namespace seam

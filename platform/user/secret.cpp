@@ -1,20 +1,13 @@
 #include "platform/user/secret.h"
 
+#include "platform/codepage.h"
+
 #include <algorithm>
 #include <new>
 #include <sodium.h>
 #include <sys/prctl.h>
 
 namespace seam {
-
-namespace {
-
-/// Whether the byte goes on with a character that an earlier one began.
-bool goesOn(char byte) {
-    return (static_cast<unsigned char>(byte) & 0xC0U) == 0x80U;
-}
-
-} // namespace
 
 Secret::Secret() {
     if (sodium_init() >= 0) {
@@ -48,7 +41,7 @@ void Secret::cutTo(std::size_t size) {
 
 void Secret::removeLast() {
     std::size_t size = size_;
-    while (size > 0 && goesOn(memory_[size - 1])) {
+    while (size > 0 && continuesUtf8(memory_[size - 1])) {
         --size;
     }
     cutTo(size > 0 ? size - 1 : 0);
@@ -59,7 +52,7 @@ void Secret::clear() {
 }
 
 std::size_t Secret::characters() const {
-    return size_ - static_cast<std::size_t>(std::count_if(memory_, memory_ + size_, goesOn));
+    return size_ - static_cast<std::size_t>(std::count_if(memory_, memory_ + size_, continuesUtf8));
 }
 
 NoDumps::NoDumps() : before_(prctl(PR_GET_DUMPABLE) == 1) {
