@@ -10,8 +10,7 @@
 
 #include <cstdint>
 
-// ---- Dialogs
-// ---------------------------------------------------------------------------------------
+// ---- Dialogs -----------------------------------------------------------------------------------
 
 /// Before the dialog shows; lParam is the parameter of its making. A result other than 0 gives the
 /// focus to the first tab stop.
@@ -39,8 +38,7 @@ BOOL EndDialog(HWND dialog, LPARAM result);
 /// the toolkit.
 BOOL IsDialogMessageA(HWND dialog, const MSG* message);
 
-// ---- The controls of a dialog, by their ids
-// --------------------------------------------------------
+// ---- The controls of a dialog, by their ids ----------------------------------------------------
 //
 // Of several with one id it may be any. Nothing happens where there is none.
 
@@ -61,8 +59,7 @@ UINT IsDlgButtonChecked(HWND dialog, int id);         ///< 1 or 0
 BOOL EnableWindow(HWND window, BOOL enable); ///< whether it was disabled before
 BOOL IsWindowEnabled(HWND window);
 
-// ---- Styles of controls
-// ----------------------------------------------------------------------------
+// ---- Styles of controls ------------------------------------------------------------------------
 
 constexpr DWORD WS_CAPTION = 0x00C00000;
 constexpr DWORD WS_SYSMENU = 0x00080000;
@@ -96,8 +93,7 @@ constexpr DWORD LBS_NOTIFY = 0x0001;
 constexpr DWORD LBS_SORT = 0x0002;
 constexpr DWORD LBS_NOINTEGRALHEIGHT = 0x0100;
 
-// ---- Messages of controls
-// --------------------------------------------------------------------------
+// ---- Messages of controls ----------------------------------------------------------------------
 
 // In the high word of a WM_COMMAND's wParam; the low word is the id, lParam the control.
 constexpr WORD BN_CLICKED = 0;
@@ -155,8 +151,7 @@ BOOL SetScrollRange(HWND bar, int kind, int lowest, int highest, BOOL redraw);
 int SetScrollPos(HWND bar, int kind, int position, BOOL redraw); ///< held to the range; the old one
 int GetScrollPos(HWND bar, int kind);
 
-// ---- What the program draws itself
-// -----------------------------------------------------------------
+// ---- What the program draws itself -------------------------------------------------------------
 
 constexpr UINT ODT_COMBOBOX = 3;
 constexpr UINT ODT_BUTTON = 4;

@@ -13,8 +13,7 @@
 
 namespace seam {
 
-// ---- Clock
-// ---------------------------------------------------------------------------------------
+// ---- Clock -------------------------------------------------------------------------------------
 
 /// From now on time stands still at 0 and moves by itself only where a loop would wait, straight
 /// to the earliest deadline. WallClockSeconds gives `seconds` plus what has passed.
@@ -31,8 +30,7 @@ std::optional<std::int64_t> nextDeadline();
 /// been asked to end; gives false then. Deadlines at `milliseconds` itself are met.
 bool runUntil(std::int64_t milliseconds);
 
-// ---- Handles
-// ---------------------------------------------------------------------------------------
+// ---- Handles -----------------------------------------------------------------------------------
 
 /// Live objects by kind.
 struct HandleCounts {
@@ -59,8 +57,7 @@ void countKernelHandles(HandleCounts& counts);
 void countGdiHandles(HandleCounts& counts);
 void countUserHandles(HandleCounts& counts);
 
-// ---- Boxes, pictures, input
-// ------------------------------------------------------------------------
+// ---- Boxes, pictures, input --------------------------------------------------------------------
 
 /// Answers message boxes in the user's place while set; gets text, caption and type.
 using BoxAnswer = std::function<int(const std::string&, const std::string&, UINT)>;

@@ -30,4 +30,4 @@ constexpr DWORD REG_DWORD = 4;
 LONG RegQueryValueExA(HKEY key, const char* name, DWORD* reserved, DWORD* type, BYTE* data,
                       DWORD* size);
 
-LONG RegCloseKey(HKEY key);
+LONG RegCloseKey(HKEY key); ///< ERROR_INVALID_HANDLE if it is no open key

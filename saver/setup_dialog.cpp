@@ -28,8 +28,7 @@ constexpr LPARAM SETUP_DONE = 1; // OK and Cancel end alike
 constexpr std::size_t ENTRY_SIZE = 128; // bytes, NUL included
 constexpr const char* TOON_EXTENSION = ".zkt";
 
-// ---- The controls
-// -------------------------------------------------------------------------------
+// ---- The controls ------------------------------------------------------------------------------
 
 void SetupFillControls(HWND dialog) {
     CheckDlgButton(dialog, WALK_RADIO, WalkingStyleChoice == CHOICE_WALK ? 1 : 0);
@@ -74,8 +73,7 @@ void SetupRefreshList(HWND dialog) {
     ListEntries(dialog, DDL_DRIVES | DDL_DIRECTORY, "*.*");
 }
 
-// ---- The list
-// -----------------------------------------------------------------------------------
+// ---- The list ----------------------------------------------------------------------------------
 
 /// Writes directory + name + backslash, in lower case; FALSE if that doesn't fit.
 static BOOL MakeDirectory(char* result, const char* directory, std::size_t length, const char* name,
@@ -155,8 +153,7 @@ void SetupOpenEntry(HWND dialog, HINSTANCE instance) {
     }
 }
 
-// ---- What it opens
-// ------------------------------------------------------------------------------
+// ---- What it opens -----------------------------------------------------------------------------
 
 void CloseEditorIfOpen() {
     if (EditorMainWindow) {
@@ -181,8 +178,7 @@ int OpenToonTarget(HINSTANCE instance, HWND parent, const char* name, int showCo
     return RunPlayer(instance, nullptr, NamesToon(name) ? name : "");
 }
 
-// ---- The dialog
-// ---------------------------------------------------------------------------------
+// ---- The dialog --------------------------------------------------------------------------------
 
 static LRESULT SaveAndEnd(HWND dialog) {
     // Meant: Cancel comes here too. It has committed nothing, but the file is written.
