@@ -102,10 +102,6 @@ int SetStretchBltMode(HDC dc, int mode); ///< gives the mode before; BLACKONWHIT
 BOOL StretchBlt(HDC target, int x, int y, int width, int height, HDC source, int sourceX,
                 int sourceY, int sourceWidth, int sourceHeight, DWORD operation);
 
-/// The colour of a pixel, CLR_INVALID outside the target.
-constexpr COLORREF CLR_INVALID = 0xFFFFFFFF;
-COLORREF GetPixel(HDC dc, int x, int y);
-
 // ---- Pictures from bytes -----------------------------------------------------------------------
 
 /// The head of a device-independent bitmap, followed by a colour table of four bytes a colour,
@@ -154,8 +150,7 @@ constexpr UINT DIB_RGB_COLORS = 0;
 HBITMAP CreateDIBitmap(HDC dc, const BITMAPINFOHEADER* header, DWORD init, const void* pixels,
                        const BITMAPINFOHEADER* info, UINT usage);
 
-// ---- Lines and shapes
-// ----------------------------------------------------------------------------
+// ---- Lines and shapes --------------------------------------------------------------------------
 
 constexpr int PS_SOLID = 0;
 HPEN CreatePen(int style, int width, COLORREF colour); ///< null for all but PS_SOLID, width 1
@@ -176,14 +171,11 @@ BOOL PtInRect(const RECT* rectangle, POINT point); ///< left and top edges in, t
 constexpr int COLOR_ACTIVECAPTION = 2;
 constexpr int COLOR_BTNFACE = 15;
 constexpr int COLOR_BTNSHADOW = 16;
-constexpr int COLOR_BTNTEXT = 18;
 constexpr int COLOR_BTNHIGHLIGHT = 20;
 constexpr int COLOR_WINDOW = 5;
-constexpr int COLOR_WINDOWTEXT = 8;
 DWORD GetSysColor(int index); ///< black for an index without a colour
 
-// ---- Text
-// ------------------------------------------------------------------------------------------
+// ---- Text --------------------------------------------------------------------------------------
 //
 // Text is Windows-1252; its five holes stand for U+0081 and so on. Glyphs are drawn without
 // antialiasing, at whole pixels. In OPAQUE mode a line's cells get the background colour first.

@@ -71,8 +71,8 @@ constexpr HANDLE INVALID_HANDLE_VALUE{0xFFFFFFFF};
 /// leads nowhere of itself. A pattern without `*` and `?` gives the one entry that the path means.
 /// INVALID_HANDLE_VALUE if nothing matches.
 HANDLE FindFirstFileA(const char* pattern, WIN32_FIND_DATAA* found);
-BOOL FindNextFileA(HANDLE search, WIN32_FIND_DATAA* found);
-BOOL FindClose(HANDLE search);
+BOOL FindNextFileA(HANDLE search, WIN32_FIND_DATAA* found); ///< FALSE behind the last one
+BOOL FindClose(HANDLE search);                              ///< FALSE if there is no such search
 
 /// Writes the process's current directory with its NUL if `size` bytes hold it, and gives its
 /// length; else writes nothing and gives the size needed. 0 if it can't be told.
@@ -118,7 +118,7 @@ HGLOBAL GlobalReAlloc(HGLOBAL block, std::size_t bytes, UINT flags);
 
 /// The block's first byte, good until the matching GlobalUnlock; null on failure.
 void* GlobalLock(HGLOBAL block);
-BOOL GlobalUnlock(HGLOBAL block);
+BOOL GlobalUnlock(HGLOBAL block); ///< TRUE while more locks stand
 
 /// Frees; null on success, else the handle. Null is taken and does nothing.
 HGLOBAL GlobalFree(HGLOBAL block);
@@ -127,7 +127,6 @@ HGLOBAL GlobalFree(HGLOBAL block);
 
 constexpr ResourceName RT_BITMAP{2};
 constexpr ResourceName RT_DIALOG{5};
-constexpr ResourceName RT_STRING{6};
 constexpr ResourceName RT_ACCELERATOR{9};
 
 /// The handle of a module that is in the process, whatever its name's case: null stands for the

@@ -7,8 +7,7 @@
 #include "platform/gdi.h"
 #include "platform/types.h"
 
-// ---- Messages
-// ------------------------------------------------------------------------------------
+// ---- Messages ----------------------------------------------------------------------------------
 
 constexpr UINT WM_CREATE = 0x0001;
 constexpr UINT WM_DESTROY = 0x0002;
@@ -28,7 +27,6 @@ constexpr UINT WM_ACTIVATEAPP = 0x001C; // wParam 0: another program has the key
 constexpr UINT WM_SETCURSOR = 0x0020;
 constexpr UINT WM_HELP = 0x0053;
 constexpr UINT WM_CONTEXTMENU = 0x007B;
-constexpr UINT WM_NCDESTROY = 0x0082;
 constexpr UINT WM_NCHITTEST = 0x0084;     // lParam: a point of the screen; what lies there?
 constexpr UINT WM_NCLBUTTONDOWN = 0x00A1; // wParam: what WM_NCHITTEST gave
 constexpr UINT WM_KEYDOWN = 0x0100;
@@ -106,8 +104,7 @@ void PostQuitMessage(int exitCode);
 
 void Sleep(DWORD milliseconds); ///< 0 only gives way
 
-// ---- Windows
-// ---------------------------------------------------------------------------------------
+// ---- Windows -----------------------------------------------------------------------------------
 
 using WNDPROC = LRESULT (*)(HWND window, UINT message, WPARAM wParam, LPARAM lParam);
 
@@ -239,8 +236,7 @@ HWND GetDesktopWindow();
 /// process of this program.
 BOOL SetForegroundWindow(HWND window);
 
-// ---- Painting
-// ----------------------------------------------------------------------------------------
+// ---- Painting ----------------------------------------------------------------------------------
 
 struct PAINTSTRUCT {
     HDC hdc;
@@ -260,8 +256,7 @@ BOOL UpdateWindow(HWND window); ///< paints now what has to be painted
 HDC GetDC(HWND window); ///< draws at once; its state is a fresh one each time
 int ReleaseDC(HWND window, HDC dc);
 
-// ---- Timers
-// --------------------------------------------------------------------------------------------
+// ---- Timers ------------------------------------------------------------------------------------
 
 using TIMERPROC = void (*)(HWND window, UINT message, UINT_PTR timer, DWORD time);
 
@@ -272,8 +267,7 @@ using TIMERPROC = void (*)(HWND window, UINT message, UINT_PTR timer, DWORD time
 UINT_PTR SetTimer(HWND window, UINT_PTR timer, UINT milliseconds, TIMERPROC procedure);
 BOOL KillTimer(HWND window, UINT_PTR timer); ///< TRUE if it ran; a tick that waits is dropped
 
-// ---- Pointer, screen, boxes
-// ------------------------------------------------------------------------
+// ---- Pointer, screen, boxes --------------------------------------------------------------------
 
 constexpr ResourceName IDC_ARROW{32512};
 constexpr ResourceName IDC_WAIT{32514};

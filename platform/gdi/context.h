@@ -38,7 +38,6 @@ std::size_t liveContexts();
 /// Palettes know how often contexts have them selected. holdPalette does nothing for a palette that
 /// isn't there.
 HPALETTE defaultPalette();
-bool isPalette(HPALETTE palette);
 void holdPalette(HPALETTE palette, int change);
 std::size_t livePalettes();
 

@@ -24,10 +24,6 @@ HPALETTE defaultPalette() {
     return stock;
 }
 
-bool isPalette(HPALETTE palette) {
-    return palettes().find(palette.number) != nullptr;
-}
-
 void holdPalette(HPALETTE palette, int change) {
     if (Palette* const found = palettes().find(palette.number)) {
         found->selections += change;
@@ -53,7 +49,7 @@ HPALETTE CreatePalette(const LOGPALETTE* palette) {
 
 HPALETTE SelectPalette(HDC dc, HPALETTE palette, BOOL /*background*/) {
     DeviceContext* const context = findContext(dc);
-    if (context == nullptr || !isPalette(palette)) {
+    if (context == nullptr || palettes().find(palette.number) == nullptr) {
         return {};
     }
     holdPalette(palette, +1);

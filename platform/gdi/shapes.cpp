@@ -139,14 +139,3 @@ int FillRect(HDC dc, const RECT* area, HBRUSH brush) {
     }
     return 1;
 }
-
-COLORREF GetPixel(HDC dc, int x, int y) {
-    const DeviceContext* const context = findContext(dc);
-    const Canvas canvas = context == nullptr ? Canvas{} : canvasOf(*context);
-    if (x < 0 || x >= canvas.view.width || y < 0 || y >= canvas.view.height) {
-        return CLR_INVALID;
-    }
-    const DWORD pixel = *canvas.at(x, y);
-    return RGB(static_cast<int>((pixel >> 16U) & 0xFFU), static_cast<int>((pixel >> 8U) & 0xFFU),
-               static_cast<int>(pixel & 0xFFU));
-}

@@ -87,11 +87,3 @@ TEST(FillRect, OnAMonochromeBitmapTheBackgroundColourIsOne) {
     FillRect(mask.dc, &right, HBRUSH{GetStockObject(LTGRAY_BRUSH)});
     EXPECT_EQ(mask.text(), Rows{"10"});
 }
-
-TEST(GetPixel, TellsTheColour) {
-    const Memory memory({"WR"});
-    EXPECT_EQ(GetPixel(memory.dc, 1, 0), RGB(255, 0, 0));
-    for (const POINT outside : {POINT{2, 0}, POINT{-1, 0}, POINT{0, 1}, POINT{0, -1}}) {
-        EXPECT_EQ(GetPixel(memory.dc, outside.x, outside.y), CLR_INVALID);
-    }
-}
