@@ -22,7 +22,8 @@ void SettingsLoad();
 /// Whether the file names a directory; the first save of all makes it.
 bool SettingsNameDirectory();
 
-/// Writes all values. A write that fails leaves the file as it was.
+/// Writes all values. A write that fails leaves the file as it was; so does one of a value that the
+/// load couldn't read.
 void SettingsSave();
 
 /// Writes one number in decimal, as unsigned, into the settings file.

@@ -138,8 +138,10 @@ bool layTile(const DeviceContext& target, int x, int y, int width, int height,
         return false;
     }
     const Canvas tile = canvasOf(source);
-    return !tile.monochrome && sourceX == 0 && sourceY == 0 && width == tile.view.width &&
-           height == tile.view.height && bitmap->mosaic->lay(tile.view, x, y);
+    const bool isSmall = width <= bitmap->width / 2 && height <= bitmap->height / 2;
+    return isSmall && !tile.monochrome && sourceX == 0 && sourceY == 0 &&
+           width == tile.view.width && height == tile.view.height &&
+           bitmap->mosaic->lay(tile.view, x, y);
 }
 
 /// Copies from a mosaic; false if it isn't whole, or if the target isn't of its form.

@@ -25,6 +25,11 @@ Canvas canvasOf(const DeviceContext& context) {
     return canvas;
 }
 
+bool isMonochrome(const DeviceContext& context) {
+    const auto* bitmap = context.ofWindow ? nullptr : findObjectAs<Bitmap>(context.state.bitmap);
+    return bitmap != nullptr && bitmap->monochrome;
+}
+
 DWORD pixelOf(const DeviceContext& context, const Canvas& canvas, COLORREF colour) {
     const DWORD pixel = opaquePixel(colour);
     if (!canvas.monochrome) {

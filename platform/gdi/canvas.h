@@ -21,6 +21,9 @@ struct Canvas {
 /// contexts share, nothing may be drawn: its clip is empty.
 Canvas canvasOf(const DeviceContext& context);
 
+/// Whether it draws on a monochrome bitmap.
+bool isMonochrome(const DeviceContext& context);
+
 /// A colour as the context's pixels show it. On a monochrome bitmap the background colour is white
 /// and every other black.
 DWORD pixelOf(const DeviceContext& context, const Canvas& canvas, COLORREF colour);

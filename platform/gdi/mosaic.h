@@ -1,5 +1,5 @@
-// A large picture that is one small one over and over: eight megabytes of backdrop that nobody has
-// to hold.
+// A large picture that is one small one over and over: eight megabytes of backdrop whose memory
+// nobody has to touch.
 #pragma once
 
 #include "platform/gdi/pixel_block.h"

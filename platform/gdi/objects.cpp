@@ -21,7 +21,8 @@ constexpr int stockObjectCount = 14;
 constexpr int largestSide = 32767;
 constexpr std::int64_t largestArea = std::int64_t{1} << 26;
 
-/// From so many pixels on a picture may be a mosaic.
+/// From so many pixels on a picture may be a mosaic: from a megabyte on makePixels maps its memory,
+/// which costs nothing until it is written to.
 constexpr std::size_t mosaicFrom = std::size_t{1} << 18U;
 
 struct Objects {
@@ -56,7 +57,7 @@ Objects::Objects() {
     stock[BLACK_PEN] = addStock(Pen{black});
     stock[NULL_PEN] = addStock(Pen{black, false});
     stock[SYSTEM_FONT] = addStock(Font(systemFontHeight, bold, false));
-    static DWORD pixel = blackPixel; // never refused, and never given back
+    static DWORD pixel = blackPixel; // never refused
     bitmap = addStock(Bitmap{1, 1, true, PixelBlock(&pixel), nullptr});
 }
 
@@ -147,7 +148,7 @@ HBITMAP CreateCompatibleBitmap(HDC dc, int width, int height) {
     if (context == nullptr) {
         return {};
     }
-    Bitmap bitmap = makeBitmap(width, height, canvasOf(*context).monochrome);
+    Bitmap bitmap = makeBitmap(width, height, isMonochrome(*context));
     if (!bitmap.pixels) {
         return {};
     }

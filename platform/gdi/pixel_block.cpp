@@ -19,6 +19,9 @@ constexpr std::size_t mappedFrom = std::size_t{1} << 20U;
 
 void PixelRelease::operator()(DWORD* pixels) const {
     const std::size_t bytes = count * sizeof(DWORD);
+    if (bytes == 0) {
+        return; // not ours
+    }
     if (bytes < mappedFrom) {
         std::free(pixels);
     } else {

@@ -8,7 +8,7 @@
 
 namespace seam {
 
-/// Gives the pixels back; see makePixels.
+/// Gives the pixels back; see makePixels. A count of 0 is for pixels that live for ever.
 struct PixelRelease {
     std::size_t count = 0;
     void operator()(DWORD* pixels) const;

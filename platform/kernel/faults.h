@@ -1,5 +1,5 @@
-// Failures made to order, for tests. Each call of the system that a short memory or a sick disk can
-// refuse asks here first; in the program the answer is always no.
+// Failures made to order, for tests. Pictures, blocks and what opens, reads, writes, renames or
+// changes a file ask here first; in the program the answer is always no.
 #pragma once
 
 #include <cstddef>

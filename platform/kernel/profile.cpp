@@ -54,7 +54,7 @@ std::set<std::string>& unknownValues() {
 }
 
 std::string valueName(const char* file, const char* section, const char* key) {
-    return profilePath(file) + '\n' + section + '\n' + key;
+    return std::string(orEmpty(file)) + '\n' + section + '\n' + key;
 }
 
 std::optional<std::string> valueIn(const char* file, const char* section, const char* key) {

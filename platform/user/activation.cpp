@@ -2,6 +2,7 @@
 
 #include "platform/user/queue.h"
 
+#include <QElapsedTimer>
 #include <QGuiApplication>
 #include <QPointer>
 #include <QTimer>
@@ -18,10 +19,14 @@ class Expectation : public QObject {
     Expectation() {
         using namespace std::chrono_literals;
         patience_.setSingleShot(true);
-        patience_.setInterval(2s);
-        connect(&patience_, &QTimer::timeout, this, [this] { drop(); });
+        patience_.setInterval(500ms);
+        connect(&patience_, &QTimer::timeout, this, [this] { askAgain(); });
         connect(qGuiApp, &QGuiApplication::focusWindowChanged, this,
                 [this](const QWindow* focused) {
+                    if (focused != nullptr) {
+                        without_.invalidate();
+                        wake();
+                    }
                     if (focused != nullptr && focused == window_) {
                         drop();
                     }
@@ -31,6 +36,7 @@ class Expectation : public QObject {
     void expect(QWindow& window) {
         if (QGuiApplication::focusWindow() != &window) {
             window_ = &window;
+            asked_ = 1;
             patience_.start();
         }
         window.requestActivate();
@@ -40,7 +46,30 @@ class Expectation : public QObject {
         return !window_.isNull();
     }
 
+    bool mayReturn() {
+        if (!without_.isValid()) {
+            without_.start();
+            patience_.start();
+        }
+        return !without_.hasExpired(longest);
+    }
+
   private:
+    /// A window manager passes over a window that it hasn't seen to yet.
+    void askAgain() {
+        constexpr int most = 4;
+        const bool lost = without_.isValid() && !without_.hasExpired(longest);
+        if (!lost && (window_.isNull() || asked_ == most)) {
+            drop();
+            return;
+        }
+        if (!window_.isNull()) {
+            ++asked_;
+            window_->requestActivate();
+        }
+        patience_.start();
+    }
+
     void drop() {
         window_.clear();
         patience_.stop();
@@ -48,6 +77,10 @@ class Expectation : public QObject {
     }
 
     QPointer<QWindow> window_;
+    static constexpr qint64 longest = 2000; // milliseconds
+
+    int asked_ = 0;         // how often
+    QElapsedTimer without_; // since a key found no window with the keyboard
     QTimer patience_;
 };
 
@@ -65,6 +98,10 @@ void activate(QWindow& window) {
 
 bool keyboardIsOnItsWay() {
     return expectation().waits();
+}
+
+bool keyboardMayReturn() {
+    return expectation().mayReturn();
 }
 
 } // namespace seam

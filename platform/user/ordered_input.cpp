@@ -95,6 +95,15 @@ void handOverKey(QWindow& window, QKeyEvent& key) {
     }
 }
 
+/// Whether it is too soon for a key: a window waits for the keyboard, or the key's own has gone and
+/// no other one has the keyboard yet.
+bool hasToWaitForKeyboard(const WaitingEvent& next) {
+    return isTyped(*next.event) &&
+           (keyboardIsOnItsWay() ||
+            (next.window.isNull() && QGuiApplication::focusWindow() == nullptr &&
+             keyboardMayReturn()));
+}
+
 } // namespace
 
 bool OrderedApplication::notify(QObject* receiver, QEvent* event) {
@@ -115,7 +124,7 @@ bool OrderedApplication::notify(QObject* receiver, QEvent* event) {
 }
 
 bool handOverInput() {
-    if (waiting().empty() || (isTyped(*waiting().front().event) && keyboardIsOnItsWay())) {
+    if (waiting().empty() || hasToWaitForKeyboard(waiting().front())) {
         return false;
     }
     const WaitingEvent next = std::move(waiting().front());

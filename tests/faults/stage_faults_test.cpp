@@ -121,7 +121,7 @@ class StageFaults : public SaverTest {
     std::filesystem::path start_;
 };
 
-TEST_F(StageFaults, AShowGoesOnOrTellsWhyNot) {
+TEST_F(StageFaults, AShowGoesOnOrTellsWhyNotOrStandsStill) {
     writeToon("one.zkt", frames);
     const std::pair<Operation, Outcomes> cases[] = {
         {Operation::picture, {"played"}},

@@ -325,7 +325,7 @@ void User::leave() {
     place_.close();
 }
 
-/// In the platform's form. The digits stand for the files that are there.
+/// In the platform's form. Files that are there, and some that aren't.
 std::optional<std::string> User::chooseFile() {
     static const std::vector<std::string> names{"two.zkt",
                                                 "one.zkt",

@@ -3,10 +3,9 @@
 //
 //     ^c !c   the key c with Ctrl, or with Alt
 //     ~c      the key c with Shift, which may be one of these:
-//     \c      a key without a letter: the one of that place among Tab (a), Backtab, Return, Enter
-//     (d),
-//             Escape (e), Space, Backspace, Delete (h), Left, Right, Up, Down (l), Home, End,
-//             PageUp, PageDown (p), F10, F4, F1, Menu (t)
+//     \c      a key without a letter: the one of that place among Tab (a), Backtab, Return,
+//             Enter (d), Escape (e), Space, Backspace, Delete (h), Left, Right, Up, Down (l),
+//             Home, End, PageUp, PageDown (p), F10, F4, F1, Menu (t)
 //     @xy     a click at that place of the window in front, in its 256ths; :xy the right button
 //     #n "n   a click, or a double-click, on the field or button of that number
 //     &xyuv   drags from a place to another
