@@ -129,6 +129,14 @@ void tellOfActivation(Qt::ApplicationState state) {
     });
 }
 
+/// The toolkit can run GLib's loop within its own, for the sake of libraries that we don't use.
+/// Making that loop takes some 6 ms of the start.
+void doWithoutGlib() {
+    if (!qEnvironmentVariableIsSet("QT_NO_GLIB")) {
+        qputenv("QT_NO_GLIB", "1");
+    }
+}
+
 bool makeToolkit() {
     takeSleepLock();
     const Probe probe = probeDisplay();
@@ -137,6 +145,7 @@ bool makeToolkit() {
                      program_invocation_short_name);
         return false;
     }
+    doWithoutGlib();
     chooseScale();
     QApplication::setStyle(new ClassicStyle);
     QApplication::setPalette(classicPalette());
