@@ -63,7 +63,7 @@ bool canBeExpressed(std::string_view name) {
 }
 
 std::vector<std::string> matchingNames(const std::string& directory, std::string_view pattern) {
-    std::vector<std::string> names = seam::namesIn(directory);
+    std::vector<std::string> names = seam::namesIn(directory).value_or(std::vector<std::string>());
     std::erase_if(names, [pattern](const std::string& name) {
         return !canBeExpressed(name) || !seam::matchesPattern(name, pattern);
     });

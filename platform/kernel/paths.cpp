@@ -74,7 +74,7 @@ PathLookup walk(std::string path, const std::vector<std::string>& names) {
         if (errno != ENOENT) {
             return {.error = errno};
         }
-        const std::string spelled = spelledName(path.empty() ? "/" : path, names[at]);
+        const std::string spelled = spelledName(path.empty() ? "/" : path, names[at]).value_or("");
         if (!spelled.empty()) {
             path += "/" + spelled;
         } else if (at + 1 == names.size()) {
@@ -172,12 +172,15 @@ PathLookup lookUpPath(std::string_view path) {
     return lookUpPath(path, drives(), currentDirectory());
 }
 
-std::vector<std::string> namesIn(const std::string& directory) {
+std::optional<std::vector<std::string>> namesIn(const std::string& directory) {
     const auto close = [](DIR* listing) { closedir(listing); };
     const std::unique_ptr<DIR, decltype(close)> listing(
         faultDue(Operation::open) ? nullptr : opendir(directory.c_str()), close);
     std::vector<std::string> names;
-    while (const dirent* entry = listing ? readdir(listing.get()) : nullptr) {
+    if (!listing) {
+        return errno == ENOENT || errno == ENOTDIR ? std::optional(names) : std::nullopt;
+    }
+    while (const dirent* entry = readdir(listing.get())) {
         const std::string_view name = entry->d_name;
         if (name != "." && name != "..") {
             names.emplace_back(name);
@@ -186,12 +189,16 @@ std::vector<std::string> namesIn(const std::string& directory) {
     return names;
 }
 
-std::string spelledName(const std::string& directory, std::string_view name) {
+std::optional<std::string> spelledName(const std::string& directory, std::string_view name) {
     if (isThere(directory + "/" + std::string(name))) {
         return std::string(name);
     }
+    const std::optional<std::vector<std::string>> names = namesIn(directory);
+    if (!names) {
+        return std::nullopt;
+    }
     std::string found;
-    for (const std::string& candidate : namesIn(directory)) {
+    for (const std::string& candidate : *names) {
         if (sameButForCase(candidate, name) && (found.empty() || candidate < found)) {
             found = candidate;
         }

@@ -43,12 +43,14 @@ PathLookup lookUpPath(std::string_view path, const std::vector<Drive>& known,
 /// The same with the drives and the current directory there are at this moment.
 PathLookup lookUpPath(std::string_view path);
 
-/// The names in a directory, in no order, without "." and ".."; none if it can't be read.
-std::vector<std::string> namesIn(const std::string& directory);
+/// The names in a directory, in no order, without "." and "..". Nothing if there is one that can't be
+/// read; errno tells why.
+std::optional<std::vector<std::string>> namesIn(const std::string& directory);
 
 /// The name in a directory that a name means: itself if it is there, else the first one, in the
-/// order of bytes, that is the same but for case. Empty if there is none.
-std::string spelledName(const std::string& directory, std::string_view name);
+/// order of bytes, that is the same but for case. Empty if there is none. Nothing if the directory
+/// can't be read, so that nobody knows; errno tells why.
+std::optional<std::string> spelledName(const std::string& directory, std::string_view name);
 
 /// The current directory; none if it has been removed.
 std::optional<std::string> currentDirectory();

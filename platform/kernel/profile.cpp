@@ -29,19 +29,22 @@ bool hasDirectory(std::string_view name) {
     return name.find_first_of("\\/:") != std::string_view::npos;
 }
 
-/// The file's path in the file system; empty if there can be none.
+/// The file's path in the file system; empty if there can be none, or if it can't be told which of
+/// the directory's files it is.
 std::string profilePath(const char* file) {
     const std::string_view name = orEmpty(file);
     if (name.empty() || hasDirectory(name)) {
         return seam::lookUpPath(name).path;
     }
     const std::string directory = seam::configDirectory();
-    const std::string spelled = seam::spelledName(directory, name);
-    return directory + "/" + (spelled.empty() ? std::string(name) : spelled);
+    const std::optional<std::string> spelled = seam::spelledName(directory, name);
+    if (!spelled) {
+        return {};
+    }
+    return directory + "/" + (spelled->empty() ? std::string(name) : *spelled);
 }
 
-seam::WholeFile readProfile(const char* file) {
-    const std::string path = profilePath(file);
+seam::WholeFile readProfile(const std::string& path) {
     return path.empty() ? seam::WholeFile{EINVAL, {}} : seam::readWholeFile(path, largestProfile);
 }
 
@@ -58,7 +61,7 @@ std::string valueName(const char* file, const char* section, const char* key) {
 }
 
 std::optional<std::string> valueIn(const char* file, const char* section, const char* key) {
-    const seam::WholeFile profile = readProfile(file);
+    const seam::WholeFile profile = readProfile(profilePath(file));
     const std::string name = valueName(file, orEmpty(section), orEmpty(key));
     if (profile.error != 0 && profile.error != ENOENT) {
         unknownValues().insert(name);
@@ -116,8 +119,9 @@ BOOL WritePrivateProfileStringA(const char* section, const char* key, const char
     if (unknownValues().contains(valueName(file, section, key))) {
         return FALSE;
     }
-    const seam::Descriptor lock = lockBeside(profilePath(file));
-    const seam::WholeFile old = readProfile(file);
+    const std::string path = profilePath(file);
+    const seam::Descriptor lock = lockBeside(path);
+    const seam::WholeFile old = readProfile(path);
     if (old.error != 0 && old.error != ENOENT) {
         return FALSE;
     }
@@ -125,5 +129,5 @@ BOOL WritePrivateProfileStringA(const char* section, const char* key, const char
         return TRUE;
     }
     const std::string text = seam::profileWithValue(old.text, section, key, value);
-    return seam::replaceFile(profilePath(file), text) ? TRUE : FALSE;
+    return seam::replaceFile(path, text) ? TRUE : FALSE;
 }

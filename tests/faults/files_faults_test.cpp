@@ -121,6 +121,28 @@ TEST_F(FileFaults, ASettingThatCannotBeWrittenStaysAsItWas) {
     }
 }
 
+TEST_F(FileFaults, ASettingThatCannotBeReadStaysAsItIsInAFileOfAnySpelling) {
+    for (const char* name : {"dorbo/Dorbo95.ini", "dorbo/DORBO95.INI"}) {
+        for (const Operation operation : {Operation::open, Operation::read}) {
+            eachFault(operation, {Fault::error, Fault::cut, Fault::onwards},
+                      [this, name](const ChosenFault& fault) {
+                          putOld();
+                          std::filesystem::rename(settings, name);
+                          const std::string before = textOf(name);
+                          fault.begin();
+                          SettingsLoad();
+                          seam::endFaults();
+                          SettingsSave();
+                          EXPECT_EQ(textOf(name), before);
+                          EXPECT_TRUE(name == std::string(settings) ||
+                                      !std::filesystem::exists(settings));
+                          return "";
+                      });
+        }
+    }
+    SettingsLoad(); // which may be saved again
+}
+
 TEST_F(FileFaults, APasswordIsChangedOrStaysAndTheCallerIsTold) {
     const struct {
         const char* before;
