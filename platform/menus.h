@@ -1,4 +1,5 @@
-// Menus, and the keys that stand for commands.
+// Menus, and the keys that stand for commands. An operation with a stale or foreign handle does
+// nothing and gives 0.
 #pragma once
 
 #include "platform/user.h"

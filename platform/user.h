@@ -2,6 +2,7 @@
 //
 // One thread, one queue. A window has one picture in memory: drawing changes it at once, and what
 // changed reaches the screen when the message that drew has been handled, or before a loop waits.
+// Unless it says otherwise, an operation with a stale or foreign handle does nothing and gives 0.
 #pragma once
 
 #include "platform/gdi.h"
