@@ -13,6 +13,7 @@
 namespace {
 
 constexpr std::size_t mostFaults = 20;
+constexpr LONG mostStrides = 248;
 
 bool same(POINT left, POINT right) {
     return left.x == right.x && left.y == right.y;
@@ -157,14 +158,10 @@ RecordCheck::Walk RecordCheck::plan(POINT from, POINT to) const {
     const LONG dy = to.y - from.y;
     const LONG distance = static_cast<LONG>(std::max(1.0, std::hypot(dx, dy)));
     const LONG wanted = distance / 20;
-    const LONG strides = wanted == 0 ? 1 : (wanted + 7) / 8 * 8;
-    return {now_,
-            number("interval"),
-            drawn_,
-            {dx / strides, dy / strides},
-            strides,
-            dx > 0,
-            static_cast<LONG>(number("pose"))};
+    const LONG strides = wanted == 0 ? 1 : std::min((wanted + 7) / 8 * 8, mostStrides);
+    return {
+        now_,   210 - 20 * std::int64_t{ToonSpeed}, drawn_, {dx / strides, dy / strides}, strides,
+        dx > 0, static_cast<LONG>(number("pose"))};
 }
 
 void RecordCheck::countPaces(LONG last) {
@@ -194,6 +191,7 @@ void RecordCheck::planned() {
     walkTarget(to);
     const Walk walk = plan(from, to);
     const POINT step = point("step");
+    expect(number("interval") == walk.interval, "not the speed's interval");
     const LONG last = walk.strides + 1;
     expect(number("n") == walk.strides && number("last") == last && same(step, walk.stride) &&
                number("dir") == (walk.toRight ? 1 : 2),
