@@ -37,18 +37,32 @@ TEST_F(Backdrop, TilesCoverTheStageFromTheTopLeftInTheirOwnColours) {
     }
 }
 
+TEST_F(Backdrop, AColourTableIsAsLongAsTheFileSaysOrItsBitsNeed) {
+    for (const char* name : {"eight_bits", "four_bits", "no_table"}) { // green above blue
+        const HDC dc = GetDC(stage);
+        const HBITMAP bitmap = LoadPaletteBitmap(GetModuleHandleA(nullptr), dc, name);
+        EXPECT_EQ(seam::bitmapPicture(bitmap).pixels, (std::vector<DWORD>{0x00FF00, 0x0000FF}))
+            << name;
+        DeleteObject(bitmap);
+        ReleaseDC(stage, dc);
+    }
+}
+
 TEST_F(Backdrop, BlanksTheStageOnlyInASaverOnceTheTitleIsPainted) {
-    const std::tuple<DWORD, LONG, DWORD, bool> cases[] = {
-        {1, 1, 1, true}, {0, 1, 1, false}, {1, 0, 1, false}, {1, 1, 0, false}, {1, 7, 1, true}};
-    for (const auto& [saver, backgrounds, title, isBlank] : cases) {
+    const std::tuple<DWORD, LONG, DWORD, LONG, bool> cases[] = {
+        {1, 1, 1, 2, true},  {0, 1, 1, 2, false}, {1, 0, 1, 2, false},
+        {1, 1, 0, 2, false}, {1, 7, 1, 2, true},  {1, 1, 1, 1, true},
+        {1, 1, 1, -1, true}, {1, 1, 1, 99, true}, {1, 1, 1, 0, false}, // loaded without its palette
+    };
+    for (const auto& [saver, backgrounds, title, index, isBlank] : cases) {
         repaint();
         SaverActive = saver;
         Backgrounds = backgrounds;
         TitleShown = title;
-        build(2);
+        build(index);
         const std::vector<DWORD> shown = pixels();
         const bool blank = shown[0] == 0 && shown[1024] == 0 && shown[1024 + 1] == 0xC0C0C0;
-        EXPECT_EQ(blank, isBlank) << saver << backgrounds << title;
+        EXPECT_EQ(blank, isBlank) << saver << backgrounds << title << ' ' << index;
         SaverActive = TitleShown = 1;
     }
 }
@@ -108,8 +122,14 @@ TEST_F(Backdrop, TheEditorsStageKeepsItsPlaceAndSize) {
     EXPECT_EQ(pixels().size(), 1024U * 768U);
 }
 
-TEST_F(Backdrop, ArtIsLoadedAnewWithoutALeak) {
-    EXPECT_EQ(LoadCharacterArt(stage, GetModuleHandleA(nullptr)), 1);
-    ReleaseStageArt();
-    EXPECT_STREQ(CharacterArtName(nullptr), "none");
+TEST_F(Backdrop, TheEditorsStageMakesHisImageAnewInItsSize) {
+    stand(300, 300);
+    repaint();
+    const std::vector<DWORD> before = pixels();
+    CharacterSprite.frameBitmap = CharacterArt[CHARACTER_PICTURES - 1];
+    repaint();
+    EXPECT_EQ(pixels(), before) << "he is drawn from the image";
+    ResizeStage(stage);
+    repaint();
+    EXPECT_NE(pixels(), before);
 }
