@@ -3,8 +3,8 @@
 // A dialog is made from a template of the resources, whose places are in dialog units: here always
 // a quarter of 6 pixels across and an eighth of 13 down. Its controls are the toolkit's own
 // widgets. What the user does with them arrives at the dialog as WM_COMMAND through the loop; what
-// the program does with them arrives nowhere. Unless it says otherwise, an operation with a stale or
-// foreign handle, or on a control that isn't there, does nothing and gives 0.
+// the program does with them arrives nowhere. Unless it says otherwise, an operation with a stale
+// or foreign handle, or on a control that isn't there, does nothing and gives 0.
 #pragma once
 
 #include "platform/user.h"

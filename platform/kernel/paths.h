@@ -43,8 +43,8 @@ PathLookup lookUpPath(std::string_view path, const std::vector<Drive>& known,
 /// The same with the drives and the current directory there are at this moment.
 PathLookup lookUpPath(std::string_view path);
 
-/// The names in a directory, in no order, without "." and "..". Nothing if there is one that can't be
-/// read; errno tells why.
+/// The names in a directory, in no order, without "." and "..". Nothing if there is one that can't
+/// be read; errno tells why.
 std::optional<std::vector<std::string>> namesIn(const std::string& directory);
 
 /// The name in a directory that a name means: itself if it is there, else the first one, in the
