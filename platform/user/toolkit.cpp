@@ -17,7 +17,9 @@
 
 #include <cerrno>
 #include <cstdio>
+#include <fontconfig/fontconfig.h>
 #include <memory>
+#include <thread>
 #include <xcb/xcb.h>
 
 namespace seam {
@@ -137,6 +139,12 @@ void doWithoutGlib() {
     }
 }
 
+/// Reads the lists of fonts while the toolkit starts: the toolkit would do it at the first text,
+/// and the first picture come 2 to 3 ms later. Fontconfig may be asked by several threads at once.
+void readFontLists() {
+    static const std::jthread reader([] { FcInit(); });
+}
+
 bool makeToolkit() {
     takeSleepLock();
     const Probe probe = probeDisplay();
@@ -144,6 +152,9 @@ bool makeToolkit() {
         std::fprintf(stderr, "%s: there is no display to show anything on\n",
                      program_invocation_short_name);
         return false;
+    }
+    if (probe != nullptr) {
+        readFontLists();
     }
     doWithoutGlib();
     chooseScale();
