@@ -3,15 +3,15 @@
 
 export DEBIAN_FRONTEND=noninteractive
 
-# wanted_packages: the names in packages.txt, one a line.
+# wanted_packages PURPOSE...: the names in packages.txt under "To PURPOSE", one a line.
 wanted_packages() {
-    sed -e 's/#.*//' -e 's/[[:space:]]//g' -e '/^$/d' packages.txt
+    awk -v wanted=" $* " '/^# To / { purpose = $3 } !/^#/ && NF && index(wanted, " " purpose " ") { print $1 }' packages.txt
 }
 
-# missing_packages: those of them that are not installed.
+# missing_packages PURPOSE...: those of them that are not installed.
 missing_packages() {
     local package
-    for package in $(wanted_packages); do
+    for package in $(wanted_packages "$@"); do
         dpkg-query -W -f='${db:Status-Status}\n' "$package" 2>/dev/null | grep -qx installed ||
             echo "$package"
     done
@@ -26,10 +26,11 @@ as_root() {
     fi
 }
 
-# install_packages: gets what is missing, and says so; says nothing and does nothing if nothing is.
+# install_packages PURPOSE...: gets what is missing, and says so; says nothing and does nothing if
+# nothing is.
 install_packages() {
     local missing
-    mapfile -t missing < <(missing_packages)
+    mapfile -t missing < <(missing_packages "$@")
     [ "${#missing[@]}" -gt 0 ] || return 0
     mkdir -p build
     echo "Installing Debian packages: ${missing[*]}"
