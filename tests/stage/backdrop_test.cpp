@@ -1,5 +1,8 @@
 #include "tests/stage/stage_fixture.h"
 
+#include <set>
+#include <sstream>
+
 namespace {
 
 class Backdrop : public StageTest {
@@ -14,6 +17,29 @@ class Backdrop : public StageTest {
     std::vector<DWORD> rows(LONG top, LONG bottom) const {
         const std::vector<DWORD> all = pixels();
         return {all.begin() + top * 1024, all.begin() + bottom * 1024};
+    }
+
+    /// What a repaint has drawn beyond a picture: "left,top-right,bottom", then the colours.
+    std::string drawnBeyond(const std::vector<DWORD>& before) const {
+        const std::vector<DWORD> now = pixels();
+        std::set<std::size_t> columns, lines;
+        std::set<DWORD> colours;
+        for (std::size_t pixel = 0; pixel < now.size(); ++pixel) {
+            if (now[pixel] != before[pixel]) {
+                columns.insert(pixel % 1024);
+                lines.insert(pixel / 1024);
+                colours.insert(now[pixel]);
+            }
+        }
+        std::ostringstream told;
+        if (!colours.empty()) {
+            told << *columns.begin() << ',' << *lines.begin() << '-' << *columns.rbegin() << ','
+                 << *lines.rbegin() << std::hex;
+        }
+        for (const DWORD colour : colours) {
+            told << ' ' << colour;
+        }
+        return told.str();
     }
 };
 
@@ -34,6 +60,8 @@ TEST_F(Backdrop, TilesCoverTheStageFromTheTopLeftInTheirOwnColours) {
             }
         }
         EXPECT_TRUE(build(index) == expected) << index;
+        repaint();
+        EXPECT_TRUE(pixels() == expected) << index;
     }
 }
 
@@ -93,6 +121,24 @@ TEST_F(Backdrop, ShowsTheBigTitleOnceAndThenTheCaptionInTheSaverOnly) {
     EXPECT_NE(pixels(), bare);
     EXPECT_EQ(rows(0, 20), topLine);
     EXPECT_EQ(TitleShown, 0U);
+    PreviewMode = 0;
+}
+
+TEST_F(Backdrop, TitlesHaveTheirPlacesColoursAndShadows) {
+    // The big title's lines begin 170 and 80 above the middle, at 384, the preview's at 20; their
+    // letters a little below that.
+    const std::vector<DWORD> bare = pixels();
+    CopyText(CaptionText, "A caption", sizeof CaptionText);
+    repaint();
+    EXPECT_EQ(drawnBeyond(bare), "474,5-550,22 808080 c0c0c0");
+    CaptionText[0] = '\0';
+    TitleShown = 0;
+    CopyText(StageTitle, "Dorbo", sizeof StageTitle);
+    repaint();
+    EXPECT_EQ(drawnBeyond(bare), "437,221-585,326 ff 808080 ffffff");
+    PreviewMode = PREVIEW_WALK;
+    repaint();
+    EXPECT_EQ(drawnBeyond(bare), "454,24-568,60 ff 808080 ffffff");
     PreviewMode = 0;
 }
 
