@@ -7,6 +7,7 @@
 #include <fstream>
 #include <string>
 #include <string_view>
+#include <unistd.h>
 
 /// A promise of the program's that it has to keep for any input.
 inline void demand(bool kept) {
@@ -15,11 +16,17 @@ inline void demand(bool kept) {
     }
 }
 
-/// A directory in memory for what a fuzzer writes, gone when it ends.
+/// Where files lie in memory; the usual place for temporary ones where the user can't write there.
+inline std::string directoryInMemory() {
+    constexpr const char* shared = "/dev/shm";
+    return access(shared, W_OK) == 0 ? shared : std::filesystem::temp_directory_path().string();
+}
+
+/// A directory for what a fuzzer writes, in memory if that can be, gone when it ends.
 inline const std::filesystem::path& scratchDirectory() {
     struct Scratch {
         Scratch() {
-            std::string name = "/dev/shm/dorbo-fuzz-XXXXXX";
+            std::string name = directoryInMemory() + "/dorbo-fuzz-XXXXXX";
             const char* made = mkdtemp(name.data());
             demand(made != nullptr);
             path = made;
@@ -42,7 +49,7 @@ inline const std::filesystem::path& scratchDirectory() {
 inline void standAlone() {
     setenv("QT_QPA_PLATFORM", "offscreen", 1);
     setenv("DORBO_SCALE", "1", 1);
-    setenv("TMPDIR", "/dev/shm", 1);
+    setenv("TMPDIR", directoryInMemory().c_str(), 1);
     setenv("QT_LOGGING_RULES", "default.warning=false", 0); // of what that platform can't do
 }
 
