@@ -1,7 +1,8 @@
 // Windows, messages, timers, painting, pointer and metrics.
 //
 // One thread, one queue. A window has one picture in memory: drawing changes it at once, and what
-// changed reaches the screen when the message that drew has been handled, or before a loop waits.
+// changed reaches the screen when the message that drew has been handled, or before a loop waits;
+// the first picture of a window, when its procedure has painted it.
 // Unless it says otherwise, an operation with a stale or foreign handle does nothing and gives 0.
 #pragma once
 

@@ -46,15 +46,15 @@ class Backdrop : public StageTest {
 } // namespace
 
 TEST_F(Backdrop, TilesCoverTheStageFromTheTopLeftInTheirOwnColours) {
-    for (const LONG index : {0, 1, 2, 9, 10, 11, -4, 2147483647}) {
+    const auto expectTiles = [this](LONG index, int width, int height) {
         char name[TILE_NAME_SIZE];
         TileName(name, index >= 1 && index <= 10 ? index : 1); // that of a missing number too
         const HBITMAP plain = LoadBitmapA(GetModuleHandleA(nullptr), name);
         const seam::Picture tile = seam::bitmapPicture(plain);
         DeleteObject(plain);
         std::vector<DWORD> expected;
-        for (int y = 0; y < 768; ++y) {
-            for (int x = 0; x < 1024; ++x) {
+        for (int y = 0; y < height; ++y) {
+            for (int x = 0; x < width; ++x) {
                 const int place = y % tile.height * tile.width + x % tile.width;
                 expected.push_back(tile.pixels.at(static_cast<std::size_t>(place)));
             }
@@ -62,7 +62,12 @@ TEST_F(Backdrop, TilesCoverTheStageFromTheTopLeftInTheirOwnColours) {
         EXPECT_TRUE(build(index) == expected) << index;
         repaint();
         EXPECT_TRUE(pixels() == expected) << index;
+    };
+    for (const LONG index : {0, 1, 2, 9, 10, 11, -4, 2147483647}) {
+        expectTiles(index, 1024, 768);
     }
+    openStage(801, 641); // one more than whole tiles of 80
+    expectTiles(10, 801, 641);
 }
 
 TEST_F(Backdrop, AColourTableIsAsLongAsTheFileSaysOrItsBitsNeed) {
