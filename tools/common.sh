@@ -30,6 +30,10 @@ as_root() {
 # nothing is.
 install_packages() {
     local missing
+    [ -n "$(wanted_packages "$@")" ] || {
+        echo "packages.txt names nothing to $*" >&2
+        return 1
+    }
     mapfile -t missing < <(missing_packages "$@")
     [ "${#missing[@]}" -gt 0 ] || return 0
     mkdir -p build
@@ -43,17 +47,25 @@ install_packages() {
     }
 }
 
-# configure PRESET: says nothing if all is well.
+# configure PRESET OPTION...: says nothing if all is well.
 configure() {
     local log=build/$1.configure.log
     mkdir -p build
-    cmake --preset "$1" >"$log" 2>&1 || {
+    cmake --preset "$@" >"$log" 2>&1 || {
         cat "$log"
         return 1
     }
 }
 
-# build PRESET: configures and builds it under build/PRESET.
+# build PRESET: configures and builds all of it under build/PRESET.
 build() {
     configure "$1" && cmake --build --preset "$1"
+}
+
+# build_programs: the release without its tests, for which a machine needs less. Where they have
+# been configured before they stay so.
+build_programs() {
+    local options=()
+    grep -qs '^BUILD_TESTING:BOOL=ON' build/release/CMakeCache.txt || options=(-DBUILD_TESTING=OFF)
+    configure release "${options[@]}" && cmake --build --preset release --target programs
 }
