@@ -2,7 +2,7 @@
 //
 // One thread, one queue. A window has one picture in memory: drawing changes it at once, and what
 // changed reaches the screen when the message that drew has been handled, or before a loop waits;
-// the first picture of a window, when its procedure has painted it.
+// the first picture of a window without a border, when its procedure has painted it.
 // Unless it says otherwise, an operation with a stale or foreign handle does nothing and gives 0.
 #pragma once
 
@@ -247,7 +247,9 @@ struct PAINTSTRUCT {
 };
 
 /// A context clipped to the bounds of what is to be painted; the window counts as painted from
-/// here on. WM_ERASEBKGND comes first if an erase was asked for.
+/// here on. WM_ERASEBKGND comes first if an erase was asked for. Of a stale window the context is
+/// null, and nothing is to be painted. EndPaint ends the context, also that of a window that has
+/// gone meanwhile, and gives TRUE.
 HDC BeginPaint(HWND window, PAINTSTRUCT* paint);
 BOOL EndPaint(HWND window, const PAINTSTRUCT* paint);
 
@@ -255,8 +257,8 @@ BOOL EndPaint(HWND window, const PAINTSTRUCT* paint);
 BOOL InvalidateRect(HWND window, const RECT* area, BOOL erase);
 BOOL UpdateWindow(HWND window); ///< paints now what has to be painted
 
-HDC GetDC(HWND window); ///< draws at once; its state is a fresh one each time
-int ReleaseDC(HWND window, HDC dc);
+HDC GetDC(HWND window);             ///< draws at once; its state is a fresh one each time
+int ReleaseDC(HWND window, HDC dc); ///< 1; 0 if there is no such context. The window may have gone
 
 // ---- Timers ------------------------------------------------------------------------------------
 

@@ -74,9 +74,12 @@ PathLookup walk(std::string path, const std::vector<std::string>& names) {
         if (errno != ENOENT) {
             return {.error = errno};
         }
-        const std::string spelled = spelledName(path.empty() ? "/" : path, names[at]).value_or("");
-        if (!spelled.empty()) {
-            path += "/" + spelled;
+        const auto spelled = spelledName(path.empty() ? "/" : path, names[at]);
+        if (!spelled && errno != EACCES) {
+            return {.error = errno};
+        }
+        if (spelled && !spelled->empty()) {
+            path += "/" + *spelled;
         } else if (at + 1 == names.size()) {
             return {.path = exact};
         } else {
@@ -180,13 +183,15 @@ std::optional<std::vector<std::string>> namesIn(const std::string& directory) {
     if (!listing) {
         return errno == ENOENT || errno == ENOTDIR ? std::optional(names) : std::nullopt;
     }
-    while (const dirent* entry = readdir(listing.get())) {
+    errno = 0; // which tells the end of the names from a failure
+    for (const dirent* entry = readdir(listing.get()); entry != nullptr;
+         errno = 0, entry = readdir(listing.get())) {
         const std::string_view name = entry->d_name;
         if (name != "." && name != "..") {
             names.emplace_back(name);
         }
     }
-    return names;
+    return errno == 0 ? std::optional(names) : std::nullopt;
 }
 
 std::optional<std::string> spelledName(const std::string& directory, std::string_view name) {

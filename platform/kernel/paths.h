@@ -36,7 +36,8 @@ struct PathLookup {
 
 /// Looks a path up. `directory` is what a path without a root starts from; without one such a path
 /// means nothing. ".." takes the name before it off, also one that is a link. A link that leads
-/// nowhere exists.
+/// nowhere exists. In a directory that the user may enter but not list, names mean what they are
+/// spelled like and nothing else; one that can't be listed for another reason is an error.
 PathLookup lookUpPath(std::string_view path, const std::vector<Drive>& known,
                       const std::optional<std::string>& directory);
 

@@ -119,8 +119,8 @@ BOOL WritePrivateProfileStringA(const char* section, const char* key, const char
     if (unknownValues().contains(valueName(file, section, key))) {
         return FALSE;
     }
-    const std::string path = profilePath(file);
-    const seam::Descriptor lock = lockBeside(path);
+    const seam::Descriptor lock = lockBeside(profilePath(file));
+    const std::string path = profilePath(file); // of the file that is there under the lock
     const seam::WholeFile old = readProfile(path);
     if (old.error != 0 && old.error != ENOENT) {
         return FALSE;

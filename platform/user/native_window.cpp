@@ -123,15 +123,14 @@ void NativeWindow::enlargeInto(QImage& target, const QRect& area) const {
 /// A new window shows nothing before its procedure has painted it: to bring the blank one to the
 /// screen, and to wait until it is there, would hold up the first picture by some 10 ms.
 bool NativeWindow::awaitsFirstPaint() const {
-    const seam::Window* window = shown_ ? nullptr : findWindow(owner_);
-    return window != nullptr && window->paintNeeded;
+    const seam::Window* window = findWindow(owner_);
+    return window != nullptr && window->paintNeeded && !window->painted;
 }
 
 void NativeWindow::flush() {
     if (dirty_.isEmpty() || !isExposed() || awaitsFirstPaint()) {
         return; // the expose event that makes it visible, or its painting, shows all of it
     }
-    shown_ = true;
     const QRect area = std::exchange(dirty_, QRect());
     if (!shadow_.isNull()) {
         showShadow(area);

@@ -50,7 +50,6 @@ class NativeWindow : public QWindow, public WindowPicture {
     QImage shadow_;            // the picture where the display's pixels aren't ours: larger, or of
                                // another form
     int scale_ = 1;            // of the screen that the picture has been made for
-    bool shown_ = false;       // something of it
     bool lent_ = false;        // a menu has the keyboard and will give it back
     std::int64_t flushed_ = 0; // when the server was last told to fetch pixels
 };

@@ -36,6 +36,7 @@ HDC BeginPaint(HWND window, PAINTSTRUCT* paint) {
     const bool erase = found->eraseNeeded;
     paint->rcPaint = found->paintNeeded ? found->update : RECT{0, 0, 0, 0};
     found->paintNeeded = false;
+    found->painted = true;
     found->eraseNeeded = false;
     paint->hdc = makeSurfaceContext(*found->picture(), paint->rcPaint);
     paint->fErase =

@@ -19,6 +19,7 @@
 #include <cstdio>
 #include <fontconfig/fontconfig.h>
 #include <memory>
+#include <system_error>
 #include <thread>
 #include <xcb/xcb.h>
 
@@ -140,9 +141,14 @@ void doWithoutGlib() {
 }
 
 /// Reads the lists of fonts while the toolkit starts: the toolkit would do it at the first text,
-/// and the first picture come 2 to 3 ms later. Fontconfig may be asked by several threads at once.
+/// and the first picture come 2 to 3 ms later. Fontconfig may be asked by several threads at once,
+/// but it reads the environment, which nobody of ours changes from here on. Where no thread can be
+/// had, the toolkit reads the lists itself. The process ends no sooner than the reading.
 void readFontLists() {
-    static const std::jthread reader([] { FcInit(); });
+    try {
+        static const std::jthread reader([] { FcInit(); });
+    } catch (const std::system_error&) {
+    }
 }
 
 bool makeToolkit() {
@@ -153,11 +159,11 @@ bool makeToolkit() {
                      program_invocation_short_name);
         return false;
     }
+    doWithoutGlib();
+    chooseScale();
     if (probe != nullptr) {
         readFontLists();
     }
-    doWithoutGlib();
-    chooseScale();
     QApplication::setStyle(new ClassicStyle);
     QApplication::setPalette(classicPalette());
     // It lives as long as the process: windows may be destroyed by handlers of static objects.

@@ -48,6 +48,7 @@ struct Window {
     bool visible = false;
     bool dying = false; // WM_DESTROY has been sent
     bool paintNeeded = false;
+    bool painted = false; // has been asked to, and has begun
     bool eraseNeeded = false;
     HMENU menu; // its menu bar
     HIMC inputContext = defaultInputContext;
