@@ -11,14 +11,13 @@
 #include "resources/art/tiles.h"
 #include "resources/art/walk.h"
 
-#include <array>
+#include <iterator>
+#include <stdexcept>
 #include <utility>
 
 namespace art {
 
 namespace {
-
-constexpr int TileCount = 10;
 
 std::string bitmapFile(const std::string& name) {
     return "bitmaps/" + name + ".bmp";
@@ -52,13 +51,16 @@ void addPoses(std::vector<Exhibit>& gallery) {
 
 void addTiles(std::vector<Exhibit>& gallery) {
     // The form of each, from the first on.
-    constexpr std::array<BmpForm, TileCount> Forms = {
-        {{4, 0}, {8, 0}, {8, 0}, {8, 0}, {8, 0}, {8, 0}, {8, 256}, {8, 256}, {8, 256}, {8, 256}}};
-    for (int i = 1; i <= TileCount; ++i) {
-        const Tile tile = drawTile(i);
-        const std::string name = (i < 10 ? "bg0" : "bg") + std::to_string(i);
-        gallery.push_back({bitmapFile(name), bmpBytes(tile.picture, tile.colours,
-                                                      Forms[static_cast<std::size_t>(i - 1)])});
+    constexpr BmpForm Forms[] = {{4, 0}, {8, 0},   {8, 0},   {8, 0},   {8, 0},
+                                 {8, 0}, {8, 256}, {8, 256}, {8, 256}, {8, 256}};
+    const std::vector<Tile> tiles = drawTiles();
+    if (tiles.size() != std::size(Forms)) {
+        throw std::logic_error("there aren't as many forms as tiles");
+    }
+    for (std::size_t i = 0; i < tiles.size(); ++i) {
+        const std::string name = (i < 9 ? "bg0" : "bg") + std::to_string(i + 1);
+        gallery.push_back(
+            {bitmapFile(name), bmpBytes(tiles[i].picture, tiles[i].colours, Forms[i])});
     }
 }
 

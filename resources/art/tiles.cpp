@@ -6,9 +6,7 @@
 #include <array>
 #include <cmath>
 #include <cstddef>
-#include <iterator>
 #include <numbers>
-#include <stdexcept>
 
 namespace art {
 
@@ -274,14 +272,9 @@ Tile sand() {
 
 } // namespace
 
-Tile drawTile(int number) {
-    using Draw = Tile (*)();
-    constexpr Draw Draws[] = {footprints, terrazzo, raindrops, boards,   shingles,
-                              petals,     bricks,   water,     knitting, sand};
-    if (number < 1 || number > static_cast<int>(std::size(Draws))) {
-        throw std::out_of_range("there are ten backdrops");
-    }
-    return Draws[number - 1]();
+std::vector<Tile> drawTiles() {
+    return {footprints(), terrazzo(), raindrops(), boards(),   shingles(),
+            petals(),     bricks(),   water(),     knitting(), sand()};
 }
 
 } // namespace art

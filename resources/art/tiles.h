@@ -2,9 +2,11 @@
 
 #include "resources/art/tile_kit.h"
 
+#include <vector>
+
 namespace art {
 
-// The backdrop with the given number, 1 to 10. Number 1 is in the sixteen fixed colours.
-Tile drawTile(int number);
+// The backdrops, from number 1 on. Number 1 is in the sixteen fixed colours.
+std::vector<Tile> drawTiles();
 
 } // namespace art
