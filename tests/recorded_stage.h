@@ -9,11 +9,19 @@
 
 #include <gmock/gmock.h>
 
+#include <QTimer>
+
 #include <algorithm>
 #include <filesystem>
 #include <fstream>
+#include <functional>
 #include <string>
 #include <vector>
+
+/// Acts within a loop of the program's, as soon as `stands` says so.
+inline void once(const std::function<bool()>& stands, const std::function<void()>& act) {
+    QTimer::singleShot(0, [stands, act] { stands() ? act() : once(stands, act); });
+}
 
 class RecordedStage : public testing::Test {
   protected:

@@ -1,94 +1,93 @@
-// What can be pressed when, what each command does, and what drags the window.
+// The editor's main window: what can be pressed when, what each command does, and how runs begin
+// and end without leaving anything to the next.
 #include "tests/editor/editor_fixture.h"
 
-#include "platform/user/window.h"
+#include "stage/backdrop.h"
+#include "stage/random_walk.h"
 
 #include <QAccessible>
-#include <QTimer>
-#include <QWidget>
+#include <QApplication>
+#include <QMenu>
+#include <QTest>
 
 namespace {
 
-TEST_F(EditorTest, ButtonsLabelAndTimersAreThoseOfEachState) {
+// What each state leads to is held by the recorded scenes.
+TEST_F(EditorTest, ButtonsAndLabelAreThoseOfEachState) {
     openAtRest();
-    EXPECT_EQ(stateNow(), "idle") << "no Toon is open";
-    const std::string stop = "&Stop";
+    EXPECT_EQ(looks(), "&Play: FW") << "no Toon is open";
     for (const EditorState& state : editorStates) {
         reach(state.name);
-        EXPECT_EQ(stateNow(), state.name);
-        const DWORD pointer = SetClassLongA(EditorStage, GCL_HCURSOR, 0);
-        EXPECT_EQ(pointer == DWORD{IDC_WAIT.number}, state.about != 0 || state.label == stop)
+        EXPECT_EQ(looks(), state.looks) << state.name;
+        const bool waits = state.looks.find("Stop") != std::string::npos || RandomWalkActive != 0;
+        EXPECT_EQ(SetClassLongA(EditorStage, GCL_HCURSOR, 0) == DWORD{IDC_WAIT.number}, waits)
             << state.name;
-        press(PlayButton);
-        EXPECT_EQ(stateNow(), state.afterPlay) << state.name;
-        // Only a walk to a frame stops when another window is active.
-        reach(state.name);
-        SendMessageA(EditorMainWindow, WM_ACTIVATE, WA_ACTIVE, 0);
-        SendMessageA(EditorMainWindow, WM_ACTIVATE, WA_CLICKACTIVE, 0);
-        EXPECT_EQ(stateNow(), state.name);
-        SendMessageA(EditorMainWindow, WM_ACTIVATE, 0x10001, 0); // minimised
-        EXPECT_EQ(stateNow(), std::string("to a frame") == state.name ? "held" : state.name);
     }
 }
 
-class Command : public EditorTest {
-  protected:
-    /// The one thing that the command does in a state; "" stands for an editor without a Toon.
-    std::string effect(const std::string& state, int command) {
+TEST_F(EditorTest, CommandsDoWhatTheirButtonMayDoAndElseNothing) {
+    // The state, "" for an editor without a Toon, the command, and how it looks then.
+    const std::tuple<std::string, int, std::string> cases[] = {
+        {"", KEY_PLAY, "&Play: FW"},
+        {"", KEY_OPEN, "asks"},
+        {"", KEY_EDIT, "edits"},
+        {"", KEY_WALK, looksOf("about")},
+        {"idle", KEY_SAVE, looksOf("idle")},
+        {"idle", KEY_STOP, looksOf("to a frame")},
+        {"pause", KEY_OPEN, looksOf("pause")},
+        {"about", KEY_EDIT, looksOf("about")},
+        {"idle", POPUP_OPEN, "asks"},
+        {"idle", POPUP_EDIT, "edits"},
+        {"idle", POPUP_PLAY, looksOf("to a frame")},
+    };
+    for (const auto& [state, command, then] : cases) {
         close();
         state.empty() ? openAtRest() : reach(state);
         filesAsked = 0;
         fileGiven = "";
-        boxes.clear();
         key(command);
-        if (!EditorMainWindow || filesAsked != 0 || EditorDialog) {
-            return !EditorMainWindow ? "closes" : filesAsked != 0 ? "asks" : "edits";
-        }
-        const std::string after = stateNow();
-        return after == (state.empty() ? "idle" : state) ? "" : after;
-    }
-};
-
-TEST_F(Command, AKeyDoesWhatItsButtonMayDoAndElseNothing) {
-    const std::tuple<int, const char*, const char*> cases[] = {
-        {KEY_PLAY, "to a frame", ""}, {KEY_CONTINUE, "to a frame", ""},
-        {KEY_STOP, "to a frame", ""}, {KEY_OPEN, "asks", "asks"},
-        {KEY_EDIT, "edits", "edits"}, {KEY_WALK, "about", "about"},
-    };
-    for (const auto& [command, withToon, withoutToon] : cases) {
-        EXPECT_EQ(effect("idle", command), withToon) << command;
-        EXPECT_EQ(effect("", command), withoutToon) << command;
-        EXPECT_EQ(effect("about", command), "") << command;
-    }
-    EXPECT_EQ(effect("pause", KEY_OPEN), "") << "Stop shows: File can't be pressed";
-    EXPECT_EQ(effect("held", KEY_WALK), "");
-    for (const int editorsKey : {108, 128, 129, 130, 131, 132, 133, 134}) {
-        EXPECT_EQ(effect("idle", editorsKey), "") << editorsKey;
+        EXPECT_EQ(EditorDialog      ? "edits"
+                  : filesAsked != 0 ? "asks"
+                                    : looks(),
+                  then)
+            << state << ' ' << command;
     }
 }
 
-TEST_F(Command, AnItemOfTheMenuDoesWhatItSays) {
-    EXPECT_EQ(effect("idle", POPUP_OPEN), "asks");
-    EXPECT_EQ(effect("idle", POPUP_EDIT), "edits");
-    EXPECT_EQ(effect("idle", POPUP_PLAY), "to a frame");
-    EXPECT_EQ(effect("pause", POPUP_EXIT), "closes");
-    EXPECT_EQ(effect("idle", POPUP_EXIT + 1), "");
+TEST_F(EditorTest, TheMenuStandsAboveTheFileButtonAndGreysWhatCantBeChosen) {
+    openAtRest();
+    fileGiven = "two.zkt";
+    std::string items;
+    const auto choose = [&items] {
+        auto* menu = qobject_cast<QMenu*>(QApplication::activePopupWidget());
+        for (const QAction* item : menu->actions()) {
+            items += item->isSeparator() ? "-" : item->isEnabled() ? "o" : ".";
+        }
+        EXPECT_EQ(menu->x(), 14 + 11);
+        EXPECT_GE(783 - 44 - menu->y(), 6 * 12); // above the button
+        menu->setActiveAction(menu->actions().first());
+        QTest::keyClick(menu, Qt::Key_Return);
+    };
+    const auto menuStands = [] { return QApplication::activePopupWidget() != nullptr; };
+    once(menuStands, choose);
+    press(FileButton);
+    once(menuStands, choose);
+    key(KEY_FILE); // there is a Toon now
+    EXPECT_EQ(items, "oo.-ooooo-oo");
+    EXPECT_EQ(filesAsked, 2);
 }
 
 TEST_F(EditorTest, OnlyOkClosesTheAboutBox) {
     openAtRest();
-    int asked = 0;
-    QTimer timer;
-    QObject::connect(&timer, &QTimer::timeout, [&] {
-        seam::forEachWindow([&](const seam::Window& window) {
-            if (window.dialog) {
-                PostMessageA(window.handle, WM_COMMAND, ++asked == 1 ? IDCANCEL : IDOK, 0);
-            }
+    once(dialogStands, [] {
+        QTest::keyClick(&widgetOf(modalDialog()), Qt::Key_Escape);
+        QTimer::singleShot(10, [] {
+            EXPECT_TRUE(dialogStands());
+            QTest::keyClick(&widgetOf(modalDialog()), Qt::Key_Return);
         });
     });
-    timer.start(0);
-    key(5003);
-    EXPECT_GE(asked, 2);
+    key(POPUP_ABOUT);
+    EXPECT_FALSE(dialogStands());
 }
 
 TEST_F(EditorTest, ButtonsThatShowAPictureTellTheirNames) {
@@ -111,24 +110,41 @@ TEST_F(EditorTest, OpeningWhatIsNoToonChangesNothing) {
     EXPECT_EQ(boxes.size(), 2U);
 }
 
-TEST_F(EditorTest, BarsAndCaptionDragTheWindowAndNothingElseDoes) {
-    openAtRest();
-    const LONG text = CaptionTextRect.left;
-    const LONG end = CaptionTextRect.right;
-    const std::tuple<LONG, LONG, LRESULT> cases[] = {
-        {43, 10, HTNOWHERE},       {44, 10, HTCAPTION},       {100, 2, HTNOWHERE},
-        {100, 3, HTCAPTION},       {100, 19, HTCAPTION},      {100, 20, HTNOWHERE},
-        {text - 6, 10, HTCAPTION}, {text - 5, 10, HTNOWHERE}, {text, 2, HTCAPTION},
-        {end - 1, 21, HTCAPTION},  {end, 10, HTNOWHERE},      {end + 5, 10, HTCAPTION},
-        {726, 10, HTCAPTION},      {727, 10, HTNOWHERE},      {300, 740, HTNOWHERE},
+// ---- Runs ---------------------------------------------------------------------------------------
+
+TEST_F(EditorTest, ARunEndsWithItsWindowHoweverThatGoes) {
+    const std::tuple<HWND*, UINT, WPARAM> ways[] = {
+        {&EditorMainWindow, WM_COMMAND, POPUP_EXIT},
+        {&EditorStage, WM_CLOSE, 0},
+        {&EditorMainWindow, WM_ENDSESSION, TRUE},
+        {&EditorMainWindow, WM_CLOSE, 0}, // behind the about box
     };
-    for (const auto& [x, y, what] : cases) {
-        RECT window{};
-        GetWindowRect(EditorMainWindow, &window); // with a border of one pixel
-        const auto point = static_cast<LPARAM>(MAKELONG(window.left + 1 + x, window.top + 1 + y));
-        EXPECT_EQ(SendMessageA(EditorMainWindow, WM_NCHITTEST, 0, point), what) << x << ' ' << y;
+    for (const auto& way : ways) {
+        const auto [window, message, wParam] = way;
+        once(editorStands, [&way, behindBox = message == WM_CLOSE && window == &EditorMainWindow] {
+            PostMessageA(EditorMainWindow, WM_COMMAND, behindBox ? POPUP_ABOUT : 0, 0);
+            once(behindBox ? dialogStands : editorStands, [&way] {
+                PostMessageA(*std::get<0>(way), std::get<1>(way), std::get<2>(way), 0);
+            });
+        });
+        EXPECT_EQ(runEditor(), 0);
+        expectClosed(std::to_string(message));
     }
-    EXPECT_EQ(SendMessageA(EditorStage, WM_NCHITTEST, 0, 0), HTCLIENT);
+}
+
+TEST_F(EditorTest, ClosedInAnyStateItsStageBeginsClean) {
+    for (const EditorState& state : editorStates) {
+        reach(state.name);
+        press(CloseButton);
+        expectClosed(state.name);
+        open();
+        EXPECT_EQ(looks(), "&Play: FW") << state.name;
+        EXPECT_EQ(SetClassLongA(EditorStage, GCL_HCURSOR, 0), IDC_ARROW.number) << state.name;
+        EXPECT_STREQ(ToonFileName, "");
+        EXPECT_STREQ(CaptionText, "Fenky Dorbo's Rematch");
+        EXPECT_EQ(FrameCount, 1);
+        EXPECT_EQ(CurrentFrameIndex + BackgroundIndex, 0);
+    }
 }
 
 } // namespace

@@ -9,41 +9,26 @@
 #include "tests/recorded_stage.h"
 #include "toon/toon_document.h"
 
-#include <QEvent>
-#include <QPoint>
-
-#include <functional>
 #include <memory>
-#include <set>
 
 class QWidget;
-
-enum class NextFrame { none, behind, at }; // 0; behind a frame of the Toon; at one
+class QWindow;
 
 /// What the editor can be at, and what goes with it.
 struct EditorState {
-    const char* name;
-    DWORD showStarted;
-    DWORD awaitingArrival;
-    DWORD playIdle;
-    NextFrame next;
-    DWORD about; // RandomWalkActive
-    const char* label;
-    std::set<std::string> timers; // TALK may run beside PAUSE, OPENING beside all
-    const char* enabled;          // buttons: File, Play, Walk; minimise goes with Walk
-    const char* afterPlay;        // what a press of Play brings about
+    std::string name;
+    std::string event; // that brings it, after a press or a click
+    std::string looks; // as EditorTest::looks() tells them
 };
 
 extern const std::vector<EditorState> editorStates;
 
-/// What a window shows of itself, and takes from a user's mouse.
 QWidget& widgetOf(HWND window);
-void sendMouse(HWND window, QEvent::Type type, QPoint point);
-
-/// Acts within a loop of the program's, as soon as `stands` says so.
-void once(const std::function<bool()>& stands, const std::function<void()>& act);
+QWindow* toolkitWindowOf(HWND window);
 
 bool editorStands();
+HWND modalDialog(); ///< one that keeps its caller waiting; null where there is none
+bool dialogStands();
 
 class EditorTest : public RecordedStage {
   protected:
@@ -53,16 +38,18 @@ class EditorTest : public RecordedStage {
     void open();
     void openAtRest(); ///< he has come and gone
     void close();
+    static int runEditor(); ///< in its own loop, until it is closed
 
     /// Opens an editor, a Toon in it, and brings it into one of the states by what a user does.
     void reach(const std::string& state);
 
-    /// Which of the states this is, by its variables, its label, its timers and its buttons; a
-    /// description of what there is where it is none.
-    static std::string stateNow();
+    /// What there is of a show, the label of Play, and which buttons can be pressed: File, Play and
+    /// Walk, with which minimise goes.
+    static std::string looks();
+    static std::string looksOf(const std::string& state);
 
-    /// That the frame editor has shut Play, or its end has opened it; a load is seen without this.
-    static void playIsAlive(bool alive);
+    /// That nothing is left of a run of the editor.
+    static void expectClosed(const std::string& how);
 
     // What a user does, with the toolkit's own events; what it leads to has happened then.
     static void press(HWND button);
@@ -70,16 +57,12 @@ class EditorTest : public RecordedStage {
     static void key(int command);
     static void openToon(const std::string& name);
 
-    std::filesystem::path toons() const {
-        return ground_->toons();
-    }
-
     /// Recorded on a stage of twice the size.
-    void putToon(const std::string& name, const std::vector<ToonFrame>& frames) const {
-        writeToon(toons() / name, frames, "", MAKELONG(1500, 1400));
+    static void putToon(const std::string& name, const std::vector<ToonFrame>& frames) {
+        writeToon(name, frames, "", MAKELONG(1500, 1400));
     }
 
-    void putToons() const; ///< two.zkt, one.zkt, still.zkt, and none.zkt, which is none
+    static void putToons(); ///< two.zkt, one.zkt, still.zkt, and none.zkt, which is none
 
     static inline int filesAsked;
     static inline std::string fileGiven; // empty: the dialog is cancelled

@@ -1,6 +1,6 @@
 // Any bytes for the command lines: the saver's, which runs what it asks for, and the options of
 // `toon` and `dorbo-hack`, which are read only, as the lines of a scene are. A line break parts the
-// words of a line, and an @ stands for a window that is there. How it is run: docs/fuzzing.md.
+// words of a line, and an @ stands for a window that is there.
 #include "cli/options.h"
 #include "cli/scene.h"
 #include "launch/hack_options.h"
@@ -9,7 +9,7 @@
 #include "saver/saver_guard.h"
 #include "saver/saver_main.h"
 #include "tests/fuzz/fuzz.h"
-#include "tests/fuzz/ground.h"
+#include "tests/fuzz/user.h"
 
 #include <sstream>
 #include <stdexcept>
@@ -30,36 +30,20 @@ Words wordsOf(std::string_view text) {
 // ---- The saver ----------------------------------------------------------------------------------
 
 constexpr std::string_view looksOn = ".5"; // for some steps of a show, then leaves
-HWND host;                                 // in which a preview is shown
+constexpr const char* hostClass = "FuzzedHost";
 
-/// Whatever the line has opened, from the front to the back.
-void closeOne() {
-    if (IsWindow(SaverWindow)) {
-        PostMessageA(SaverWindow, WM_CLOSE, 0, 0);
-    } else {
-        PostMessageA(FindWindowA("dialog", nullptr), WM_COMMAND, IDCANCEL, 0);
-    }
-}
-
-Words withHost(Words words) {
+/// Runs what the line asks for as the process does, with the name that it was called by.
+void runSaver(Words words) {
+    const HWND host = CreateWindowExA(0, hostClass, "", WS_VISIBLE | WS_POPUP, 0, 0, 160, 120,
+                                      nullptr, nullptr, HINSTANCE{}, nullptr);
+    std::vector<const char*> arguments{"dorbo"};
     for (std::string& word : words) {
         if (const std::size_t at = word.find('@'); at != std::string::npos) {
             word.replace(at, 1, std::to_string(host.number));
         }
-    }
-    return words;
-}
-
-/// Runs what the line asks for as the process does, with the name that it was called by.
-void runSaver(const Words& words) {
-    SaverWindow = nullptr;
-    host = CreateWindowExA(0, "FuzzedHost", "", WS_VISIBLE | WS_POPUP, 0, 0, 160, 120, nullptr,
-                           nullptr, HINSTANCE{}, nullptr);
-    const Words meant = withHost(words);
-    std::vector<const char*> arguments{"dorbo"};
-    for (const std::string& word : meant) {
         arguments.push_back(word.c_str());
     }
+    SaverWindow = nullptr;
     SetCommandLineArguments(static_cast<int>(arguments.size()), arguments.data());
     const int code = ProcessStart();
     seam::forgetClass(SAVER_CLASS); // a process runs one saver
@@ -109,25 +93,20 @@ void readScene(std::string_view text) {
 
 } // namespace
 
-extern "C" int LLVMFuzzerInitialize(int* /*count*/, char*** /*words*/) {
-    standAlone();
+void prepare() {
     WNDCLASSA windowClass{};
     windowClass.lpfnWndProc = DefWindowProcA;
-    windowClass.lpszClassName = "FuzzedHost";
+    windowClass.lpszClassName = hostClass;
     RegisterClassA(&windowClass);
     for (const char* line : {"S", "C", "P @", "A"}) {
-        fuzz::runWithUser(looksOn, {[&] { runSaver({line}); }, closeOne, nullptr});
+        fuzz::runWithUser(looksOn, [&] { runSaver({line}); });
     }
-    fuzz::warm = true;
-    return 0;
 }
 
-extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
-    const std::string_view text = textOf(bytes, size);
-    const Words words = wordsOf(text);
+void tryInput(std::string_view bytes) {
+    const Words words = wordsOf(bytes);
     readToonOptions(words);
     readHackOptions(words);
-    readScene(text);
-    fuzz::runWithUser(looksOn, {[&] { runSaver(words); }, closeOne, nullptr});
-    return 0;
+    readScene(bytes);
+    fuzz::runWithUser(looksOn, [&] { runSaver(words); });
 }

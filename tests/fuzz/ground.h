@@ -1,18 +1,16 @@
-// A home and a directory of Toons for a user at random, and what has to hold when he has left.
+// What lies round a user at random, and what has to hold of it.
 #pragma once
 
-#include "tests/fuzz/user.h"
-
-#include <string_view>
+#include <filesystem>
 
 namespace fuzz {
 
-/// Set when what a process makes once has been made: from then on a run leaves nothing behind.
-inline bool warm = false;
+/// Puts Toons there, good ones, odd ones and one that doesn't load, and the settings of a user who
+/// has had the program for a while.
+void beginAnew(const std::filesystem::path& toons);
 
-/// Sends a user to a place who does what the bytes say and then leaves. Once `warm`, no handle and
-/// no window is left behind; each Toon on the disk loads.
-void runWithUser(std::string_view bytes, const Place& place);
+/// Each Toon there loads, but the one that never did.
+void checkToons(const std::filesystem::path& toons);
 
 /// What always holds of the frame editor, if it is open.
 void checkFrameEditor();

@@ -1,5 +1,5 @@
 // Any bytes for the reader of JSON, and for the other way round: what is shown of a Toon makes a
-// Toon that shows the same. How it is run: docs/fuzzing.md.
+// Toon that shows the same.
 #include "cli/toon_json.h"
 #include "tests/fuzz/fuzz.h"
 
@@ -23,18 +23,18 @@ void checkWritten(const Toon& toon) {
 
 } // namespace
 
-extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
-    const std::string_view text = textOf(bytes, size);
+void prepare() {}
+
+void tryInput(std::string_view bytes) {
     Toon toon{};
-    if (ToonFromBytes(text, toon).empty()) {
+    if (ToonFromBytes(bytes, toon).empty()) {
         checkShown(toon);
     }
-    const ToonFromJson made = JsonToToon(text);
+    const ToonFromJson made = JsonToToon(bytes);
     if (made.error.empty()) {
         checkShown(made.toon);
         checkWritten(made.toon);
     } else {
         demand(made.error.front() >= '1' && made.error.front() <= '9'); // it names a line
     }
-    return 0;
 }

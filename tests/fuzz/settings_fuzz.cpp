@@ -1,5 +1,5 @@
 // Any bytes for the settings file and for the registry: every load ends, what is saved is read
-// back, and the setup dialog and the saver bear what they find. How it is run: docs/fuzzing.md.
+// back, and the setup dialog and the saver bear what they find.
 #include "cli/replay.h"
 #include "platform/dialogs.h"
 #include "platform/kernel.h"
@@ -15,8 +15,6 @@
 namespace {
 
 namespace fs = std::filesystem;
-
-constexpr std::int64_t longestShow = 8'000; // ms: titles, and a walk or a frame
 
 void checkDirectory() {
     const std::size_t length = strnlen(Directory, sizeof Directory);
@@ -53,6 +51,7 @@ void setUp() {
 
 /// The saver starts, and has its password's module if the registry says so.
 void startSaver() {
+    constexpr std::int64_t longest = 8'000; // ms: titles, and a walk or a frame
     static WNDCLASSA windowClass{};
     windowClass.lpfnWndProc = SaverGuardProc;
     windowClass.lpszClassName = "FuzzedSaver";
@@ -60,7 +59,7 @@ void startSaver() {
     LoadPasswordModule();
     const HWND stage = CreateWindowExA(0, windowClass.lpszClassName, "", WS_VISIBLE | WS_POPUP, 0,
                                        0, 320, 240, nullptr, nullptr, HINSTANCE{}, nullptr);
-    seam::runUntil(seam::clockNow() + longestShow);
+    seam::runUntil(seam::clockNow() + longest);
     DestroyWindow(stage);
     seam::runUntil(seam::clockNow()); // takes the quit
     UnloadPasswordModule();
@@ -68,35 +67,29 @@ void startSaver() {
     BackdropBitmap = nullptr;
 }
 
-void run(std::string_view bytes) {
+} // namespace
+
+void tryInput(std::string_view bytes) {
     const ReplayGround ground;
+    const auto putSettings = [&] { writeBytes(ground.settingsFile(), bytes); };
     fs::create_directories(ground.settingsFile().parent_path());
-    writeBytes(ground.settingsFile(), bytes);
     writeBytes(ground.settingsFile().parent_path() / "registry.ini", bytes);
     writeBytes(ground.toons() / "bad.zkt", "no Toon");
     const seam::HandleCounts before = seam::liveHandles();
     ForgetEarlierStages();
     WalkingStyle = Statements = Backgrounds = 1;
     seam::useManualClock(1);
+    putSettings();
     checkRoundTrip();
-    writeBytes(ground.settingsFile(), bytes);
+    putSettings();
     setUp();
     fs::current_path(ground.toons());
-    writeBytes(ground.settingsFile(), bytes);
+    putSettings();
     startSaver();
-    demand(seam::liveHandles() == before);
+    demand(!prepared || seam::liveHandles() == before);
 }
 
-} // namespace
-
-extern "C" int LLVMFuzzerInitialize(int* /*count*/, char*** /*words*/) {
-    standAlone();
+void prepare() {
     seam::answerBoxes([](const std::string&, const std::string&, UINT) { return IDOK; });
-    run(""); // what is made once for the process
-    return 0;
-}
-
-extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
-    run(textOf(bytes, size));
-    return 0;
+    tryInput("");
 }

@@ -1,6 +1,5 @@
 // Any bytes for a Toon's file: a load may refuse them and keeps its promises, and what loads is
-// saved, loaded again and shown to its end, or for the first minute of it. How it is run:
-// docs/fuzzing.md.
+// saved, loaded again and shown to its end, or for the first minute of it.
 #include "cli/replay.h"
 #include "tests/fuzz/fuzz.h"
 #include "toon/toon_document.h"
@@ -8,8 +7,6 @@
 #include <cstring>
 
 namespace {
-
-constexpr std::int64_t longestShow = 60'000; // ms
 
 /// Every frame in force can be read and has its NUL, and there is none behind them.
 void checkFrames() {
@@ -48,41 +45,36 @@ bool load(const std::filesystem::path& file) {
     return faulty;
 }
 
-void show(const std::filesystem::path& file, ReplayMode mode, bool faulty) {
+/// As the program shows it, for so many ms at most; without a Toon a walk about.
+void show(const std::vector<std::string>& toons, ReplayMode mode, std::int64_t longest,
+          bool faulty) {
     ReplayOptions options;
     options.mode = mode;
-    options.toons = {file};
+    options.toons = toons;
     options.width = 320;
     options.height = 240;
     options.paces = 100;
-    options.longest = longestShow;
+    options.longest = longest;
     const seam::HandleCounts before = seam::liveHandles();
     const ReplayEnd end = Replay(options, {});
-    demand(seam::liveHandles() == before);
+    demand(!prepared || seam::liveHandles() == before);
     demand(end.message.empty() != faulty);
-    demand(end.moment <= longestShow);
+    demand(end.moment <= longest);
 }
 
 } // namespace
 
-extern "C" int LLVMFuzzerInitialize(int* /*count*/, char*** /*words*/) {
-    standAlone();
-    for (const ReplayMode mode : {ReplayMode::player, ReplayMode::saver}) {
-        ReplayOptions options;
-        options.mode = mode;
-        options.longest = 1;
-        Replay(options, {}); // what is made once for the process
-    }
-    return 0;
+void prepare() {
+    show({}, ReplayMode::player, 1, false);
+    show({}, ReplayMode::saver, 1, false);
 }
 
-extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* bytes, std::size_t size) {
-    static const std::filesystem::path file = scratchDirectory() / "x.zkt";
-    const std::string_view text = textOf(bytes, size);
-    writeBytes(file, text);
+void tryInput(std::string_view bytes) {
+    const ReplayGround ground;
+    const std::filesystem::path file = ground.toons() / "x.zkt";
+    writeBytes(file, bytes);
     const bool faulty = load(file);
-    writeBytes(file, text);
-    const bool odd = size > 0 && bytes[size - 1] % 2 == 1; // a byte that a frame doesn't use
-    show(file, odd ? ReplayMode::saver : ReplayMode::player, faulty);
-    return 0;
+    writeBytes(file, bytes);
+    const bool odd = !bytes.empty() && bytes.back() % 2 != 0; // a byte that a frame doesn't use
+    show({file}, odd ? ReplayMode::saver : ReplayMode::player, 60'000, faulty);
 }

@@ -21,62 +21,14 @@
 // Any other byte is typed. A question, and a file dialog, take the next byte for their answer.
 #pragma once
 
-#include <QTimer>
-
-#include <cstdint>
-#include <filesystem>
 #include <functional>
-#include <optional>
-#include <string>
 #include <string_view>
-
-class QWindow;
 
 namespace fuzz {
 
-/// What a user meets.
-struct Place {
-    std::function<void()> run;   // the program's; it comes back when the user has left
-    std::function<void()> close; // asks its windows to close, one of them each time it is called
-    std::function<void()> check; // whether all is in order; nothing waits and no box is up then
-};
-
-class User {
-  public:
-    /// The place stays. Files are chosen in that directory.
-    User(std::string_view bytes, std::filesystem::path files, const Place& place);
-    ~User();
-
-    User(const User&) = delete;
-    User& operator=(const User&) = delete;
-
-  private:
-    std::uint8_t next();
-    bool programIsBusy();
-    void goOn();
-    void act();
-    bool point(std::uint8_t what);
-    void pressKey(int key, Qt::KeyboardModifiers held, const QString& text);
-    void pressNamed(std::uint8_t which, Qt::KeyboardModifiers held);
-    void clickPlace(Qt::MouseButton button);
-    void clickField(bool twice);
-    void drag();
-    void clickWindow();
-    void turnWheel();
-    void otherProgram();
-    void turnBoxes();
-    void leave();
-    std::optional<std::string> chooseFile();
-
-    std::string_view bytes_;
-    std::filesystem::path files_;
-    const Place& place_;
-    QTimer timer_;
-    int pause_ = 0;    // turns to let pass
-    int haste_ = 0;    // things to do without waiting
-    int patience_ = 0; // turns that the program has had for what waits
-    int leaving_ = 0;
-    bool realBoxes_ = true;
-};
+/// Gives such a user a home and Toons of his own and runs the program, which comes back when he has
+/// left. The frame editor's fields are right whenever nothing waits; then no handle and no window
+/// is left behind, and each Toon on the disk loads.
+void runWithUser(std::string_view bytes, const std::function<void()>& program);
 
 } // namespace fuzz

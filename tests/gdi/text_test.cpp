@@ -102,32 +102,10 @@ TEST(Text, AnAmpersandUnderlinesUnlessNoPrefixStands) {
     EXPECT_EQ(draw("&H", roomy, DT_NOPREFIX).cells.right, 10 + widthOf("&H"));
 }
 
-TEST(Text, TakesAsManyCharactersAsAskedFor) {
-    EXPECT_EQ(draw("HHHH", roomy, DT_LEFT, 2).cells.right, 10 + widthOf("HH"));
-    EXPECT_EQ(draw("text", roomy, DT_LEFT, -2).height, 0);
-    EXPECT_EQ(draw(nullptr, roomy, DT_LEFT, 3).height, 0);
-}
-
 TEST(Text, FontsDifferInSizeAndWeight) {
     const SIZE regular = sizeOf("Dorbo", bubbleFont());
     EXPECT_NEAR(sizeOf("Dorbo", makeFont(-28)).cx, 2 * regular.cx, 4);
     EXPECT_NEAR(sizeOf("Dorbo", makeFont(14)).cy, 13.5, 0.5) << "the height of the cells";
     EXPECT_GT(sizeOf("Dorbo", makeFont(-14, 700)).cx, regular.cx);
     EXPECT_FALSE(makeFont(-14, 400, 1));
-}
-
-TEST(Text, KeepsToTheClipOfAWindowAndTellsIt) {
-    for (const int mode : {OPAQUE, TRANSPARENT}) {
-        TestSurface window(plain(60, 30, 'G'), {12, 0, 60, 30});
-        SelectObject(window.dc, bubbleFont());
-        SetBkMode(window.dc, mode);
-        RECT place{11, 5, 60, 30};
-        DrawTextA(window.dc, "HHH", -1, &place, DT_LEFT);
-        const RECT drawn = boundsOf(window.text(), mode == OPAQUE ? 'W' : '.');
-        EXPECT_NEAR(drawn.left, 12, mode == OPAQUE ? 0 : 1);
-        ASSERT_FALSE(window.touched.empty());
-        EXPECT_EQ(window.touched.front().left, 12);
-        EXPECT_GE(window.touched.front().right, drawn.right);
-        EXPECT_EQ(window.before.front(), plain(60, 30, 'G'));
-    }
 }

@@ -142,14 +142,10 @@ Ground::~Ground() {
     }
 }
 
-Process Ground::start(const std::vector<std::string>& arguments, bool offscreen) const {
+Process Ground::start(const std::vector<std::string>& arguments) const {
     std::vector<std::string> command{DORBO_PROGRAM};
     command.insert(command.end(), arguments.begin(), arguments.end());
-    QProcessEnvironment environment = environment_;
-    if (offscreen) {
-        environment.insert(text("QT_QPA_PLATFORM"), text("offscreen"));
-    }
-    return {command, environment, toons()};
+    return launch(command);
 }
 
 QImage Ground::grab(xcb_window_t window) const {

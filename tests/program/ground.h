@@ -54,7 +54,7 @@ class Ground {
     ~Ground();
 
     /// Starts dorbo with these arguments in the directory of the Toons.
-    Process start(const std::vector<std::string>& arguments, bool offscreen = false) const;
+    Process start(const std::vector<std::string>& arguments) const;
 
     /// A picture of the whole screen, or of a window of ours.
     QImage grab(xcb_window_t window = 0) const;

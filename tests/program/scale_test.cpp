@@ -74,9 +74,7 @@ TEST_P(Scale, TheTitleIsThatOfASmallerScreen) {
 constexpr Case cases[] = {
     {"TheDesktopSaysTwo", 192, "", 2},
     {"OfOneAndAHalfTheWholePart", 144, "", 1},
-    {"OursIsStrongerThanTheDesktop", 192, "DORBO_SCALE=1", 1},
-    {"OursEnlarges", 96, "DORBO_SCALE=4", 4},
-    {"OursIsNoNumber", 192, "DORBO_SCALE=4x", 2},
+    {"OursIsStrongerThanTheDesktop", 192, "DORBO_SCALE=4", 4},
     {"OursIsTooLarge", 192, "DORBO_SCALE=9", 2},
     {"TheToolkitIsToldAFraction", 96, "QT_SCALE_FACTOR=2.5", 2},
     {"TheToolkitIsToldAFractionForAScreen", 96, "QT_SCREEN_SCALE_FACTORS=screen=2.5", 2},

@@ -125,18 +125,9 @@ TEST_F(Screen, SignalsEndItWithTheSettingsSaved) {
     EXPECT_EQ(change.exitCode(), 0);
 }
 
-TEST_F(Screen, TheSettingsAreSavedWhenTheDisplayGoes) {
-    // What the toolkit says of it goes to somebody who reads no more.
-    auto saver = ground.launch({"bash", "-c", "exec " DORBO_PROGRAM " S 2> >(:)"});
-    waitForSaver();
-    std::filesystem::remove(ground.settings());
-    ground.loseDisplay();
-    EXPECT_TRUE(waitFor([&] { return !saver.running(); }, 1));
-    EXPECT_EQ(setting("Walking Style"), "0");
-}
-
 TEST_F(Screen, ADisplayThatGoesInMidShowEndsItWithinASecondAndItsPacesCount) {
     addToon("intro.zkt");
+    // What the toolkit says of it goes to somebody who reads no more.
     auto saver = ground.launch({"bash", "-c", "exec " DORBO_PROGRAM " S 2> >(:)"});
     waitForSaver();
     for (int change = 0; change < 5; ++change) { // the title goes, he comes in, and walks
@@ -178,22 +169,6 @@ TEST_F(Screen, ThePasswordKeepsItUp) {
     EXPECT_TRUE(endsOnTyping(saver, title, "sesame"));
     EXPECT_EQ(saver.exitCode(), 0);
     EXPECT_TRUE(ground.inputIsFree());
-}
-
-/// Whether a saver without a screen can be found by another one.
-bool hiddenSaverIsThere() {
-    std::ifstream sockets("/proc/net/unix");
-    const std::string all{std::istreambuf_iterator<char>(sockets), {}};
-    return all.find("/offscreen/WindowsScreenSaverClass/") != std::string::npos;
-}
-
-TEST_F(Screen, ASecondSaverFindsTheFirstWithoutAScreenToo) {
-    auto first = ground.start({"S"}, true);
-    ASSERT_TRUE(waitFor(hiddenSaverIsThere));
-    EXPECT_EQ(ground.start({"S"}, true).exitCode(), 0);
-    EXPECT_TRUE(first.running());
-    first.signal(SIGTERM);
-    EXPECT_EQ(first.exitCode(), 0);
 }
 
 } // namespace

@@ -80,12 +80,6 @@ class SaverTest : public RecordedStage {
         return value;
     }
 
-    /// The display count of the pointer.
-    static int cursorCount() {
-        ShowCursor(TRUE);
-        return ShowCursor(FALSE);
-    }
-
   private:
     std::unique_ptr<ReplayGround> ground_;
 };

@@ -135,12 +135,8 @@ TEST_F(ToonJson, MistakesInAFrameAreToldWithLineFrameAndField) {
         // Values
         {"'pose': 'two'", "pose: 'two'" + pose},
         {"'pose': 1.5", "pose: 1.5" + pose},
-        {"'pose': 2147483649", "pose: 2147483649" + pose},
         {"'pose': -2147483648", "pose: -2147483648" + pose},
-        {"'pose': -9223372036854775808", "pose: -9223372036854775808" + pose},
         {"'pose': " + std::string(50, '9'), "pose: " + std::string(40, '9') + "..." + pose},
-        {"'pose': null", "pose: null" + pose},
-        {"'pose': [1]", "pose: [...]" + pose},
         {"'pose': {}", "pose: {...}" + pose},
         {"'pause': false", "pause: false is no pause; 1 to 20 would be right"},
         {"'wink': 'yes'", "wink: 'yes' is no wink; true or false would be right"},
@@ -151,12 +147,9 @@ TEST_F(ToonJson, MistakesInAFrameAreToldWithLineFrameAndField) {
          "text: a \\u0000 would end the text; any other character would be right"},
         {"'text': '\xE2\x98\xBA'", "text: '\xE2\x98\xBA', U+263A" + foreign},
         {"'text': '\\ud83d\\ude00'", "text: '\xF0\x9F\x98\x80', U+1F600" + foreign},
-        {"'text': '\\udc00'", "text: U+DC00" + foreign.substr(1)},
         {"'text': '\\u0080'", "text: '\\u0080', U+0080" + foreign},
         {"'text': '\xE9'", "text: the text is no UTF-8; a file saved as UTF-8 would be right"},
         {"'text': 'One\nTwo'", escape},
-        {"'text': '\\x41'", escape},
-        {"'text': '\\u00g1'", escape},
         {"'text': '\\ud83d'", escape},
         // Fields
         {"'wink': true", "pose: it is missing; 1 to 8 would be right"},
@@ -178,9 +171,7 @@ TEST_F(ToonJson, MistakesInTheRestAreToldWithTheirLine) {
         {"{'speed': 2.0}", "1: speed: 2.0 is no speed; 1 to 5 would be right"},
         {"{'stage': 5}", "1: stage: 5 is no stage" + stage},
         {"{'stage': [5,\n 65536]}", "2: stage: 65536 is no side of a stage" + stage},
-        {"{'stage': [-1]}", "1: stage: -1 is no side of a stage" + stage},
         {"{'stage': [5]}", "1: stage: there are less than two numbers" + stage},
-        {"{'stage': [5, 6, 7]}", "1: stage: there are more than two numbers" + stage},
         {"{'caption': '" + std::string(52, 'x') + "'}",
          "1: caption: 52 characters are too many; a text of up to 48 characters would be right"},
         // Fields
@@ -190,23 +181,18 @@ TEST_F(ToonJson, MistakesInTheRestAreToldWithTheirLine) {
         {"{'pose': 1}", "1: no field is called 'pose'; caption, stage, speed, background, magic or "
                         "frames would be right"},
         {"{'caption': 'x'}", "1: frames: it is missing; a list of frames would be right"},
-        {"{'frames': {}}",
-         "1: frames: {...} is no list of frames; a list of frames would be right"},
         {"{'frames': [\n5]}",
          "2: frame 1: 5 is no frame; {'x': 420, 'y': 780, 'pose': 1} would be right"},
         {"\n[]", "2: [...] is no Toon; {'frames': [...]} would be right"},
         // JSON
         {"", "1: nothing stands in the file; {'frames': [...]} would be right"},
         {"{'frames': []}\n\n}", "3: something stands behind the Toon; nothing would be right"},
-        {std::string("{'frames': []}\n\0", 16),
-         "2: something stands behind the Toon; nothing would be right"},
         {secondFrame("'pose': 1\n'pause': 2"),
          "5: frame 2, pose: the value doesn't end here; a comma or a } would be right"},
         {"{'stage': [1 2]}", "1: stage: the value doesn't end here; a comma or a ] would be right"},
         {"{speed: 1}", "1: this is no name of a field; a name in quotes would be right"},
         {"{'speed' 1}", "1: speed: no colon stands behind the name; a colon would be right"},
         {"{'speed': ten}", "1: speed: " + value},
-        {"{'speed': -}", "1: speed: " + value},
         {"{'speed': 1.}", "1: speed: this is no number; a whole number of 32 bits would be right"},
         {"{'caption': 'Hm", "1: caption: the text has no end; a quote mark would be right"},
     };
@@ -240,10 +226,6 @@ TEST_F(ToonJson, NestingIsRefusedHoweverDeep) {
     }
     EXPECT_THAT(JsonToToon(deep).error, testing::StartsWith("1: [...] is no Toon;"));
     EXPECT_THAT(JsonToToon(objects).error, testing::StartsWith("1: frames: {...} is no list"));
-    EXPECT_THAT(JsonToToon(secondFrame("\"text\":" + deep)).error,
-                testing::StartsWith("4: frame 2, text: [...] is no text;"));
-    EXPECT_THAT(JsonToToon("{\"frames\":" + deep).error,
-                testing::StartsWith("1: frame 1: [...] is no frame;"));
 }
 
 // ---- The program ------------------------------------------------------------------------------

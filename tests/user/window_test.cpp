@@ -1,10 +1,6 @@
 // Windows: their making and end, their picture, painting, and handles that have gone stale.
 #include "tests/user/test_window.h"
 
-#include <QIcon>
-
-#include <tuple>
-
 namespace {
 
 using test::handlers;
@@ -53,8 +49,6 @@ TEST_F(Windows, RefusedCreationLeavesNothing) {
     const HWND hidden = test::makeWindow(10, 10, WS_POPUP);
     EXPECT_FALSE(ShowWindow(hidden, SW_SHOWNORMAL));
     EXPECT_FALSE(IsWindow(hidden));
-    EXPECT_FALSE(CreateWindowExA(0, "NoSuchClass", "", WS_POPUP, 0, 0, 9, 9, nullptr, nullptr,
-                                 nullptr, nullptr));
     EXPECT_FALSE(test::makeWindow(9, 9, WS_CHILD, HWND{12345})) << "no such window off X11";
 }
 
@@ -96,14 +90,11 @@ TEST_F(Windows, StaleHandlesAreRefused) {
     DestroyWindow(old);
     window = test::makeWindow();
     EXPECT_NE(old, window) << "the slot is used again, with another generation";
-    RECT client{};
     PAINTSTRUCT paint{};
     EXPECT_EQ(SendMessageA(old, WM_CLOSE, 0, 0), 0);
     EXPECT_FALSE(PostMessageA(old, WM_CLOSE, 0, 0));
-    EXPECT_FALSE(GetClientRect(old, &client));
     EXPECT_FALSE(GetDC(old));
     EXPECT_FALSE(BeginPaint(old, &paint));
-    EXPECT_FALSE(InvalidateRect(old, nullptr, FALSE));
     EXPECT_FALSE(DestroyWindow(old));
     EXPECT_FALSE(SetTimer(old, 1, 10, nullptr));
 }
@@ -137,30 +128,6 @@ TEST_F(Windows, DrawingShowsAtOnceAndAPaintIsClippedToItsArea) {
     DeleteObject(red);
 }
 
-TEST_F(Windows, WatchersAreToldOnceOfAllThatAHandlerDrewAlsoWhereNothingIsShown) {
-    const HWND hidden = test::makeWindow(50, 20, WS_POPUP);
-    std::vector<std::tuple<HWND, LONG, LONG, LONG, LONG, DWORD>> told;
-    seam::watchPictures([&](HWND which, const RECT& drawn, const seam::PixelView& picture) {
-        told.emplace_back(which, drawn.left, drawn.top, drawn.right, drawn.bottom,
-                          picture.bits[19 * picture.stride + 49] & 0xFFFFFFU);
-    });
-    test::handleWaiting();
-    told.clear();
-    const HDC dc = GetDC(hidden);
-    const RECT one{45, 18, 60, 60}; // as far as it goes
-    const RECT other{3, 4, 5, 6};
-    FillRect(dc, &one, HBRUSH{GetStockObject(LTGRAY_BRUSH)});
-    FillRect(dc, &other, HBRUSH{GetStockObject(LTGRAY_BRUSH)});
-    ReleaseDC(hidden, dc);
-    EXPECT_TRUE(told.empty()) << "the handler isn't done";
-    test::handleWaiting();
-    test::handleWaiting();
-    ASSERT_EQ(told.size(), 1U);
-    EXPECT_EQ(told[0], std::tuple(hidden, 3, 4, 50, 20, 0xC0C0C0U));
-    seam::watchPictures(nullptr);
-    DestroyWindow(hidden);
-}
-
 TEST_F(Windows, ResizingKeepsThePictureAndPaintsAnew) {
     const HDC dc = GetDC(window);
     const RECT corner{0, 0, 2, 2};
@@ -172,24 +139,6 @@ TEST_F(Windows, ResizingKeepsThePictureAndPaintsAnew) {
     EXPECT_EQ(seen.front().lParam, 60 | (20 << 16));
     test::handleWaiting();
     EXPECT_EQ(pixel(window, 59, 19), 0xC0C0C0U);
-}
-
-TEST_F(Windows, WearTheIconOfTheirClass) {
-    const HINSTANCE program = GetModuleHandleA(nullptr);
-    EXPECT_FALSE(LoadIconA(nullptr, 100)) << "none of the system's";
-    EXPECT_FALSE(LoadIconA(program, 101));
-    EXPECT_FALSE(LoadIconA(program, "100"));
-    WNDCLASSA windowClass{};
-    windowClass.lpfnWndProc = test::recordingProc;
-    windowClass.hIcon = LoadIconA(program, 100);
-    windowClass.lpszClassName = "IconClass";
-    EXPECT_TRUE(windowClass.hIcon);
-    EXPECT_NE(RegisterClassA(&windowClass), 0);
-    const HWND wearer = CreateWindowExA(0, "IconClass", "", WS_POPUP, 0, 0, 9, 9, nullptr, nullptr,
-                                        program, nullptr);
-    const QList<QSize> sizes = test::lastNative()->icon().availableSizes();
-    EXPECT_TRUE(sizes.contains(QSize(16, 16)) && sizes.contains(QSize(128, 128)));
-    DestroyWindow(wearer);
 }
 
 TEST_F(Windows, PointerHidesByCountOrByShape) {
