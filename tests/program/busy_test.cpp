@@ -51,13 +51,16 @@ TEST_F(Busy, KeysAndClicksGoWhereTheyGoInAnIdleProgram) {
     waitForWindow(editor);
     atOneGo({"alt+f", "Escape", "ctrl+e"}); // the key behind the menu is the main window's
     waitForWindow(mine);
-    keys({"alt+k"});
+    keys({"alt+o"});
+    waitForWindow(pickersTitle);
+    keys({"4"});
+    waitForWindow(mine);
     atOneGo({"ctrl+e"}, stage.topLeft() + QPoint(500, 300)); // a question lies over the stage
     waitForWindow(question);
     keys({"Escape"});
     waitForWindow(mine);
     keys({"alt+v", "ctrl+s"});
-    expectFile(fileOf("abc", "295,190 0 5 1 2"));
+    expectFile(fileOf("abc", "295,190 3 5 0 2"));
 }
 
 } // namespace

@@ -4,8 +4,10 @@
 
 #include "tests/program/run.h"
 
+#include <chrono>
 #include <cstring>
 #include <fstream>
+#include <thread>
 
 #include <QPainter>
 
@@ -92,10 +94,13 @@ class Editing : public Run {
                    activeTitle() == "Fenky Dorbo's Rematch";
         }));
         waitForWindow(editor, "alt+e");
+        const auto up = std::chrono::steady_clock::now();
         const QRect leftEdge(25, 142, 40, 180);
         ASSERT_TRUE(waitFor([&] { return isEmpty("bg01", leftEdge); }));
-        click(stage.topLeft() + QPoint(60, 190)); // to spare us his long hello
+        click(stage.topLeft() + QPoint(60, 190));
         ASSERT_TRUE(waitFor([&] { return !isEmpty("bg01", leftEdge); })) << "he comes in";
+        // While he walks there the moment passes at which he would begin his long hello.
+        std::this_thread::sleep_until(up + std::chrono::milliseconds(1300));
         waitForWindow("File: [Untitled]", "ctrl+e"); // which does nothing while he says hello
     }
 };
