@@ -143,6 +143,21 @@ TEST_F(FileFaults, ASettingThatCannotBeReadStaysAsItIsInAFileOfAnySpelling) {
     SettingsLoad(); // which may be saved again
 }
 
+TEST_F(FileFaults, AFileOfAnotherSpellingIsTheOneThatIsMeantOrNone) {
+    const Outcomes outcomes =
+        eachFault(Operation::open, {Fault::error}, [this](const ChosenFault& fault) {
+            make("Mine.zkt", "old");
+            fault.begin();
+            OFSTRUCT found{};
+            const HFILE file = OpenFile("mine.zkt", &found, OF_CREATE);
+            seam::endFaults();
+            EXPECT_FALSE(std::filesystem::exists("mine.zkt"));
+            EXPECT_EQ(textOf("Mine.zkt"), file == HFILE_ERROR ? "old" : "");
+            return file == HFILE_ERROR || _lclose(file) != 0 ? "refused" : "cut";
+        });
+    EXPECT_EQ(outcomes, (Outcomes{"cut", "refused"}));
+}
+
 TEST_F(FileFaults, APasswordIsChangedOrStaysAndTheCallerIsTold) {
     const struct {
         const char* before;
