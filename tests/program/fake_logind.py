@@ -1,7 +1,8 @@
 #!/usr/bin/python3
 """A login manager for tests, on the bus that DBUS_SYSTEM_BUS_ADDRESS names. It prints a line when
-it is there, when somebody keeps it from sleeping and when nobody does so any more. Its method
-dorbo.Test.Sleep tells that the machine is about to sleep."""
+it is there, when somebody keeps it from sleeping, when somebody holds a session and when nobody
+keeps it from sleeping any more. Its method dorbo.Test.Sleep tells that the machine is about to
+sleep."""
 
 import os
 
@@ -18,6 +19,29 @@ TEST = "dorbo.Test"
 
 def tell(line):
     print(line, flush=True)
+
+
+def tell_of_sessions():
+    """A client gets the name of its session, then asks the bus who answers for it and holds it when
+    that answer is there. No call to us shows this, so the bus is watched. What we send a client after
+    it has asked reaches it after the answer."""
+    bus = dbus.bus.BusConnection(os.environ["DBUS_SYSTEM_BUS_ADDRESS"])
+    named = set()
+
+    def see(_bus, message):
+        client = message.get_sender()
+        if message.get_member() in ("GetSession", "GetSessionByPID"):
+            named.add(client)
+        elif message.get_member() == "GetNameOwner" and client in named:
+            named.remove(client)
+            tell("session")
+
+    bus.add_message_filter(see)
+    calls = [f"type='method_call',member='{name}'"
+             for name in ("GetSession", "GetSessionByPID", "GetNameOwner")]
+    bus.call_blocking(dbus.BUS_DAEMON_NAME, dbus.BUS_DAEMON_PATH,
+                      dbus.BUS_DAEMON_IFACE + ".Monitoring", "BecomeMonitor", "asu", (calls, 0))
+    return bus
 
 
 def awake_no_more(pipe, _condition):
@@ -69,13 +93,14 @@ class Session(dbus.service.Object):
 
 def main():
     dbus.mainloop.glib.DBusGMainLoop(set_as_default=True)
+    watch = tell_of_sessions()
     bus = dbus.SystemBus()
     name = dbus.service.BusName(NAME, bus)
     manager = Manager(bus, "/org/freedesktop/login1")
     session = Session(bus, SESSION)
     tell("ready")
     GLib.MainLoop().run()
-    return name, manager, session
+    return watch, name, manager, session
 
 
 main()

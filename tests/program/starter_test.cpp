@@ -43,6 +43,7 @@ TEST_F(Starter, XssLockLetsTheMachineSleepOnceItIsUp) {
     ASSERT_EQ(logind.readLine(), "ready");
     auto starter = ground.launch({"env", system, "xss-lock", "-l", "--", DORBO_PROGRAM, "S"});
     ASSERT_EQ(logind.readLine(), "inhibited");
+    ASSERT_EQ(logind.readLine(), "session") << "it aborts if it is told of a sleep before that";
 
     const QRgb corner = ground::loadPicture("bg01").pixel(0, 0);
     ASSERT_EQ(ground.command({"dbus-send", "--bus=" + address, "--print-reply",
