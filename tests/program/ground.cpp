@@ -22,13 +22,27 @@ QString text(const std::string& plain) {
     return QString::fromStdString(plain);
 }
 
-bool managerRuns(xcb_connection_t* connection, xcb_window_t root) {
-    const auto intern = xcb_intern_atom(connection, 0, 24, "_NET_SUPPORTING_WM_CHECK");
-    const auto atom = owned(xcb_intern_atom_reply(connection, intern, nullptr));
+xcb_atom_t atomOf(xcb_connection_t* connection, const std::string& name) {
+    const auto intern =
+        xcb_intern_atom(connection, 0, static_cast<std::uint16_t>(name.size()), name.c_str());
+    return owned(xcb_intern_atom_reply(connection, intern, nullptr))->atom;
+}
+
+/// Asks the window manager how large a frame this window would have; whether it has told that. One
+/// that is still starting has its name on the screen already, but may lose what it is asked.
+bool managerAnswers(xcb_connection_t* connection, xcb_window_t root, xcb_window_t window) {
+    xcb_client_message_event_t question{};
+    question.response_type = XCB_CLIENT_MESSAGE;
+    question.format = 32;
+    question.window = window;
+    question.type = atomOf(connection, "_NET_REQUEST_FRAME_EXTENTS");
+    xcb_send_event(connection, 0, root, XCB_EVENT_MASK_SUBSTRUCTURE_REDIRECT,
+                   reinterpret_cast<const char*>(&question));
     const auto get =
-        xcb_get_property(connection, 0, root, atom->atom, XCB_GET_PROPERTY_TYPE_ANY, 0, 1);
-    const auto property = owned(xcb_get_property_reply(connection, get, nullptr));
-    return property != nullptr && property->value_len > 0;
+        xcb_get_property(connection, 0, window, atomOf(connection, "_NET_FRAME_EXTENTS"),
+                         XCB_GET_PROPERTY_TYPE_ANY, 0, 1);
+    const auto answer = owned(xcb_get_property_reply(connection, get, nullptr));
+    return answer != nullptr && answer->value_len > 0;
 }
 
 } // namespace
@@ -129,9 +143,11 @@ Ground::Ground(int width, int height) {
     }
     screen_ = xcb_setup_roots_iterator(xcb_get_setup(connection_)).data;
     manager_ = std::make_unique<Process>(std::vector<std::string>{"openbox"}, environment_, home());
-    if (!waitFor([this] { return managerRuns(connection_, screen_->root); })) {
+    const xcb_window_t window = makeWindow(1, 1);
+    if (!waitFor([&] { return managerAnswers(connection_, screen_->root, window); })) {
         throw std::runtime_error("openbox doesn't start");
     }
+    destroyWindow(window);
 }
 
 Ground::~Ground() {
